@@ -1,0 +1,41 @@
+#pragma once
+
+#include "base/kvBaseExport.h"
+
+#include <exception>
+#include <string>
+
+namespace Kv
+{
+
+/// Base of every exception of the host. Carries words for a person and the place in the source that threw it.
+class KVBASE_API ExBase : public std::exception
+{
+public:
+    /// `sourcePath` and `line` tell where it is thrown, `reason` what is wrong.
+    ExBase(char const* sourcePath, int line, std::string reason);
+    ExBase(ExBase const&) = default;
+    ExBase& operator=(ExBase const&) = default;
+    ~ExBase() override;
+
+    /// The reason, as `getReason` gives it.
+    char const* what() const noexcept override;
+
+    /// What is wrong, in words.
+    virtual char const* getReason() const;
+
+    /// The reason with the place in the source behind it.
+    virtual char const* getDetailedReason() const;
+
+    /// A copy on the heap, owned by the caller.
+    virtual ExBase* clone() const;
+
+    /// Throws a copy of this exception under its exact type.
+    [[noreturn]] virtual void raise() const;
+
+private:
+    std::string _reason;
+    std::string _detailedReason;
+};
+
+} // namespace Kv

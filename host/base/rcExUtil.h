@@ -1,0 +1,37 @@
+#pragma once
+
+#include "base/exBase.h"
+
+namespace Kv
+{
+
+/// Thrown by going through a null counted pointer.
+class KVBASE_API ExNullPtr : public ExBase
+{
+public:
+    using ExBase::ExBase;
+    ExBase* clone() const override;
+    [[noreturn]] void raise() const override;
+};
+
+/// Thrown by a cast that the object's type does not allow.
+class KVBASE_API ExCastFailed : public ExBase
+{
+public:
+    using ExBase::ExBase;
+    ExBase* clone() const override;
+    [[noreturn]] void raise() const override;
+};
+
+/// The failures that all counted pointers share.
+class KVBASE_API RCExUtil
+{
+public:
+    /// Throws `ExNullPtr`. `typeName` is the pointer's type, mangled or plain; the words hold it in plain form.
+    [[noreturn]] static void throwExNullPtr(char const* typeName);
+
+    /// Throws `ExCastFailed` for two type names, mangled or plain.
+    [[noreturn]] static void throwExCastFailed(char const* fromType, char const* toType);
+};
+
+} // namespace Kv

@@ -1,0 +1,4 @@
+#pragma once
+
+/// Marks what libKVgfx exports.
+#define KVGFX_API __attribute__((visibility("default")))

@@ -1,0 +1,22 @@
+#pragma once
+
+#include "base/rcShdPtr.h"
+#include "gfx/wsFont.h"
+
+namespace Kv
+{
+
+/// The fonts of the process.
+class KVGFX_API WsFontRegistry
+{
+public:
+    static WsFontRegistry& getInstance();
+
+    /// The font of widgets that ask for no other.
+    RCShdPtr<WsFont> getDefaultFont() const;
+
+private:
+    RCShdPtr<WsFont> _defaultFont = makeShd<WsFont>();
+};
+
+} // namespace Kv

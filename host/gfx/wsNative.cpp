@@ -1,0 +1,61 @@
+#include "gfx/wsNative.h"
+
+#include "gfx/wsCursorRegistry.h"
+#include "gfx/wsThread.h"
+
+#include <dlfcn.h>
+#include <filesystem>
+
+namespace Kv
+{
+
+namespace
+{
+
+NtPlatform* loadedPlatform = nullptr;
+NtScriptHook* scriptHook = nullptr;
+
+std::filesystem::path nativeLibraryPath()
+{
+    Dl_info info{};
+    dladdr(&loadedPlatform, &info);
+    return std::filesystem::path(info.dli_fname).replace_filename("libKVnative.so");
+}
+
+NtPlatform& loadPlatform()
+{
+    std::filesystem::path const path = nativeLibraryPath();
+    void* const library = dlopen(path.c_str(), RTLD_NOW | RTLD_LOCAL);
+    void* const entry = library ? dlsym(library, ntPlatformEntry) : nullptr;
+    if (!entry)
+        throw ExBase(__FILE__, __LINE__, std::string("Cannot load the window system: ") + dlerror());
+    return reinterpret_cast<NtPlatformEntry>(entry)();
+}
+
+} // namespace
+
+NtPlatform& WsNative::getPlatform()
+{
+    WsThread::require("Window system");
+    if (!loadedPlatform)
+    {
+        loadedPlatform = &loadPlatform();
+        loadedPlatform->setScriptHook(scriptHook);
+        WsCursorRegistry::getInstance().apply();
+    }
+    return *loadedPlatform;
+}
+
+NtPlatform* WsNative::getLoadedPlatform()
+{
+    return loadedPlatform;
+}
+
+void WsNative::setScriptHook(NtScriptHook* hook)
+{
+    scriptHook = hook;
+    if (loadedPlatform)
+        loadedPlatform->setScriptHook(hook);
+}
+
+} // namespace Kv

@@ -1,0 +1,19 @@
+#include "gfx/wsScreen.h"
+
+#include "gfx/wsNative.h"
+
+namespace Kv
+{
+
+WsScreen& WsScreen::getInstance()
+{
+    static WsScreen screen;
+    return screen;
+}
+
+GeVector2<int> WsScreen::getSize() const
+{
+    return WsNative::getPlatform().getScreenSize();
+}
+
+} // namespace Kv

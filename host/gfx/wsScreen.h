@@ -1,0 +1,19 @@
+#pragma once
+
+#include "base/geVector2.h"
+#include "gfx/kvGfxExport.h"
+
+namespace Kv
+{
+
+/// The screen that new windows go to.
+class KVGFX_API WsScreen
+{
+public:
+    static WsScreen& getInstance();
+
+    /// Width and height in pixels. Where there is no display, those of a stand-in.
+    GeVector2<int> getSize() const;
+};
+
+} // namespace Kv

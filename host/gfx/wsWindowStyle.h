@@ -1,0 +1,60 @@
+#pragma once
+
+#include "base/geRectangle.h"
+#include "base/rcBase.h"
+#include "base/rcShdPtr.h"
+#include "gfx/kvGfxExport.h"
+
+namespace Kv
+{
+
+/// What the window manager puts around and beside a window. One style of each is all that windows have here.
+enum class BorderStyle
+{
+    Resizable = 0,
+};
+
+enum class TitleBarStyle
+{
+    Shown = 0,
+};
+
+enum class TaskBarStyle
+{
+    Shown = 0,
+};
+
+enum class StackingStyle
+{
+    Normal = 0,
+};
+
+enum class CloseButtonStyle
+{
+    None = 1,
+};
+
+/// How a window looks on the screen, and where it stands.
+class KVGFX_API WsWindowStyle : public RCBase<LkCounter<int>>
+{
+public:
+    explicit WsWindowStyle(GeRectangle<int> const& frame) : _frame(frame) {}
+
+    /// Where the content of the window goes, in pixels of the screen, y growing upward.
+    GeRectangle<int> const& getFrame() const { return _frame; }
+
+private:
+    GeRectangle<int> _frame;
+};
+
+/// Makes window styles.
+class KVGFX_API WsWindowStyleUtils
+{
+public:
+    /// The style of a window for `frame`, on the screen of the number `screen`; 0 is the one that there always is.
+    static RCShdPtr<WsWindowStyle> getNormalWindowStyle(GeRectangle<int> const& frame, int screen, BorderStyle border,
+                                                        TitleBarStyle titleBar, TaskBarStyle taskBar,
+                                                        StackingStyle stacking, CloseButtonStyle closeButton);
+};
+
+} // namespace Kv

@@ -1,0 +1,163 @@
+#pragma once
+
+#include "base/geRectangle.h"
+
+#include <cstddef>
+#include <string>
+
+namespace Kv
+{
+
+/// How a text sits in its widget from left to right; from bottom to top it is always centred.
+enum class NtAlign
+{
+    Left,
+    Center,
+};
+
+/// Native side of one widget: what stands on the screen. Owned by the widget, which tells it what to show and hears of
+/// the user through a listener. What the widget tells it never comes back as if the user had done it, and a peer that
+/// is hidden or goes away tells nothing.
+class NtPeer
+{
+public:
+    NtPeer() = default;
+    NtPeer(NtPeer const&) = delete;
+    NtPeer& operator=(NtPeer const&) = delete;
+    virtual ~NtPeer() = default;
+
+    /// The cell that the layout gives the widget, in pixels of the parent peer, y growing downward.
+    virtual void setCell(int x, int y, int width, int height) = 0;
+
+    virtual void setDisplayed(bool displayed) = 0;
+    virtual void setEnabled(bool enabled) = 0;
+
+    /// Text shown while the pointer rests on the widget; none when empty.
+    virtual void setTooltip(std::string const& text) = 0;
+
+    /// Puts the peer above its siblings.
+    virtual void raise() = 0;
+};
+
+/// Holds other peers.
+class NtContainer : public virtual NtPeer
+{
+public:
+    /// Gives the keyboard to the first displayed and enabled widget in it that holds a value, as the eye goes; without
+    /// one, to its first push button.
+    virtual void focusFirst() = 0;
+};
+
+class NtLabel : public virtual NtPeer
+{
+public:
+    virtual void setText(std::string const& text) = 0;
+    virtual void setAlign(NtAlign align) = 0;
+};
+
+/// What a text field hears of the user.
+class NtTextFieldListener
+{
+public:
+    virtual ~NtTextFieldListener() = default;
+    virtual void onClicked() = 0;
+    virtual void onTextEdited(std::string const& text) = 0;
+    /// Enter was pressed.
+    virtual void onEditEnded() = 0;
+};
+
+class NtTextField : public virtual NtPeer
+{
+public:
+    /// Replaces the text; the text cursor goes to the end, or to the start.
+    virtual void setText(std::string const& text, bool cursorAtEnd) = 0;
+    virtual void setAlign(NtAlign align) = 0;
+};
+
+/// What a toggle hears of the user.
+class NtToggleListener
+{
+public:
+    virtual ~NtToggleListener() = default;
+    virtual void onToggled(bool state) = 0;
+};
+
+class NtToggle : public virtual NtPeer
+{
+public:
+    virtual void setState(bool state) = 0;
+};
+
+/// What a menu hears of the user.
+class NtMenuListener
+{
+public:
+    virtual ~NtMenuListener() = default;
+    /// The user picked an entry, maybe the one that was selected already.
+    virtual void onPicked(int index) = 0;
+};
+
+class NtMenu : public virtual NtPeer
+{
+public:
+    virtual void removeAll() = 0;
+    /// Adds an entry at the end and selects nothing.
+    virtual void append(std::string const& entry) = 0;
+    /// Selects an entry, or none for -1.
+    virtual void select(int index) = 0;
+    virtual void setAlign(NtAlign align) = 0;
+};
+
+/// What a push button hears of the user.
+class NtPushButtonListener
+{
+public:
+    virtual ~NtPushButtonListener() = default;
+    virtual void onPressed() = 0;
+};
+
+class NtPushButton : public virtual NtPeer
+{
+public:
+    virtual void setText(std::string const& text) = 0;
+};
+
+/// What a window hears of the user.
+class NtWindowListener
+{
+public:
+    virtual ~NtWindowListener() = default;
+    /// The window has this much room for its content now, in pixels.
+    virtual void onResized(int width, int height) = 0;
+    /// Escape was pressed and no widget wanted it.
+    virtual void onEscape() = 0;
+    /// The window manager asked the window to close. The window stays as it is.
+    virtual void onCloseRequested() = 0;
+};
+
+/// Native window. It has one content peer, the root of the peers in it; where the content is larger than the window,
+/// the user can scroll it.
+class NtWindow
+{
+public:
+    NtWindow() = default;
+    NtWindow(NtWindow const&) = delete;
+    NtWindow& operator=(NtWindow const&) = delete;
+    virtual ~NtWindow() = default;
+
+    /// Borrowed: lives as long as the window.
+    virtual NtContainer& getContent() = 0;
+
+    /// Size of the content in pixels.
+    virtual void setContentSize(int width, int height) = 0;
+
+    /// Shows the window, activates it and makes it modal to all others.
+    virtual void show() = 0;
+    virtual void hide() = 0;
+    virtual void redraw() = 0;
+
+    /// Drops the input that is still queued for the window.
+    virtual void flushInput() = 0;
+};
+
+} // namespace Kv

@@ -1,0 +1,103 @@
+#pragma once
+
+#include "base/exBase.h"
+#include "base/geRectangle.h"
+#include "base/geVector2.h"
+#include "native/ntPeers.h"
+
+#include <exception>
+#include <memory>
+#include <string>
+
+namespace Kv
+{
+
+/// Shape of the pointer where a widget does not ask for one of its own.
+enum class NtCursor
+{
+    Normal,
+    Busy,
+};
+
+/// How the interpreter of the scripts takes part in the native loop. Installed by the library that knows it; without
+/// one the loop runs native handlers alone.
+class NtScriptHook
+{
+public:
+    virtual ~NtScriptHook() = default;
+
+    /// Takes the interpreter for this thread, and gives it back: a native event can arrive while nobody holds it.
+    virtual void enter() = 0;
+    virtual void leave() noexcept = 0;
+
+    /// To be called while an exception is handled: that exception, for `rethrow`, with the interpreter's own error
+    /// taken off the interpreter, so that scripts can run in between.
+    virtual std::exception_ptr capture() noexcept = 0;
+
+    /// Throws a captured exception on, with the interpreter's error back in place.
+    [[noreturn]] virtual void rethrow(std::exception_ptr const& error) = 0;
+
+    /// `later` came while `first` was still on its way out: keeps it visible to the script's author.
+    virtual void addContext(std::exception_ptr const& first, std::exception_ptr const& later) noexcept = 0;
+
+    /// Prints a captured exception that nobody will see otherwise.
+    virtual void report(std::exception_ptr const& error) noexcept = 0;
+
+    /// Runs what is pending for the interpreter, Ctrl-C for one, and throws what comes of it.
+    virtual void checkSignals() = 0;
+};
+
+/// The one face of the window system. All of it is for the thread of the user interface, but that peers and windows may
+/// be let go from any thread.
+class NtPlatform
+{
+public:
+    NtPlatform() = default;
+    NtPlatform(NtPlatform const&) = delete;
+    NtPlatform& operator=(NtPlatform const&) = delete;
+    virtual ~NtPlatform() = default;
+
+    /// Borrowed; null takes the hook away.
+    virtual void setScriptHook(NtScriptHook* hook) = 0;
+
+    /// Width in pixels of a text as a widget draws it in the default font, rounded up to whole pixels.
+    virtual float measureText(std::string const& text) = 0;
+
+    /// Size of the screen in pixels.
+    virtual GeVector2<int> getScreenSize() = 0;
+
+    virtual void setCursor(NtCursor cursor) = 0;
+
+    /// Makes a window, not yet shown. `frame` is where its content goes on the screen, in pixels, y growing upward; it
+    /// is moved and made smaller as far as the screen asks for it. `owner`, which can be null, is the window that it
+    /// stays above. Throws an `ExBase` that says why and what to set where windows cannot be shown.
+    virtual std::unique_ptr<NtWindow> createWindow(std::string const& name, std::string const& title,
+                                                   GeRectangle<int> const& frame, NtWindow* owner,
+                                                   NtWindowListener& listener) = 0;
+
+    /// Peers are made displayed and enabled, without a cell. Listeners are borrowed and outlive the peer.
+    virtual std::unique_ptr<NtContainer> createContainer(NtContainer& parent, std::string const& name) = 0;
+    virtual std::unique_ptr<NtLabel> createLabel(NtContainer& parent, std::string const& name) = 0;
+    virtual std::unique_ptr<NtTextField> createTextField(NtContainer& parent, std::string const& name,
+                                                         NtTextFieldListener& listener) = 0;
+    virtual std::unique_ptr<NtToggle> createToggle(NtContainer& parent, std::string const& name,
+                                                   NtToggleListener& listener) = 0;
+    virtual std::unique_ptr<NtMenu> createMenu(NtContainer& parent, std::string const& name,
+                                               NtMenuListener& listener) = 0;
+    virtual std::unique_ptr<NtPushButton> createPushButton(NtContainer& parent, std::string const& name,
+                                                           NtPushButtonListener& listener) = 0;
+
+    /// Dispatches events until `*until` is true, however it came to be. What a handler throws ends the loop and is
+    /// thrown on from here. When the application is asked to quit, or a window closes that has nothing else to press,
+    /// `*end` is set to true. Loops nest.
+    virtual void runLoop(bool const volatile* until, bool volatile* end) = 0;
+
+    /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.
+    virtual void endLoop() = 0;
+};
+
+/// Name of the function that libKVnative exports; gives the process's one platform, which lives as long as the process.
+constexpr char const* ntPlatformEntry = "kvNativePlatform";
+using NtPlatformEntry = NtPlatform& (*)();
+
+} // namespace Kv

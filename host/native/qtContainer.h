@@ -1,0 +1,19 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "native/qtPeer.h"
+
+namespace Kv
+{
+
+/// Plain widget that holds other peers' widgets.
+class QtContainer final : public QtPeer<NtContainer, QWidget>
+{
+public:
+    /// `parent`, which owns the widget natively, can be null.
+    QtContainer(QWidget* parent, std::string const& name);
+
+    void focusFirst() override;
+};
+
+} // namespace Kv

@@ -1,0 +1,129 @@
+#include "native/qtFocusOrder.h"
+
+#include <QCheckBox>
+#include <QComboBox>
+#include <QLineEdit>
+#include <QPushButton>
+#include <QScrollArea>
+
+#include <algorithm>
+#include <cstdlib>
+#include <iterator>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// A widget and where it stands.
+struct Stop
+{
+    QWidget* widget;
+    QRect place;
+};
+
+bool takesFocus(QWidget const& widget)
+{
+    return (widget.focusPolicy() & Qt::TabFocus) && !widget.focusProxy() && widget.isEnabled() &&
+           widget.isVisibleTo(widget.window());
+}
+
+std::vector<Stop> findStops(QWidget const& root)
+{
+    QWidget const* const window = root.window();
+    // Where the keyboard is now counts also if it cannot stay there: the step goes from there.
+    QWidget const* const current = window->focusWidget();
+    std::vector<Stop> stops;
+    for (QWidget* const widget : root.findChildren<QWidget*>())
+        if (widget->window() == window && (widget == current || takesFocus(*widget)))
+            stops.push_back({widget, QRect(widget->mapTo(window, QPoint(0, 0)), widget->size())});
+    return stops;
+}
+
+bool inOneRow(QRect const& a, QRect const& b)
+{
+    return 2 * std::abs(a.center().y() - b.center().y()) <= std::min(a.height(), b.height());
+}
+
+/// Sorts from top to bottom, then each row, which its uppermost widget makes, from left to right.
+void sortAsTheEyeGoes(std::vector<Stop>& stops)
+{
+    std::stable_sort(stops.begin(), stops.end(),
+                     [](Stop const& a, Stop const& b) { return a.place.center().y() < b.place.center().y(); });
+    for (auto row = stops.begin(); row != stops.end();)
+    {
+        auto const end =
+            std::find_if_not(row, stops.end(), [&](Stop const& stop) { return inOneRow(row->place, stop.place); });
+        auto const next = end == row ? std::next(row) : end;
+        std::stable_sort(row, next, [](Stop const& a, Stop const& b) { return a.place.x() < b.place.x(); });
+        row = next;
+    }
+}
+
+bool holdsValue(QWidget const* widget)
+{
+    return qobject_cast<QLineEdit const*>(widget) || qobject_cast<QCheckBox const*>(widget) ||
+           qobject_cast<QComboBox const*>(widget);
+}
+
+bool isPushButton(QWidget const* widget)
+{
+    return qobject_cast<QPushButton const*>(widget);
+}
+
+} // namespace
+
+QtFocusOrder::QtFocusOrder(QWidget const& root)
+{
+    std::vector<Stop> stops = findStops(root);
+    sortAsTheEyeGoes(stops);
+    _stops.reserve(stops.size());
+    std::transform(stops.begin(), stops.end(), std::back_inserter(_stops),
+                   [](Stop const& stop) { return stop.widget; });
+}
+
+QWidget* QtFocusOrder::getNext(QWidget const* current) const
+{
+    return step(current, 1);
+}
+
+QWidget* QtFocusOrder::getPrevious(QWidget const* current) const
+{
+    return step(current, -1);
+}
+
+QWidget* QtFocusOrder::getFirst() const
+{
+    for (auto const wanted : {&holdsValue, &isPushButton})
+        for (QWidget* const widget : _stops)
+            if (wanted(widget) && takesFocus(*widget))
+                return widget;
+    return nullptr;
+}
+
+void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
+{
+    widget.setFocus(reason);
+    // A window that is not active yet gets the keyboard for another reason, which would neither select nor show.
+    widget.window()->setAttribute(Qt::WA_KeyboardFocusChange);
+    if (auto* const field = qobject_cast<QLineEdit*>(&widget))
+        field->selectAll();
+    for (QWidget* parent = widget.parentWidget(); parent; parent = parent->parentWidget())
+        if (auto* const area = qobject_cast<QScrollArea*>(parent))
+            area->ensureWidgetVisible(&widget);
+}
+
+QWidget* QtFocusOrder::step(QWidget const* current, int direction) const
+{
+    auto const count = static_cast<int>(_stops.size());
+    if (count == 0)
+        return nullptr;
+    auto const found = std::find(_stops.begin(), _stops.end(), current);
+    int const nowhere = direction > 0 ? -1 : count;
+    int const from = found == _stops.end() ? nowhere : static_cast<int>(found - _stops.begin());
+    QWidget* const next = _stops[static_cast<std::size_t>((from + direction + count) % count)];
+    return next == current ? nullptr : next;
+}
+
+} // namespace Kv

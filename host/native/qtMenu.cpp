@@ -1,0 +1,144 @@
+#include "native/qtMenu.h"
+
+#include "native/qtLabel.h"
+
+#include <QAbstractItemView>
+#include <QScreen>
+#include <QScrollBar>
+#include <QStylePainter>
+#include <QWheelEvent>
+
+#include <algorithm>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// How many entries a popup shows at once before it scrolls.
+constexpr int maxShown = 20;
+
+class ComboBox final : public QComboBox
+{
+public:
+    ComboBox(QWidget* parent, QtEar<NtMenuListener> const& ear) : QComboBox(parent), _ear(ear)
+    {
+        // The wheel alone must not take the keyboard.
+        setFocusPolicy(Qt::StrongFocus);
+        setMaxVisibleItems(maxShown);
+        setSizeAdjustPolicy(AdjustToMinimumContentsLengthWithIcon);
+        connect(this, &QComboBox::activated, this, [this](int index) { tellPicked(index); });
+    }
+
+    void setAlign(NtAlign align)
+    {
+        _align = align;
+        update();
+    }
+
+    void showPopup() override
+    {
+        shortenPopup();
+        widenPopup();
+        QComboBox::showPopup();
+    }
+
+protected:
+    void paintEvent(QPaintEvent*) override
+    {
+        QStylePainter painter(this);
+        QStyleOptionComboBox option;
+        initStyleOption(&option);
+        painter.drawComplexControl(QStyle::CC_ComboBox, option);
+        QRect const place = style()->subControlRect(QStyle::CC_ComboBox, &option, QStyle::SC_ComboBoxEditField, this);
+        option.currentText = fontMetrics().elidedText(option.currentText, Qt::ElideRight, place.width());
+        option.textAlignment = toQtAlignment(_align);
+        painter.drawControl(QStyle::CE_ComboBoxLabel, option);
+    }
+
+    void wheelEvent(QWheelEvent* event) override
+    {
+        // Turned over it on the way through a long dialog, the wheel scrolls the dialog.
+        if (hasFocus())
+            QComboBox::wheelEvent(event);
+        else
+            event->ignore();
+    }
+
+private:
+    /// Gives many entries a list with a scroll bar: styles that open a box like a menu fill the screen with them.
+    void shortenPopup()
+    {
+        QString const sheet = count() > maxShown ? QStringLiteral("QComboBox { combobox-popup: 0; }") : QString();
+        if (styleSheet() != sheet)
+            setStyleSheet(sheet);
+    }
+
+    /// Makes room in the popup for the longest entry, as far as the screen goes.
+    void widenPopup()
+    {
+        QAbstractItemView* const list = view();
+        QMargins const margins = list->contentsMargins();
+        int const needed = list->sizeHintForColumn(0) + list->verticalScrollBar()->sizeHint().width() + margins.left() +
+                           margins.right();
+        list->setMinimumWidth(std::min(needed, screen()->availableSize().width()));
+    }
+
+    void tellPicked(int index) const
+    {
+        if (isVisible())
+            _ear.tell(&NtMenuListener::onPicked, index);
+    }
+
+    QtEar<NtMenuListener> _ear;
+    NtAlign _align = NtAlign::Left;
+};
+
+} // namespace
+
+QtMenu::QtMenu(QWidget* parent, std::string const& name, NtMenuListener& listener)
+    : QtMenu(parent, name, QtEar<NtMenuListener>(listener))
+{
+}
+
+QtMenu::QtMenu(QWidget* parent, std::string const& name, QtEar<NtMenuListener> const& ear)
+    : QtPeer(makeNative<ComboBox>(parent, ear), name, QtNative::rowInset), _ear(ear)
+{
+}
+
+QtMenu::~QtMenu()
+{
+    _ear.close();
+}
+
+void QtMenu::removeAll()
+{
+    if (QComboBox* const box = getNative())
+        box->clear();
+}
+
+void QtMenu::append(std::string const& entry)
+{
+    QComboBox* const box = getNative();
+    if (!box)
+        return;
+    // The first entry would select itself.
+    int const selected = box->currentIndex();
+    box->addItem(QString::fromStdString(entry));
+    box->setCurrentIndex(selected);
+}
+
+void QtMenu::select(int index)
+{
+    if (QComboBox* const box = getNative())
+        box->setCurrentIndex(index);
+}
+
+void QtMenu::setAlign(NtAlign align)
+{
+    if (auto* const box = static_cast<ComboBox*>(getNative()))
+        box->setAlign(align);
+}
+
+} // namespace Kv

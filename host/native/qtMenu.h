@@ -1,0 +1,31 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "native/qtEar.h"
+#include "native/qtPeer.h"
+
+#include <QComboBox>
+
+namespace Kv
+{
+
+/// List of entries to pick one from; none may be selected.
+class QtMenu final : public QtPeer<NtMenu, QComboBox>
+{
+public:
+    /// `parent`, which owns the widget natively, can be null. The listener is borrowed.
+    QtMenu(QWidget* parent, std::string const& name, NtMenuListener& listener);
+    ~QtMenu() override;
+
+    void removeAll() override;
+    void append(std::string const& entry) override;
+    void select(int index) override;
+    void setAlign(NtAlign align) override;
+
+private:
+    QtMenu(QWidget* parent, std::string const& name, QtEar<NtMenuListener> const& ear);
+
+    QtEar<NtMenuListener> _ear;
+};
+
+} // namespace Kv

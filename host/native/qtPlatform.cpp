@@ -1,0 +1,176 @@
+#include "native/qtPlatform.h"
+
+#include "native/qtContainer.h"
+#include "native/qtGuard.h"
+#include "native/qtLabel.h"
+#include "native/qtLoop.h"
+#include "native/qtMenu.h"
+#include "native/qtPushButton.h"
+#include "native/qtTextField.h"
+#include "native/qtToggle.h"
+#include "native/qtWindow.h"
+#include "native/textEstimate.h"
+
+#include <QApplication>
+#include <QFontMetricsF>
+#include <QScreen>
+
+#include <algorithm>
+#include <cmath>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// What layouts reckon with where there is no screen to ask.
+constexpr GeVector2<int> assumedScreen{1920, 1080};
+
+QWidget* nativeOf(NtContainer& container)
+{
+    return dynamic_cast<QtContainer&>(container).getNative();
+}
+
+/// The widest line as it is drawn, with what its first and last glyph let stick out.
+double measureIn(QFont const& font, QString const& text)
+{
+    QFontMetricsF const metrics(font);
+    double width = metrics.size(Qt::TextExpandTabs, text).width();
+    for (QString const& line : text.split(QLatin1Char('\n')))
+    {
+        QRectF const ink = metrics.tightBoundingRect(line);
+        width = std::max({width, metrics.horizontalAdvance(line), ink.right()});
+    }
+    // The toolkit's own size hints come from the metrics in whole pixels.
+    return std::max<double>(width, QFontMetrics(font).size(0, text).width());
+}
+
+double measure(QString const& text)
+{
+    QFont const labelFont = QApplication::font("QLabel");
+    QFont const buttonFont = QApplication::font("QPushButton");
+    double const width = measureIn(labelFont, text);
+    return buttonFont == labelFont ? width : std::max(width, measureIn(buttonFont, text));
+}
+
+/// Turns a frame over, makes it fit the free part of the screen and moves it there.
+QRect fitToScreen(GeRectangle<int> const& frame)
+{
+    QScreen const* const screen = QGuiApplication::primaryScreen();
+    if (!screen)
+        return {frame.xMin, 0, frame.getWidth(), frame.getHeight()};
+    QRect const all = screen->geometry();
+    QRect const room = screen->availableGeometry();
+    int const width = std::clamp(frame.getWidth(), 1, room.width());
+    int const height = std::clamp(frame.getHeight(), 1, room.height());
+    int const x = all.x() + frame.xMin;
+    int const y = all.y() + all.height() - frame.yMax;
+    return {std::clamp(x, room.x(), room.x() + room.width() - width),
+            std::clamp(y, room.y(), room.y() + room.height() - height), width, height};
+}
+
+} // namespace
+
+void QtPlatform::setScriptHook(NtScriptHook* hook)
+{
+    QtGuard::getInstance().setScriptHook(hook);
+}
+
+float QtPlatform::measureText(std::string const& text)
+{
+    QString const string = QString::fromStdString(text);
+    double const width = _application.hasGui() ? measure(string) : estimateTextWidth(string);
+    return static_cast<float>(std::ceil(width));
+}
+
+GeVector2<int> QtPlatform::getScreenSize()
+{
+    QScreen const* const screen = _application.hasGui() ? QGuiApplication::primaryScreen() : nullptr;
+    if (!screen)
+        return assumedScreen;
+    return {screen->size().width(), screen->size().height()};
+}
+
+void QtPlatform::setCursor(NtCursor cursor)
+{
+    if (!_application.hasGui())
+        return;
+    QCoreApplication* const application = QCoreApplication::instance();
+    bool const isBusy = _busyApplication == application;
+    bool const getsBusy = cursor == NtCursor::Busy;
+    if (isBusy == getsBusy)
+        return;
+    if (getsBusy)
+        QGuiApplication::setOverrideCursor(Qt::WaitCursor);
+    else
+        QGuiApplication::restoreOverrideCursor();
+    _busyApplication = getsBusy ? application : nullptr;
+}
+
+std::unique_ptr<NtWindow> QtPlatform::createWindow(std::string const& name, std::string const& title,
+                                                   GeRectangle<int> const& frame, NtWindow* owner,
+                                                   NtWindowListener& listener)
+{
+    _application.requireWindows();
+    return std::make_unique<QtWindow>(name, title, fitToScreen(frame), dynamic_cast<QtWindow*>(owner), listener);
+}
+
+std::unique_ptr<NtContainer> QtPlatform::createContainer(NtContainer& parent, std::string const& name)
+{
+    return std::make_unique<QtContainer>(nativeOf(parent), name);
+}
+
+std::unique_ptr<NtLabel> QtPlatform::createLabel(NtContainer& parent, std::string const& name)
+{
+    return std::make_unique<QtLabel>(nativeOf(parent), name);
+}
+
+std::unique_ptr<NtTextField> QtPlatform::createTextField(NtContainer& parent, std::string const& name,
+                                                         NtTextFieldListener& listener)
+{
+    return std::make_unique<QtTextField>(nativeOf(parent), name, listener);
+}
+
+std::unique_ptr<NtToggle> QtPlatform::createToggle(NtContainer& parent, std::string const& name,
+                                                   NtToggleListener& listener)
+{
+    return std::make_unique<QtToggle>(nativeOf(parent), name, listener);
+}
+
+std::unique_ptr<NtMenu> QtPlatform::createMenu(NtContainer& parent, std::string const& name, NtMenuListener& listener)
+{
+    return std::make_unique<QtMenu>(nativeOf(parent), name, listener);
+}
+
+std::unique_ptr<NtPushButton> QtPlatform::createPushButton(NtContainer& parent, std::string const& name,
+                                                           NtPushButtonListener& listener)
+{
+    return std::make_unique<QtPushButton>(nativeOf(parent), name, listener);
+}
+
+void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
+{
+    if (*until)
+        return;
+    _application.requireLoop();
+    std::exception_ptr const error = QtLoop(until, end).run();
+    QtGuard::getInstance().destroyWaiting();
+    if (error)
+        QtGuard::getInstance().rethrow(error);
+}
+
+void QtPlatform::endLoop()
+{
+    if (QtLoop* const loop = QtGuard::getInstance().getInnermostLoop())
+        loop->end();
+}
+
+} // namespace Kv
+
+Kv::NtPlatform& kvNativePlatform()
+{
+    // Never destroyed: the interpreter's last objects still use it.
+    static auto* const platform = new Kv::QtPlatform;
+    return *platform;
+}

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "native/ntPlatform.h"
+#include "native/qtApplication.h"
+
+#include <QPointer>
+
+#include <memory>
+#include <string>
+
+namespace Kv
+{
+
+/// The window system by way of the toolkit.
+class QtPlatform final : public NtPlatform
+{
+public:
+    void setScriptHook(NtScriptHook* hook) override;
+    float measureText(std::string const& text) override;
+    GeVector2<int> getScreenSize() override;
+    void setCursor(NtCursor cursor) override;
+
+    std::unique_ptr<NtWindow> createWindow(std::string const& name, std::string const& title,
+                                           GeRectangle<int> const& frame, NtWindow* owner,
+                                           NtWindowListener& listener) override;
+    std::unique_ptr<NtContainer> createContainer(NtContainer& parent, std::string const& name) override;
+    std::unique_ptr<NtLabel> createLabel(NtContainer& parent, std::string const& name) override;
+    std::unique_ptr<NtTextField> createTextField(NtContainer& parent, std::string const& name,
+                                                 NtTextFieldListener& listener) override;
+    std::unique_ptr<NtToggle> createToggle(NtContainer& parent, std::string const& name,
+                                           NtToggleListener& listener) override;
+    std::unique_ptr<NtMenu> createMenu(NtContainer& parent, std::string const& name, NtMenuListener& listener) override;
+    std::unique_ptr<NtPushButton> createPushButton(NtContainer& parent, std::string const& name,
+                                                   NtPushButtonListener& listener) override;
+
+    void runLoop(bool const volatile* until, bool volatile* end) override;
+    void endLoop() override;
+
+private:
+    QtApplication _application;
+
+    /// The application that has our busy cursor, if one has.
+    QPointer<QCoreApplication> _busyApplication;
+};
+
+} // namespace Kv
+
+/// The entry that `ntPlatformEntry` names.
+extern "C" __attribute__((visibility("default"))) Kv::NtPlatform& kvNativePlatform();

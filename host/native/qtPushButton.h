@@ -1,0 +1,28 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "native/qtEar.h"
+#include "native/qtPeer.h"
+
+#include <QPushButton>
+
+namespace Kv
+{
+
+/// Button that Space, Enter and a click press.
+class QtPushButton final : public QtPeer<NtPushButton, QPushButton>
+{
+public:
+    /// `parent`, which owns the widget natively, can be null. The listener is borrowed.
+    QtPushButton(QWidget* parent, std::string const& name, NtPushButtonListener& listener);
+    ~QtPushButton() override;
+
+    void setText(std::string const& text) override;
+
+private:
+    QtPushButton(QWidget* parent, std::string const& name, QtEar<NtPushButtonListener> const& ear);
+
+    QtEar<NtPushButtonListener> _ear;
+};
+
+} // namespace Kv

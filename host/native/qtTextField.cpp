@@ -1,0 +1,98 @@
+#include "native/qtTextField.h"
+
+#include "native/qtLabel.h"
+
+#include <QKeyEvent>
+#include <QMouseEvent>
+
+#include <limits>
+
+namespace Kv
+{
+
+namespace
+{
+
+class LineEdit final : public QLineEdit
+{
+public:
+    LineEdit(QWidget* parent, QtEar<NtTextFieldListener> const& ear) : QLineEdit(parent), _ear(ear)
+    {
+        setMaxLength(std::numeric_limits<int>::max());
+        connect(this, &QLineEdit::textEdited, this, [this] { tellEdited(); });
+        connect(this, &QLineEdit::returnPressed, this, [this] { tellEnded(); });
+    }
+
+protected:
+    void keyPressEvent(QKeyEvent* event) override
+    {
+        QLineEdit::keyPressEvent(event);
+        // Enter is for this field alone; what holds the window could close it.
+        if (event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter)
+            event->accept();
+    }
+
+    void mouseReleaseEvent(QMouseEvent* event) override
+    {
+        QLineEdit::mouseReleaseEvent(event);
+        if (event->button() == Qt::LeftButton && rect().contains(event->position().toPoint()))
+            tellClicked();
+    }
+
+private:
+    void tellEdited() const
+    {
+        if (isVisible())
+            _ear.tell(&NtTextFieldListener::onTextEdited, text().toStdString());
+    }
+
+    void tellEnded() const
+    {
+        if (isVisible())
+            _ear.tell(&NtTextFieldListener::onEditEnded);
+    }
+
+    void tellClicked() const
+    {
+        if (isVisible())
+            _ear.tell(&NtTextFieldListener::onClicked);
+    }
+
+    QtEar<NtTextFieldListener> _ear;
+};
+
+} // namespace
+
+QtTextField::QtTextField(QWidget* parent, std::string const& name, NtTextFieldListener& listener)
+    : QtTextField(parent, name, QtEar<NtTextFieldListener>(listener))
+{
+}
+
+QtTextField::QtTextField(QWidget* parent, std::string const& name, QtEar<NtTextFieldListener> const& ear)
+    : QtPeer(makeNative<LineEdit>(parent, ear), name, QtNative::rowInset), _ear(ear)
+{
+}
+
+QtTextField::~QtTextField()
+{
+    _ear.close();
+}
+
+void QtTextField::setText(std::string const& text, bool cursorAtEnd)
+{
+    QLineEdit* const field = getNative();
+    QString const newText = QString::fromStdString(text);
+    // The same text again would lose the user's selection and undo steps.
+    if (!field || field->text() == newText)
+        return;
+    field->setText(newText);
+    field->setCursorPosition(cursorAtEnd ? static_cast<int>(newText.size()) : 0);
+}
+
+void QtTextField::setAlign(NtAlign align)
+{
+    if (QLineEdit* const field = getNative())
+        field->setAlignment(toQtAlignment(align));
+}
+
+} // namespace Kv

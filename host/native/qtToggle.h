@@ -1,0 +1,28 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "native/qtEar.h"
+#include "native/qtPeer.h"
+
+#include <QCheckBox>
+
+namespace Kv
+{
+
+/// Check box without a text of its own; the whole cell takes the click.
+class QtToggle final : public QtPeer<NtToggle, QCheckBox>
+{
+public:
+    /// `parent`, which owns the widget natively, can be null. The listener is borrowed.
+    QtToggle(QWidget* parent, std::string const& name, NtToggleListener& listener);
+    ~QtToggle() override;
+
+    void setState(bool state) override;
+
+private:
+    QtToggle(QWidget* parent, std::string const& name, QtEar<NtToggleListener> const& ear);
+
+    QtEar<NtToggleListener> _ear;
+};
+
+} // namespace Kv

@@ -1,0 +1,115 @@
+#include "native/qtWindow.h"
+
+#include "native/qtInputDrop.h"
+#include "native/windowWidget.h"
+
+#include <QApplication>
+#include <QThread>
+#include <QWindow>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// False where windows never cover each other, and the toolkit complains when they are asked to.
+bool hasStack()
+{
+    QString const name = QGuiApplication::platformName();
+    return name != QLatin1String("offscreen") && name != QLatin1String("minimal");
+}
+
+/// Takes the windows down that are left when the application goes, while they still can be destroyed.
+void destroyLeftWindows()
+{
+    for (QPointer<WindowWidget> const& window : WindowWidget::findAll())
+        std::unique_ptr<QWidget> const left(window.data());
+}
+
+/// Once for each application: another one can follow when its owner has destroyed the first.
+void goWithApplication()
+{
+    static QPointer<QCoreApplication> watched;
+    if (watched == QCoreApplication::instance())
+        return;
+    watched = QCoreApplication::instance();
+    qAddPostRoutine(&destroyLeftWindows);
+}
+
+} // namespace
+
+QtWindow::QtWindow(std::string const& name, std::string const& title, QRect const& frame, QtWindow const* owner,
+                   NtWindowListener& listener)
+    : _ear(listener), _native(new WindowWidget(_ear), name, 0), _owner(owner ? owner->_native.get() : nullptr),
+      _content(std::make_unique<QtContainer>(getNative(), std::string()))
+{
+    goWithApplication();
+    WindowWidget* const native = getNative();
+    native->setWindowTitle(QString::fromStdString(title));
+    native->setWindowModality(Qt::ApplicationModal);
+    native->setGeometry(frame);
+    native->getArea().setWidget(_content->getNative());
+}
+
+QtWindow::~QtWindow()
+{
+    _ear.close();
+    // Hidden first, as by its owner: another window gets the keyboard. Another thread leaves that to the toolkit.
+    if (QWidget const* const native = _native.get(); native && native->thread() == QThread::currentThread())
+        hide();
+}
+
+void QtWindow::setContentSize(int width, int height)
+{
+    if (QWidget* const content = _content->getNative())
+        content->resize(width, height);
+}
+
+void QtWindow::show()
+{
+    QWidget* const native = _native.get();
+    if (!native)
+        return;
+    // The native window must be there for the owner to be told of.
+    native->winId();
+    if (_owner && _owner->windowHandle())
+        native->windowHandle()->setTransientParent(_owner->windowHandle());
+    native->show();
+    if (hasStack())
+        native->raise();
+    native->activateWindow();
+}
+
+void QtWindow::hide()
+{
+    QWidget* const native = _native.get();
+    if (!native || native->isHidden())
+        return;
+    native->hide();
+    // Where no window manager does it, the keyboard has to be given back.
+    if (_owner && _owner->isVisible())
+        _owner->activateWindow();
+}
+
+void QtWindow::redraw()
+{
+    if (QWidget* const native = _native.get())
+        native->repaint();
+}
+
+void QtWindow::flushInput()
+{
+    QWidget* const native = _native.get();
+    if (!native)
+        return;
+    QtInputDrop const drop(*native);
+    QGuiApplication::sync();
+}
+
+WindowWidget* QtWindow::getNative() const
+{
+    return static_cast<WindowWidget*>(_native.get());
+}
+
+} // namespace Kv

@@ -1,0 +1,45 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "native/qtContainer.h"
+#include "native/qtEar.h"
+#include "native/qtNative.h"
+
+#include <QRect>
+
+#include <memory>
+#include <string>
+
+namespace Kv
+{
+
+class WindowWidget;
+
+/// Top-level window without a close box. Its one widget scrolls the content where that is larger. Owned by the host's
+/// window; natively it goes with it, or with the application, whichever is first.
+class QtWindow final : public NtWindow
+{
+public:
+    /// `frame` is where the content goes, in device-independent pixels, y growing downward. `owner` can be null. The
+    /// listener is borrowed.
+    QtWindow(std::string const& name, std::string const& title, QRect const& frame, QtWindow const* owner,
+             NtWindowListener& listener);
+    ~QtWindow() override;
+
+    NtContainer& getContent() override { return *_content; }
+    void setContentSize(int width, int height) override;
+    void show() override;
+    void hide() override;
+    void redraw() override;
+    void flushInput() override;
+
+private:
+    WindowWidget* getNative() const;
+
+    QtEar<NtWindowListener> _ear;
+    QtNative _native;
+    QPointer<QWidget> _owner;
+    std::unique_ptr<QtContainer> _content;
+};
+
+} // namespace Kv

@@ -1,0 +1,140 @@
+#include "native/windowWidget.h"
+
+#include "native/qtFocusOrder.h"
+
+#include <QApplication>
+#include <QCloseEvent>
+#include <QKeyEvent>
+
+#include <functional>
+#include <utility>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// How often a layout may make scroll bars come and go before it is left as it is.
+constexpr int maxRounds = 4;
+
+/// Says when the room that it has for its content changes.
+class ContentArea final : public QScrollArea
+{
+public:
+    ContentArea(QWidget* parent, std::function<void()> onRoom) : QScrollArea(parent), _onRoom(std::move(onRoom))
+    {
+        setFrameShape(QFrame::NoFrame);
+        // Tab stops at widgets only.
+        setFocusPolicy(Qt::NoFocus);
+    }
+
+protected:
+    void resizeEvent(QResizeEvent* event) override
+    {
+        QScrollArea::resizeEvent(event);
+        _onRoom();
+    }
+
+private:
+    std::function<void()> _onRoom;
+};
+
+} // namespace
+
+WindowWidget::WindowWidget(QtEar<NtWindowListener> const& ear)
+    : QWidget(nullptr, Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint), _ear(ear),
+      _area(new ContentArea(this, [this] { tellRoom(); }))
+{
+    setAttribute(Qt::WA_QuitOnClose, false);
+}
+
+std::vector<QPointer<WindowWidget>> WindowWidget::findAll()
+{
+    std::vector<QPointer<WindowWidget>> windows;
+    for (QWidget* const widget : QApplication::topLevelWidgets())
+        if (auto* const window = dynamic_cast<WindowWidget*>(widget))
+            windows.emplace_back(window);
+    return windows;
+}
+
+void WindowWidget::showEvent(QShowEvent* event)
+{
+    QWidget::showEvent(event);
+    if (!event->spontaneous())
+        blockOthers();
+    // Not on the screen yet, but with its final size: the first picture is laid out.
+    tellRoom();
+}
+
+void WindowWidget::hideEvent(QHideEvent* event)
+{
+    QWidget::hideEvent(event);
+    // The window manager's minimizing is no end.
+    if (event->spontaneous())
+        return;
+    _blocked.clear();
+    _told = QSize();
+}
+
+void WindowWidget::resizeEvent(QResizeEvent* event)
+{
+    QWidget::resizeEvent(event);
+    _area->setGeometry(rect());
+}
+
+void WindowWidget::closeEvent(QCloseEvent* event)
+{
+    event->ignore();
+    _ear.tell(&NtWindowListener::onCloseRequested);
+}
+
+void WindowWidget::keyPressEvent(QKeyEvent* event)
+{
+    if (event->key() != Qt::Key_Escape)
+    {
+        QWidget::keyPressEvent(event);
+        return;
+    }
+    event->accept();
+    if (!event->isAutoRepeat())
+        _ear.tell(&NtWindowListener::onEscape);
+}
+
+bool WindowWidget::focusNextPrevChild(bool next)
+{
+    QtFocusOrder const order(*this);
+    QWidget* const target = next ? order.getNext(focusWidget()) : order.getPrevious(focusWidget());
+    if (!target)
+        return false;
+    QtFocusOrder::give(*target, next ? Qt::TabFocusReason : Qt::BacktabFocusReason);
+    return true;
+}
+
+void WindowWidget::tellRoom()
+{
+    // Laying out can bring scroll bars, and these change the room again: that is told when the first is done.
+    if (_telling || !isVisible())
+        return;
+    _telling = true;
+    QPointer<QWidget> const alive(this);
+    for (int round = 0; round < maxRounds && _told != _area->viewport()->size(); ++round)
+    {
+        _told = _area->viewport()->size();
+        _ear.tell(&NtWindowListener::onResized, _told.width(), _told.height());
+        if (!alive)
+            return;
+    }
+    _telling = false;
+}
+
+void WindowWidget::blockOthers()
+{
+    // The toolkit's modality stops only what comes from the window system; events can also be sent to a widget.
+    _blocked.clear();
+    for (QPointer<WindowWidget> const& window : findAll())
+        if (window != this && window->isVisible())
+            _blocked.push_back(std::make_unique<QtInputDrop>(*window));
+}
+
+} // namespace Kv

@@ -1,0 +1,53 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "native/qtEar.h"
+#include "native/qtInputDrop.h"
+
+#include <QPointer>
+#include <QScrollArea>
+#include <QWidget>
+
+#include <memory>
+#include <vector>
+
+namespace Kv
+{
+
+/// The toolkit's side of a window: says how much room the content has, walks the keyboard through the widgets, and
+/// passes on Escape and what the window manager asks for.
+class WindowWidget final : public QWidget
+{
+public:
+    explicit WindowWidget(QtEar<NtWindowListener> const& ear);
+
+    /// All that there are now, shown or not.
+    static std::vector<QPointer<WindowWidget>> findAll();
+
+    /// What scrolls the content. Natively a child of this.
+    QScrollArea& getArea() { return *_area; }
+
+protected:
+    void showEvent(QShowEvent* event) override;
+    void hideEvent(QHideEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    void closeEvent(QCloseEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    bool focusNextPrevChild(bool next) override;
+
+private:
+    void tellRoom();
+    void blockOthers();
+
+    QtEar<NtWindowListener> _ear;
+    QScrollArea* _area;
+
+    /// The room as it was told last; none is told to a hidden window.
+    QSize _told;
+    bool _telling = false;
+
+    /// Keep input from the windows that were open when this one was shown, while it is.
+    std::vector<std::unique_ptr<QtInputDrop>> _blocked;
+};
+
+} // namespace Kv

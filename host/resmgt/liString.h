@@ -1,0 +1,35 @@
+#pragma once
+
+#include "resmgt/kvResmgtExport.h"
+
+#include <string>
+
+namespace Kv
+{
+
+/// The host's string: bytes, as a rule UTF-8, of any content.
+class KVRESMGT_API LiString
+{
+public:
+    LiString() = default;
+
+    /// A null text gives the empty string.
+    LiString(char const* text);
+    LiString(std::string text);
+
+    /// The text ended by a zero byte; borrowed, valid while the string lives unchanged.
+    char const* getChars() const;
+
+    /// The whole text, with any zero bytes in it.
+    std::string const& toString() const;
+
+    bool isEmpty() const;
+
+private:
+    std::string _text;
+};
+
+KVRESMGT_API bool operator==(LiString const& a, LiString const& b);
+KVRESMGT_API bool operator!=(LiString const& a, LiString const& b);
+
+} // namespace Kv

@@ -1,0 +1,29 @@
+#pragma once
+
+#include "base/rcShdPtr.h"
+#include "resmgt/kvResmgtExport.h"
+#include "resmgt/xmlElement.h"
+
+#include <string>
+
+namespace Kv
+{
+
+/// An XML document, read from its text.
+class KVRESMGT_API XmlDocument
+{
+public:
+    /// Reads `text`, which is the document itself, in UTF-8, and no file name. Throws `XmlError` with the line for
+    /// whatever is not well-formed, for a document type definition, for an encoding declared as another than UTF-8, and
+    /// for elements nested deeper than 1024.
+    explicit XmlDocument(std::string const& text);
+
+    /// The root element, which lives on without the document. Null for a text without any element in it: empty, or
+    /// nothing but white space and comments.
+    RCShdPtr<XmlElement> getRoot() const;
+
+private:
+    RCShdPtr<XmlElement> _root;
+};
+
+} // namespace Kv

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <string_view>
+
+/// The rules of XML that the reader and the writer share.
+namespace Kv::XmlSyntax
+{
+
+/// How deep elements may stand in each other; the root alone is one deep.
+constexpr int maximumDepth = 1024;
+
+/// What XML counts as white space.
+constexpr char const* blanks = " \t\r\n";
+
+/// The first thing in a text that no XML document can hold.
+struct Offence
+{
+    std::size_t offset;
+    char const* words;
+};
+
+/// True for the code points that may stand in a document.
+bool isCharacter(std::uint32_t codePoint);
+
+/// True for what may name an element or an attribute. Any bytes may be asked about.
+bool isName(std::string_view text);
+
+/// Nothing for a text of well-formed UTF-8 that is made of allowed characters.
+std::optional<Offence> findOffence(std::string_view text);
+
+} // namespace Kv::XmlSyntax

@@ -1,0 +1,22 @@
+#include <Python.h>
+
+#include "scriptingAPI/piPythonUtils.h"
+
+#include <boost/uuid/random_generator.hpp>
+
+#include <cstdint>
+#include <map>
+
+namespace Kv
+{
+
+Uuid const& PiPythonUtils::getCurrentPythonInterpreterId()
+{
+    static std::map<std::int64_t, Uuid> ids;
+    std::int64_t const interpreter = PyInterpreterState_GetID(PyInterpreterState_Get());
+    auto const known = ids.find(interpreter);
+    return known != ids.end() ? known->second
+                              : ids.emplace(interpreter, boost::uuids::random_generator()()).first->second;
+}
+
+} // namespace Kv

@@ -1,0 +1,17 @@
+#pragma once
+
+#include "base/uuid.h"
+#include "scriptingAPI/kvScriptingApiExport.h"
+
+namespace Kv
+{
+
+/// What native code asks of the running Python.
+class KVSCRIPTINGAPI_API PiPythonUtils
+{
+public:
+    /// Identity of the interpreter that runs on this thread; stays the same for as long as that interpreter lives.
+    static Uuid const& getCurrentPythonInterpreterId();
+};
+
+} // namespace Kv

@@ -1,0 +1,119 @@
+#include "gfx/wsNative.h"
+#include "scriptingAPI/pythonError.h"
+
+#include <boost/python/errors.hpp>
+
+#include <optional>
+#include <vector>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// The Python interpreter's part in the native loop.
+class PythonHook : public NtScriptHook
+{
+public:
+    PythonHook() { WsNative::setScriptHook(this); }
+
+    void enter() override { _states.push_back(PyGILState_Ensure()); }
+
+    void leave() noexcept override
+    {
+        PyGILState_STATE const state = _states.back();
+        _states.pop_back();
+        PyGILState_Release(state);
+    }
+
+    std::exception_ptr capture() noexcept override
+    {
+        try
+        {
+            throw;
+        }
+        catch (boost::python::error_already_set const&)
+        {
+            return PyErr_Occurred() ? std::make_exception_ptr(PythonError::fetch()) : std::current_exception();
+        }
+        catch (...)
+        {
+            return std::current_exception();
+        }
+    }
+
+    [[noreturn]] void rethrow(std::exception_ptr const& error) override
+    {
+        try
+        {
+            std::rethrow_exception(error);
+        }
+        catch (PythonError const& pythonError)
+        {
+            pythonError.restore();
+            throw boost::python::error_already_set();
+        }
+    }
+
+    void addContext(std::exception_ptr const& first, std::exception_ptr const& later) noexcept override
+    {
+        std::optional<PythonError> const firstError = find(first);
+        std::optional<PythonError> const laterError = find(later);
+        if (!firstError || !laterError || !firstError->addContext(*laterError))
+            report(later);
+    }
+
+    void report(std::exception_ptr const& error) noexcept override
+    {
+        try
+        {
+            std::rethrow_exception(error);
+        }
+        catch (PythonError const& pythonError)
+        {
+            pythonError.restore();
+            PyErr_WriteUnraisable(nullptr);
+        }
+        catch (std::exception const& exception)
+        {
+            PySys_WriteStderr("Exception in an event handler: %.900s\n", exception.what());
+        }
+        catch (...)
+        {
+            PySys_WriteStderr("Unknown exception in an event handler\n");
+        }
+    }
+
+    void checkSignals() override
+    {
+        if (PyErr_CheckSignals() != 0)
+            boost::python::throw_error_already_set();
+    }
+
+private:
+    static std::optional<PythonError> find(std::exception_ptr const& error) noexcept
+    {
+        try
+        {
+            std::rethrow_exception(error);
+        }
+        catch (PythonError const& pythonError)
+        {
+            return pythonError;
+        }
+        catch (...)
+        {
+            return std::nullopt;
+        }
+    }
+
+    /// The lock's states that `leave` goes back to, for the one thread of the user interface.
+    std::vector<PyGILState_STATE> _states;
+};
+
+PythonHook const installedHook;
+
+} // namespace
+
+} // namespace Kv

@@ -1,0 +1,191 @@
+#include "ui/uiContainer.h"
+
+#include "gfx/wsNative.h"
+#include "native/ntPlatform.h"
+#include "ui/uiLayout.h"
+#include "ui/uiWidgetElement.h"
+#include "ui/uiWidgetFactory.h"
+#include "ui/uiWindow.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace Kv
+{
+
+UiContainer::UiContainer(std::string name) : UiWidget(std::move(name)) {}
+
+UiContainer::~UiContainer()
+{
+    for (RCShdPtr<UiWidget> const& child : _children)
+        child->_parent = nullptr;
+    dropPeer();
+}
+
+RCShdPtr<UiContainer> UiContainer::create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*)
+{
+    RCShdPtr<UiContainer> container(new UiContainer(name));
+    parent->addChild(container);
+    return container;
+}
+
+void UiContainer::build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element)
+{
+    RCShdPtr<UiContainer> const container = create(parent, element.getName().c_str(), nullptr);
+    container->setConstraint(element.getConstraint());
+    UiWidgetFactory::createGroup(container, element);
+}
+
+RttiType const& UiContainer::getClassType()
+{
+    return RttiGenType1<UiContainer, UiWidget>::getInstance();
+}
+
+RttiType const& UiContainer::getRttiType() const
+{
+    return getClassType();
+}
+
+UiWindow* UiContainer::getWindow() const
+{
+    return _window ? _window : UiWidget::getWindow();
+}
+
+void UiContainer::setRect(GeRectangle<int> const& rect, bool layOut)
+{
+    UiWidget::setRect(rect, layOut);
+    if (layOut)
+        layOutChildren();
+}
+
+void UiContainer::show()
+{
+    UiWidget::show();
+    if (takesInput())
+        focusFirst();
+}
+
+std::vector<RCShdPtr<UiWidget>> const& UiContainer::getChildren() const
+{
+    requireUiThread();
+    return _children;
+}
+
+RCShdPtr<UiWidget> UiContainer::findWidget(LiString const& name) const
+{
+    requireUiThread();
+    if (!_namesKnown)
+    {
+        indexDescendants(_names);
+        _namesKnown = true;
+    }
+    auto const found = _names.find(name.toString());
+    return found == _names.end() ? nullptr : found->second;
+}
+
+Iterator<RCShdPtr<UiWidget>> UiContainer::findWidgets(PrdPredicate<UiWidget> const& predicate) const
+{
+    requireUiThread();
+    std::vector<RCShdPtr<UiWidget>> found;
+    collect(predicate, found);
+    return Iterator<RCShdPtr<UiWidget>>(std::move(found));
+}
+
+void UiContainer::front(RCShdPtr<UiWidget> const& child)
+{
+    requireUiThread();
+    if (child->_peer)
+        child->_peer->raise();
+}
+
+void UiContainer::focusFirst()
+{
+    if (_native)
+        _native->focusFirst();
+}
+
+void UiContainer::addChild(RCShdPtr<UiWidget> const& child)
+{
+    requireUiThread();
+    _children.push_back(child);
+    child->_parent = this;
+    forgetNames();
+    if (_native)
+        child->realize(WsNative::getPlatform(), *_native);
+}
+
+std::unique_ptr<NtPeer> UiContainer::createPeer(NtPlatform& platform, NtContainer& parent)
+{
+    std::unique_ptr<NtContainer> peer = platform.createContainer(parent, getName());
+    attachNative(platform, *peer);
+    return peer;
+}
+
+bool UiContainer::takesInput() const
+{
+    return _window ? isDisplayed() && isEnabled() && _window->isShown() : UiWidget::takesInput();
+}
+
+void UiContainer::attachNative(NtPlatform& platform, NtContainer& native)
+{
+    _native = &native;
+    for (RCShdPtr<UiWidget> const& child : _children)
+        child->realize(platform, native);
+}
+
+void UiContainer::dropPeer()
+{
+    for (RCShdPtr<UiWidget> const& child : _children)
+        child->dropPeer();
+    _native = nullptr;
+    UiWidget::dropPeer();
+}
+
+void UiContainer::layOutChildren()
+{
+    UiLayout layout(*this);
+    layout.apply();
+}
+
+void UiContainer::removeChild(UiWidget* child)
+{
+    auto const found = std::find_if(_children.begin(), _children.end(),
+                                    [child](RCShdPtr<UiWidget> const& candidate) { return candidate.get() == child; });
+    if (found == _children.end())
+        return;
+    forgetNames();
+    RCShdPtr<UiWidget> const removed = *found;
+    _children.erase(found);
+}
+
+void UiContainer::forgetNames()
+{
+    for (UiContainer* container = this; container; container = container->_parent)
+    {
+        container->_namesKnown = false;
+        container->_names.clear();
+    }
+}
+
+void UiContainer::collect(PrdPredicate<UiWidget> const& predicate, std::vector<RCShdPtr<UiWidget>>& found) const
+{
+    for (RCShdPtr<UiWidget> const& child : _children)
+    {
+        if (predicate.holds(*child))
+            found.push_back(child);
+        if (auto const* const container = dynamic_cast<UiContainer const*>(child.get()))
+            container->collect(predicate, found);
+    }
+}
+
+void UiContainer::indexDescendants(std::unordered_map<std::string, UiWidget*>& index) const
+{
+    for (RCShdPtr<UiWidget> const& child : _children)
+    {
+        index.emplace(child->getName(), child.get());
+        if (auto const* const container = dynamic_cast<UiContainer const*>(child.get()))
+            container->indexDescendants(index);
+    }
+}
+
+} // namespace Kv

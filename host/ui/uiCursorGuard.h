@@ -1,0 +1,23 @@
+#pragma once
+
+#include "resmgt/liString.h"
+#include "ui/kvUiExport.h"
+
+namespace Kv
+{
+
+/// Holds a cursor for as long as it lives; then the cursor that was current when it was made is current again.
+class KVUI_API UiCursorGuard
+{
+public:
+    /// Throws an `ExBase` that lists the names for a name that no cursor has.
+    explicit UiCursorGuard(LiString const& cursorName);
+    UiCursorGuard(UiCursorGuard const&) = delete;
+    UiCursorGuard& operator=(UiCursorGuard const&) = delete;
+    ~UiCursorGuard();
+
+private:
+    LiString _previous;
+};
+
+} // namespace Kv

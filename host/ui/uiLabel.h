@@ -1,0 +1,42 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "ui/uiString.h"
+#include "ui/uiWidget.h"
+
+namespace Kv
+{
+
+class UiWidgetElement;
+
+/// A text that the user reads and cannot change.
+class KVUI_API UiLabel : public UiWidget
+{
+public:
+    static RCShdPtr<UiLabel> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
+
+    /// The `Label` of a description.
+    static void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
+
+    static RttiType const& getClassType();
+    RttiType const& getRttiType() const override;
+
+    /// The text on its face.
+    UiString& getLabel() { return _label; }
+
+    void setAlign(NtAlign align);
+
+protected:
+    explicit UiLabel(std::string name);
+
+    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
+
+private:
+    void dropPeer() override;
+
+    UiString _label;
+    NtAlign _align = NtAlign::Left;
+    NtLabel* _native = nullptr;
+};
+
+} // namespace Kv

@@ -1,0 +1,157 @@
+#include "ui/uiLayout.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace Kv
+{
+
+namespace
+{
+
+constexpr std::size_t edgeCount = UiConstraint::EdgeCount;
+
+/// X1 and X2, Y1 and Y2 face each other: across a widget, and across the gap between two.
+constexpr UiConstraint::EdgeName opposite(UiConstraint::EdgeName edge)
+{
+    return static_cast<UiConstraint::EdgeName>((edge + 2) % edgeCount);
+}
+
+UiConstraint::EdgeName nameOf(std::size_t edge)
+{
+    return static_cast<UiConstraint::EdgeName>(edge % edgeCount);
+}
+
+bool isLow(UiConstraint::EdgeName edge)
+{
+    return edge == UiConstraint::X1 || edge == UiConstraint::Y1;
+}
+
+bool isHorizontal(UiConstraint::EdgeName edge)
+{
+    return edge == UiConstraint::X1 || edge == UiConstraint::X2;
+}
+
+char const* wordFor(UiConstraint::EdgeName edge)
+{
+    constexpr std::array<char const*, edgeCount> words{"X1", "Y1", "X2", "Y2"};
+    return words.at(edge);
+}
+
+} // namespace
+
+UiLayout::UiLayout(UiContainer const& container)
+    : _frame(container.getRect()), _children(container.getChildren()), _positions(_children.size() * edgeCount),
+      _progress(_positions.size(), Progress::Untouched)
+{
+    for (std::size_t child = 0; child < _children.size(); ++child)
+    {
+        _places.emplace(_children[child]->getName(), child);
+        if (!_children[child]->getConstraint())
+            keepInPlace(child);
+    }
+}
+
+std::optional<UiLayout::Fault> UiLayout::findFault()
+{
+    for (EdgeIndex edge = 0; edge < _positions.size(); ++edge)
+        if (std::optional<Fault> fault = settle(edge))
+            return fault;
+    return std::nullopt;
+}
+
+void UiLayout::apply()
+{
+    findFault();
+    auto const at = [this](std::size_t child, UiConstraint::EdgeName edge)
+    { return static_cast<int>(std::lround(_positions[child * edgeCount + edge])); };
+    for (std::size_t child = 0; child < _children.size(); ++child)
+        if (_children[child]->getConstraint())
+        {
+            GeRectangle<int> const rect{at(child, UiConstraint::X1), at(child, UiConstraint::X2),
+                                        at(child, UiConstraint::Y1), at(child, UiConstraint::Y2)};
+            _children[child]->setRect(rect, true);
+        }
+}
+
+void UiLayout::keepInPlace(std::size_t child)
+{
+    GeRectangle<int> const& rect = _children[child]->getRect();
+    EdgeIndex const first = child * edgeCount;
+    _positions[first + UiConstraint::X1] = static_cast<float>(rect.xMin);
+    _positions[first + UiConstraint::Y1] = static_cast<float>(rect.yMin);
+    _positions[first + UiConstraint::X2] = static_cast<float>(rect.xMax);
+    _positions[first + UiConstraint::Y2] = static_cast<float>(rect.yMax);
+    std::fill_n(_progress.begin() + static_cast<std::ptrdiff_t>(first), edgeCount, Progress::Settled);
+}
+
+UiConstraint::Edge const& UiLayout::getEdge(EdgeIndex edge) const
+{
+    return _children[edge / edgeCount]->getConstraint()->getEdge(nameOf(edge));
+}
+
+/// The edge of a widget that `edge` is measured from; nowhere if that is the parent's, or a sibling that is not there.
+UiLayout::EdgeIndex UiLayout::findBase(EdgeIndex edge) const
+{
+    UiConstraint::Edge const& constraint = getEdge(edge);
+    UiConstraint::EdgeName const facing = opposite(nameOf(edge));
+    if (constraint.target == UiConstraint::OwnOpposite)
+        return edge / edgeCount * edgeCount + facing;
+    if (constraint.target != UiConstraint::SiblingEdge)
+        return nowhere;
+    auto const sibling = _places.find(constraint.sibling.toString());
+    return sibling == _places.end() ? nowhere : sibling->second * edgeCount + facing;
+}
+
+/// Finds the position of an edge, and first those of the edges that it hangs on.
+std::optional<UiLayout::Fault> UiLayout::settle(EdgeIndex edge)
+{
+    std::vector<EdgeIndex> chain;
+    for (EdgeIndex next = edge; next != nowhere && _progress[next] != Progress::Settled; next = findBase(next))
+    {
+        std::size_t const child = next / edgeCount;
+        if (_progress[next] == Progress::UnderWay)
+            return Fault{child, std::string(wordFor(nameOf(next))) + " of \"" + _children[child]->getName() +
+                                    "\" hangs on itself"};
+        _progress[next] = Progress::UnderWay;
+        chain.push_back(next);
+        UiConstraint::Edge const& constraint = getEdge(next);
+        if (constraint.target == UiConstraint::SiblingEdge && findBase(next) == nowhere)
+            return Fault{child, std::string(wordFor(nameOf(next))) + " of \"" + _children[child]->getName() +
+                                    "\" names the sibling \"" + constraint.sibling.toString() +
+                                    "\", which is not there"};
+    }
+    for (auto link = chain.rbegin(); link != chain.rend(); ++link)
+    {
+        _positions[*link] = place(*link, findBase(*link));
+        _progress[*link] = Progress::Settled;
+    }
+    return std::nullopt;
+}
+
+float UiLayout::place(EdgeIndex edge, EdgeIndex base) const
+{
+    // Far beyond any screen, and still exact for whole pixels.
+    constexpr float limit = 1 << 23;
+    UiConstraint::Edge const& constraint = getEdge(edge);
+    UiConstraint::EdgeName const name = nameOf(edge);
+    float position = 0;
+    switch (constraint.target)
+    {
+    case UiConstraint::ParentLow:
+        position = static_cast<float>(isHorizontal(name) ? _frame.xMin : _frame.yMin) + constraint.getPixels();
+        break;
+    case UiConstraint::ParentHigh:
+        position = static_cast<float>(isHorizontal(name) ? _frame.xMax : _frame.yMax) + constraint.getPixels();
+        break;
+    case UiConstraint::OwnOpposite:
+        position = _positions[base] + (isLow(name) ? -constraint.getPixels() : constraint.getPixels());
+        break;
+    case UiConstraint::SiblingEdge:
+        position = _positions[base] + constraint.getPixels();
+        break;
+    }
+    return std::fmax(-limit, std::fmin(limit, position));
+}
+
+} // namespace Kv

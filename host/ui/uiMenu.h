@@ -1,0 +1,57 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "ui/uiWidget.h"
+
+#include <string>
+#include <vector>
+
+namespace Kv
+{
+
+class UiWidgetElement;
+
+/// A choice among strings. Raises `ValueChanged` when the selection changes, and `Activate` when the user picks.
+class KVUI_API UiMenu : public UiWidget, private NtMenuListener
+{
+public:
+    static RCShdPtr<UiMenu> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
+
+    /// The `Menu` of a description.
+    static void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
+
+    static RttiType const& getClassType();
+    RttiType const& getRttiType() const override;
+
+    /// The selected entry, UTF-8, valid until the entries change; null while none is selected.
+    char const* getStrPtr() const;
+
+    /// Takes all entries away, and the selection with them.
+    void removeAll();
+
+    /// Adds an entry at the end; the selection stays. Throws an `ExBase` for a text that is no UTF-8.
+    void append(char const* entry);
+
+    /// Selects the entry of that index, 0 being the first; an index outside the entries selects nothing. With `notify`
+    /// the handlers of `ValueChanged` run, also when the selection stays the same.
+    void setSelection(int index, bool notify);
+
+    void setAlign(NtAlign align);
+
+protected:
+    explicit UiMenu(std::string name);
+
+    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
+
+private:
+    void dropPeer() override;
+    void onPicked(int index) override;
+
+    std::vector<std::string> _entries;
+    /// -1 while nothing is selected.
+    int _selection = -1;
+    NtAlign _align = NtAlign::Left;
+    NtMenu* _native = nullptr;
+};
+
+} // namespace Kv

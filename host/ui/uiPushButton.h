@@ -1,0 +1,43 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "ui/uiString.h"
+#include "ui/uiWidget.h"
+
+namespace Kv
+{
+
+class UiWidgetElement;
+
+/// A button that does something when it is pressed: it raises `Activate` and has no value.
+class KVUI_API UiPushButton : public UiWidget, private NtPushButtonListener
+{
+public:
+    static RCShdPtr<UiPushButton> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
+
+    /// The `PushButton` of a description.
+    static void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
+
+    static RttiType const& getClassType();
+    RttiType const& getRttiType() const override;
+
+    /// The text on its face.
+    UiString& getLabel() { return _label; }
+
+    /// Does what a click of the user does: nothing where a user could not click.
+    void press();
+
+protected:
+    explicit UiPushButton(std::string name);
+
+    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
+
+private:
+    void dropPeer() override;
+    void onPressed() override { press(); }
+
+    UiString _label;
+    NtPushButton* _native = nullptr;
+};
+
+} // namespace Kv

@@ -1,0 +1,106 @@
+#include "ui/uiResTable.h"
+
+#include "resmgt/xmlDocument.h"
+#include "resmgt/xmlError.h"
+
+#include <dlfcn.h>
+#include <fstream>
+#include <sstream>
+#include <vector>
+
+namespace Kv
+{
+
+namespace
+{
+
+namespace fs = std::filesystem;
+
+/// The folder of resources that is installed beside the libraries.
+fs::path installedFolder()
+{
+    static char const anchor = 0;
+    Dl_info info{};
+    dladdr(&anchor, &info);
+    return fs::path(info.dli_fname).parent_path() / "../resources/tooltips";
+}
+
+std::vector<fs::path>& resourceFolders()
+{
+    static std::vector<fs::path> folders{installedFolder()};
+    return folders;
+}
+
+std::vector<fs::path> candidatesFor(fs::path const& name)
+{
+    std::vector<fs::path> bases{name};
+    if (!name.has_parent_path())
+        for (fs::path const& folder : resourceFolders())
+            bases.push_back(folder / name);
+    std::vector<fs::path> candidates;
+    for (fs::path const& base : bases)
+    {
+        candidates.push_back(base);
+        candidates.push_back(fs::path(base) += ".xml");
+    }
+    return candidates;
+}
+
+std::optional<fs::path> findFile(std::string const& resourceName)
+{
+    if (!resourceName.empty())
+        for (fs::path const& candidate : candidatesFor(resourceName))
+        {
+            std::error_code error;
+            if (fs::is_regular_file(candidate, error))
+                return candidate;
+        }
+    return std::nullopt;
+}
+
+std::unordered_map<std::string, std::string> readTooltips(fs::path const& file)
+{
+    std::ostringstream text;
+    text << std::ifstream(file, std::ios::binary).rdbuf();
+    RCShdPtr<XmlElement> const root = XmlDocument(text.str()).getRoot();
+    if (!root || root->getName() != "Tooltips")
+        throw XmlError(__FILE__, __LINE__, root ? root->getLine() : 1, "the root element is not \"Tooltips\"");
+    std::unordered_map<std::string, std::string> tooltips;
+    for (XmlElement const& element : root->getChildren())
+    {
+        if (element.getName() != "Tooltip")
+            throw XmlError(__FILE__, __LINE__, element.getLine(), "unknown element \"" + element.getName() + "\"");
+        tooltips.emplace(element.getAttribute("Widget"), element.getText());
+    }
+    return tooltips;
+}
+
+} // namespace
+
+UiResTable UiResTable::load(std::string const& resourceName)
+{
+    UiResTable table;
+    if (std::optional<fs::path> const file = findFile(resourceName))
+        try
+        {
+            table._tooltips = readTooltips(*file);
+        }
+        catch (XmlError const& error)
+        {
+            throw ExBase(__FILE__, __LINE__, "Tooltip resource " + file->string() + ": " + error.getReason());
+        }
+    return table;
+}
+
+void UiResTable::addFolder(std::filesystem::path const& folder)
+{
+    resourceFolders().insert(resourceFolders().begin(), folder);
+}
+
+std::optional<std::string> UiResTable::findTooltip(std::string const& widgetName) const
+{
+    auto const tooltip = _tooltips.find(widgetName);
+    return tooltip == _tooltips.end() ? std::nullopt : std::optional<std::string>(tooltip->second);
+}
+
+} // namespace Kv

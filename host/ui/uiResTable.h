@@ -1,0 +1,32 @@
+#pragma once
+
+#include "ui/kvUiExport.h"
+
+#include <filesystem>
+#include <optional>
+#include <string>
+#include <unordered_map>
+
+namespace Kv
+{
+
+/// The tooltips of a resource, by the name of the widget. A resource is an XML file with the root `Tooltips` and in it
+/// one element `Tooltip` a widget: its attribute `Widget` is the name, its content the text.
+class KVUI_API UiResTable
+{
+public:
+    /// Reads the resource of that name: a path, or a bare name that is looked for in the application's resource
+    /// folders, each with or without the extension ".xml". One that is not there gives an empty table. Throws an
+    /// `ExBase` with file and line for a file that is no tooltip resource.
+    static UiResTable load(std::string const& resourceName);
+
+    /// A further folder to look in, ahead of those there are.
+    static void addFolder(std::filesystem::path const& folder);
+
+    std::optional<std::string> findTooltip(std::string const& widgetName) const;
+
+private:
+    std::unordered_map<std::string, std::string> _tooltips;
+};
+
+} // namespace Kv

@@ -1,0 +1,19 @@
+#include "ui/uiString.h"
+
+#include "resmgt/liStringUtil.h"
+
+#include <utility>
+
+namespace Kv
+{
+
+UiString::UiString(std::function<void()> onChange) : _onChange(std::move(onChange)) {}
+
+void UiString::setString(char const* text)
+{
+    LiStringUtil::requireUtf8(text, "Label text");
+    _text = text;
+    _onChange();
+}
+
+} // namespace Kv

@@ -1,0 +1,59 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "ui/uiWidget.h"
+
+namespace Kv
+{
+
+class UiWidgetElement;
+
+/// An editable line of text. Raises `ValueChanged` when the user ends an edit with Enter that has changed the text, and
+/// `Activate` when the user clicks it. Its text is what stands on the screen, Enter pressed or not.
+class KVUI_API UiTextField : public UiWidget, private NtTextFieldListener
+{
+public:
+    /// Where a new text leaves the text cursor.
+    enum CursorPosition
+    {
+        Start = 0,
+        End = 1,
+    };
+
+    static RCShdPtr<UiTextField> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
+
+    /// The `TextField` of a description.
+    static void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
+
+    static RttiType const& getClassType();
+    RttiType const& getRttiType() const override;
+
+    /// UTF-8, valid until the text changes; null where a null text was the last that was set.
+    char const* getString() const { return _text ? _text->c_str() : nullptr; }
+
+    /// Replaces the text. A null one leaves the field without a string: empty on the screen and null when read.
+    /// With `append` the text goes behind the one that is there. With `notify` the handlers of `ValueChanged` run,
+    /// also when the text stays the same. Throws an `ExBase` for a text that is no UTF-8.
+    void setString(char const* text, CursorPosition position, bool append, bool notify);
+
+    void setAlign(NtAlign align);
+
+protected:
+    explicit UiTextField(std::string name);
+
+    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
+
+private:
+    void dropPeer() override;
+    void onClicked() override;
+    void onTextEdited(std::string const& text) override;
+    void onEditEnded() override;
+
+    std::optional<std::string> _text = "";
+    /// The text that an edit under way began with.
+    std::optional<std::string> _textBeforeEdit = "";
+    NtAlign _align = NtAlign::Left;
+    NtTextField* _native = nullptr;
+};
+
+} // namespace Kv

@@ -1,0 +1,69 @@
+#pragma once
+
+#include "gfx/wsWindowStyle.h"
+#include "ui/uiContainer.h"
+#include "ui/uiWindow.h"
+
+#include <memory>
+#include <string>
+
+namespace Kv
+{
+
+class UiPushButton;
+
+/// A window of its own on the screen, with the tree of widgets in it. A window manager that asks it to close, and
+/// Escape, press its push button labelled "Cancel", else its only push button. Where there is neither, a request to
+/// close ends the innermost message loop.
+class KVUI_API UiTopLevel : public UiWidget, public UiWindow, private NtWindowListener
+{
+public:
+    /// A window that is not yet shown. Makes no native window, which comes with the first show.
+    static RCShdPtr<UiTopLevel> create(char const* name, char const* title, RCShdPtr<WsWindowStyle> const& style,
+                                       UiResTable const*);
+
+    ~UiTopLevel() override;
+
+    static RttiType const& getClassType();
+    RttiType const& getRttiType() const override;
+
+    UiWindow* getWindow() const override;
+    RCShdPtr<UiContainer> getRootContainer() const override { return _root; }
+    RCShdPtr<WsWindow> getOSWindow() const override { return _osWindow; }
+    bool isShown() const override { return _osWindow && isDisplayed(); }
+    bool redraw() override;
+
+    /// Shows and hides the window. Throws an `ExBase` that says why where windows cannot be shown; nothing has changed
+    /// then.
+    void display(bool displayed) override;
+
+    /// The window that this one stays above once it is shown; borrowed only for as long as it lives. Null for none.
+    void setOwner(std::weak_ptr<UiTopLevel> owner) { _owner = std::move(owner); }
+
+    /// A pointer that tells when the window is gone, and does not keep it.
+    std::weak_ptr<UiTopLevel> observe() { return _self; }
+
+protected:
+    UiTopLevel(char const* name, char const* title, RCShdPtr<WsWindowStyle> const& style);
+
+    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
+
+private:
+    void makeNative();
+    void dropNative();
+    /// The button that Escape presses; null if there is none.
+    RCShdPtr<UiPushButton> findEscapeButton() const;
+
+    void onResized(int width, int height) override;
+    void onEscape() override;
+    void onCloseRequested() override;
+
+    std::string _title;
+    RCShdPtr<WsWindowStyle> _style;
+    RCShdPtr<UiContainer> _root;
+    RCShdPtr<WsWindow> _osWindow;
+    std::weak_ptr<UiTopLevel> _owner;
+    std::shared_ptr<UiTopLevel> _self;
+};
+
+} // namespace Kv

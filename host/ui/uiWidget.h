@@ -1,0 +1,118 @@
+#pragma once
+
+#include "base/geRectangle.h"
+#include "base/rcShdPtr.h"
+#include "base/rttiType.h"
+#include "ui/kvUiExport.h"
+#include "ui/piWidget.h"
+#include "ui/uiConstraint.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace Kv
+{
+
+class NtContainer;
+class NtPeer;
+class NtPlatform;
+class UiContainer;
+class UiResTable;
+class UiWindow;
+
+/// Base of the widgets: a counted object in a tree, owned by its parent. It is light; what stands on the screen is its
+/// native peer, which it gets when its window is first shown and which follows it from then on.
+class KVUI_API UiWidget : public RCBase<LkCounter<int>>
+{
+public:
+    ~UiWidget() override;
+
+    static RttiType const& getClassType();
+    virtual RttiType const& getRttiType() const;
+
+    std::string const& getName() const { return _name; }
+
+    /// Null for the root of a window, and for a widget that was taken out of its parent.
+    RCShdPtr<UiContainer> getParent() const;
+
+    /// The window that holds the widget, borrowed; null if there is none.
+    virtual UiWindow* getWindow() const;
+
+    /// The face for event handlers. Never null.
+    RCShdPtr<PiWidget> getPiWidget();
+
+    /// Where the widget lies in its window, in pixels, y growing upward. The layout says so for a widget with a
+    /// constraint, once its window is shown.
+    GeRectangle<int> const& getRect() const { return _rect; }
+
+    /// Places the widget, and with `layOut` the widgets in it.
+    virtual void setRect(GeRectangle<int> const& rect, bool layOut);
+
+    std::optional<UiConstraint> const& getConstraint() const { return _constraint; }
+    void setConstraint(UiConstraint const& constraint) { _constraint = constraint; }
+
+    /// Whether the widget itself is to be seen; it is on the screen if all that hold it are so too.
+    bool isDisplayed() const { return _displayed; }
+    virtual void display(bool displayed);
+
+    virtual void show() { display(true); }
+
+    /// May come from any thread: the end of a widget does not choose its own.
+    virtual void hide();
+
+    /// Whether the widget itself takes input; it does if all that hold it do so too.
+    bool isEnabled() const { return _enabled; }
+
+    /// A change runs the handlers of `Enable` or `Disable`.
+    void setEnabled(bool enabled);
+
+    /// Takes the widget out of its parent, which may end its life, and off the screen. May come from any thread.
+    void clearParent();
+
+    /// The text that is shown while the pointer rests on the widget.
+    std::string const& getTooltip() const { return _tooltip; }
+    void setTooltip(std::string const& text);
+
+    /// Loads the tooltips of a resource and gives the widget the one under its name. The resource is a path, or a bare
+    /// name to be found in the application's resource folders, with or without extension. One that is not there, or
+    /// does not name the widget, is no error and changes nothing.
+    static void setWidgetResTable(RCShdPtr<UiWidget> const& widget, std::string const& resourceName);
+
+protected:
+    /// `name` is UTF-8.
+    explicit UiWidget(std::string name);
+
+    /// Throws an `ExBase` on any other thread than that of the user interface.
+    void requireUiThread() const;
+
+    /// Runs the handlers of an event.
+    void fire(PiWidget::EventType type);
+
+    /// True if a user can reach the widget: on the screen, and neither it nor what holds it hidden or disabled.
+    virtual bool takesInput() const;
+
+    /// Makes the native peer, which shows the state of the widget from the start.
+    virtual std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) = 0;
+
+    /// Lets the native peer go. A widget that points to it forgets it first.
+    virtual void dropPeer();
+
+private:
+    friend class UiContainer;
+
+    void realize(NtPlatform& platform, NtContainer& parent);
+    void placePeer();
+
+    std::string _name;
+    std::string _tooltip;
+    UiContainer* _parent = nullptr;
+    RCShdPtr<PiWidget> _piWidget;
+    std::optional<UiConstraint> _constraint;
+    GeRectangle<int> _rect;
+    bool _displayed = true;
+    bool _enabled = true;
+    std::unique_ptr<NtPeer> _peer;
+};
+
+} // namespace Kv

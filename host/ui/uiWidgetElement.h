@@ -1,0 +1,59 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "resmgt/xmlElement.h"
+#include "ui/kvUiExport.h"
+#include "ui/uiConstraint.h"
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace Kv
+{
+
+/// One widget element of a description, taken apart. A widget takes what it knows; what is left over at the end is a
+/// mistake of the description. Every fault is an `XmlError` that names the line.
+class KVUI_API UiWidgetElement
+{
+public:
+    /// `depth` is 1 for the root of the description, and one more for each container that the widget stands in.
+    UiWidgetElement(XmlElement const& element, int depth);
+
+    int getDepth() const { return _depth; }
+
+    std::string const& getName() const { return _name; }
+
+    UiConstraint const& getConstraint() const { return *_constraint; }
+
+    /// The text of `LabelString`, if there is one.
+    std::optional<std::string> takeLabelString();
+
+    /// The texts of the element of that name, none if it is not there.
+    std::vector<std::string> takeTexts(std::string const& name);
+
+    /// The whole number of the element of that name, if there is one.
+    std::optional<int> takeInt(std::string const& name);
+
+    /// `H` of `LabelAlign`; `otherwise` if there is none.
+    NtAlign takeAlign(NtAlign otherwise);
+
+    /// The widget elements of `Group`.
+    std::vector<XmlElement> takeGroup();
+
+    /// Throws for what nobody took.
+    void finish() const;
+
+private:
+    static std::optional<XmlElement> take(std::vector<XmlElement>& from, std::string const& name);
+
+    XmlElement _element;
+    int _depth;
+    std::string _name;
+    std::optional<UiConstraint> _constraint;
+    /// What is left of the element itself, and of its `Widget`.
+    std::vector<XmlElement> _parts;
+    std::vector<XmlElement> _properties;
+};
+
+} // namespace Kv

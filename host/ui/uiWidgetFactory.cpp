@@ -1,0 +1,95 @@
+#include "ui/uiWidgetFactory.h"
+
+#include "resmgt/xmlError.h"
+#include "ui/uiDualState.h"
+#include "ui/uiLabel.h"
+#include "ui/uiLayout.h"
+#include "ui/uiMenu.h"
+#include "ui/uiPushButton.h"
+#include "ui/uiTextField.h"
+#include "ui/uiWidgetElement.h"
+
+#include <map>
+
+namespace Kv
+{
+
+namespace
+{
+
+using Builder = void (*)(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
+
+Builder findBuilder(XmlElement const& element)
+{
+    static std::map<std::string, Builder> const builders{
+        {"Container", &UiContainer::build},   {"Label", &UiLabel::build},         {"Menu", &UiMenu::build},
+        {"PushButton", &UiPushButton::build}, {"TextField", &UiTextField::build}, {"ToggleButton", &UiDualState::build},
+    };
+    auto const found = builders.find(element.getName());
+    if (found == builders.end())
+        throw XmlError(__FILE__, __LINE__, element.getLine(), "unknown widget element \"" + element.getName() + "\"");
+    return found->second;
+}
+
+/// Takes out again what was built, unless all of it came to a good end.
+class Rollback
+{
+public:
+    explicit Rollback(RCShdPtr<UiContainer> const& container)
+        : _container(container), _count(container->getChildren().size())
+    {
+    }
+    Rollback(Rollback const&) = delete;
+    Rollback& operator=(Rollback const&) = delete;
+
+    ~Rollback()
+    {
+        while (!_done && _container->getChildren().size() > _count)
+        {
+            RCShdPtr<UiWidget> const widget = _container->getChildren().back();
+            widget->clearParent();
+        }
+    }
+
+    void dismiss() { _done = true; }
+
+private:
+    RCShdPtr<UiContainer> _container;
+    std::size_t _count;
+    bool _done = false;
+};
+
+} // namespace
+
+RCShdPtr<UiWidget> UiWidgetFactory::createWidget(RCShdPtr<UiContainer> const& parent, XmlElement const& element)
+{
+    Rollback rollback(parent);
+    createAll(parent, {element}, 1);
+    rollback.dismiss();
+    return parent->getChildren().back();
+}
+
+void UiWidgetFactory::createGroup(RCShdPtr<UiContainer> const& container, UiWidgetElement& element)
+{
+    createAll(container, element.takeGroup(), element.getDepth() + 1);
+}
+
+void UiWidgetFactory::createAll(RCShdPtr<UiContainer> const& container, std::vector<XmlElement> const& elements,
+                                int depth)
+{
+    std::size_t const first = container->getChildren().size();
+    for (XmlElement const& element : elements)
+    {
+        Builder const build = findBuilder(element);
+        if (build == &UiContainer::build && depth > maxDepth)
+            throw XmlError(__FILE__, __LINE__, element.getLine(),
+                           "containers nested deeper than " + std::to_string(maxDepth));
+        UiWidgetElement widget(element, depth);
+        build(container, widget);
+        widget.finish();
+    }
+    if (std::optional<UiLayout::Fault> const fault = UiLayout(*container).findFault())
+        throw XmlError(__FILE__, __LINE__, elements.at(fault->child - first).getLine(), fault->words);
+}
+
+} // namespace Kv

@@ -1,0 +1,24 @@
+#pragma once
+
+#include "base/prdPredicate.h"
+#include "base/rttiType.h"
+#include "ui/kvUiExport.h"
+#include "ui/uiWidget.h"
+
+#include <string>
+
+namespace Kv
+{
+
+/// Questions about widgets, for searches.
+class KVUI_API UiWidgetPredicate
+{
+public:
+    /// Holds for widgets of the class of that record, and of classes derived from it.
+    static PrdPredicate<UiWidget> isType(RttiType const& type);
+
+    /// Holds for widgets whose name starts with `prefix`, or is it.
+    static PrdPredicate<UiWidget> nameStartsWith(std::string const& prefix);
+};
+
+} // namespace Kv

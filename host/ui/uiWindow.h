@@ -1,0 +1,30 @@
+#pragma once
+
+#include "base/rcShdPtr.h"
+#include "gfx/wsWindow.h"
+#include "ui/kvUiExport.h"
+
+namespace Kv
+{
+
+class UiContainer;
+
+/// What holds a tree of widgets and shows it on the screen.
+class KVUI_API UiWindow
+{
+public:
+    virtual ~UiWindow() = default;
+
+    /// The container of all widgets of the window.
+    virtual RCShdPtr<UiContainer> getRootContainer() const = 0;
+
+    /// The window of the window system; null before the first show.
+    virtual RCShdPtr<WsWindow> getOSWindow() const = 0;
+
+    virtual bool isShown() const = 0;
+
+    /// Paints the window anew. True if it stands on the screen.
+    virtual bool redraw() = 0;
+};
+
+} // namespace Kv

@@ -1,0 +1,8 @@
+#include "pyinit/pyManagedObjectBase.h"
+
+namespace Kv
+{
+
+PyManagedObjectBase::~PyManagedObjectBase() = default;
+
+} // namespace Kv

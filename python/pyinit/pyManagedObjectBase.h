@@ -1,0 +1,26 @@
+#pragma once
+
+#include "base/rcBase.h"
+#include "base/uuid.h"
+#include "pyinit/kvPyextInitExport.h"
+
+namespace Kv
+{
+
+/// Base of what is handed to Python by reference: knows the interpreter that it was handed to.
+class KVPYEXTINIT_API PyManagedObjectBase : public RCBase<LkCounter<int>>
+{
+public:
+    ~PyManagedObjectBase() override;
+
+    /// The interpreter that the object was made for; never changes.
+    Uuid const& getInterpreterId() const { return _interpreterId; }
+
+protected:
+    explicit PyManagedObjectBase(Uuid const& interpreterId) : _interpreterId(interpreterId) {}
+
+private:
+    Uuid _interpreterId;
+};
+
+} // namespace Kv

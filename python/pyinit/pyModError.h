@@ -1,0 +1,64 @@
+#pragma once
+
+#include <Python.h>
+
+#include "base/assertions.h"
+#include "pyinit/pyInitError.h"
+
+#include <string>
+
+namespace Kv::PyextInit
+{
+
+/// The one exception of an extension module, which `Tag` stands for. A module instantiates it once and exports it.
+/// Scripts see it as the Python type that `initialize` makes, with the reason as its text.
+template <typename Tag> class ModError : public Error
+{
+public:
+    ModError(char const* sourcePath, int line, char const* reason) : Error(sourcePath, line, _modName.c_str(), reason)
+    {
+    }
+    ModError(ModError const&) = default;
+    ModError& operator=(ModError const&) = default;
+    ~ModError() override = default;
+
+    ExBase* clone() const override { return new ModError(*this); }
+    [[noreturn]] void raise() const override { throw ModError(*this); }
+
+    /// Makes the Python type. To be called once, in the module body, before the translator is registered. Throws
+    /// `ExAssertionFailed` for an empty name.
+    static void initialize(char const* modName, char const* className);
+
+    /// Sets the Python error of the module's type; for Boost.Python.
+    static void exceptionTranslator(ModError const& error);
+
+    /// There is nothing to take down: the type lasts as long as the process.
+    static void finalize() {}
+
+private:
+    static std::string _modName;
+    static std::string _className;
+    static void* _pythonException;
+};
+
+template <typename Tag> std::string ModError<Tag>::_modName;
+template <typename Tag> std::string ModError<Tag>::_className;
+template <typename Tag> void* ModError<Tag>::_pythonException = nullptr;
+
+template <typename Tag> void ModError<Tag>::initialize(char const* modName, char const* className)
+{
+    _modName = modName;
+    _className = className;
+    if (_modName.empty())
+        Assertions::throwAssertionFailed(__FILE__, __LINE__, "!_modName.empty()");
+    if (_className.empty())
+        Assertions::throwAssertionFailed(__FILE__, __LINE__, "!_className.empty()");
+    _pythonException = newException(_modName, _className);
+}
+
+template <typename Tag> void ModError<Tag>::exceptionTranslator(ModError const& error)
+{
+    PyErr_SetString(static_cast<PyObject*>(_pythonException), error.getReason());
+}
+
+} // namespace Kv::PyextInit

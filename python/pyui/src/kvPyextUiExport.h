@@ -1,0 +1,4 @@
+#pragma once
+
+/// Marks what libKVpyextUi exports.
+#define KVPYEXTUI_API __attribute__((visibility("default")))

@@ -1,0 +1,37 @@
+#pragma once
+
+#include <boost/python/dict.hpp>
+#include <boost/python/list.hpp>
+
+#include "base/rcShdPtr.h"
+#include "pyDialogHolder.h"
+
+#include <string>
+
+namespace Kv::PyextUi
+{
+
+// The module's functions. Sizes are in pixels, where anything below 1 stands for 80 % of the screen; initial values are
+// written without running callbacks. Failures are those of `Dialog` and of the description.
+
+/// A dialog that has not been launched, from the description `xmlString`.
+RCShdPtr<ManagedDialog> createDialog(std::string const& title, std::string const& xmlString, int width, int height,
+                                     boost::python::dict const& initialValues);
+
+/// Shows a dialog from the description in the file `xmlFile` and gives its values when it closes. Throws `UiError` for
+/// a file that cannot be opened.
+boost::python::dict showDialog(std::string const& title, std::string const& xmlFile, int width, int height,
+                               boost::python::dict const& initialValues);
+
+/// Shows a form made from widget entries and gives its values when it closes.
+boost::python::dict showSimpleDialog(std::string const& title, boost::python::list const& widgets, int width,
+                                     bool cancelButton, boost::python::dict const& initialValues);
+
+/// Shows lines of text and gives the label of the button that closed them.
+std::string showMessageBox(std::string const& title, boost::python::list const& messages,
+                           boost::python::list const& closeButtons);
+
+/// The description of a form made from widget entries.
+std::string makeXmlFromWidgetList(boost::python::list const& widgets, boost::python::list const& closeButtons);
+
+} // namespace Kv::PyextUi

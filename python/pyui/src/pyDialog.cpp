@@ -1,0 +1,388 @@
+#include <boost/python.hpp>
+
+#include "pyDialog.h"
+
+#include "gfx/wsCursorRegistry.h"
+#include "gfx/wsScreen.h"
+#include "pyUiError.h"
+#include "resmgt/xmlDocument.h"
+#include "ui/uiApplication.h"
+#include "ui/uiCursorGuard.h"
+#include "ui/uiDualState.h"
+#include "ui/uiMenu.h"
+#include "ui/uiPushButton.h"
+#include "ui/uiTextField.h"
+#include "ui/uiWidgetFactory.h"
+#include "ui/uiWidgetPredicate.h"
+
+#include <algorithm>
+
+namespace bp = boost::python;
+
+namespace Kv::PyextUi
+{
+
+namespace
+{
+
+/// What the title takes of a window of its own, in pixels.
+constexpr int titleHeight = 24;
+
+int sizeOnScreen(int wanted, int screen)
+{
+    return wanted < 1 ? static_cast<int>(static_cast<float>(screen) * 0.8F) : wanted;
+}
+
+/// The face for events of a widget of one of the four kinds that raise any; null for every other.
+RCShdPtr<PiWidget> findEventFace(RCShdPtr<UiWidget> const& widget)
+{
+    bool const raisesEvents = dynamicCast<UiTextField>(widget) || dynamicCast<UiDualState>(widget) ||
+                              dynamicCast<UiMenu>(widget) || dynamicCast<UiPushButton>(widget);
+    return raisesEvents ? widget->getPiWidget() : nullptr;
+}
+
+bool hasValue(RCShdPtr<UiWidget> const& widget)
+{
+    return dynamicCast<UiTextField>(widget) || dynamicCast<UiDualState>(widget) || dynamicCast<UiMenu>(widget);
+}
+
+/// The value of a widget that has one.
+bp::object readValue(RCShdPtr<UiWidget> const& widget)
+{
+    if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
+        return bp::object(field->getString());
+    if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
+        return bp::object(toggle->getState());
+    return bp::object(dynamicCast<UiMenu>(widget)->getStrPtr());
+}
+
+enum class MenuEntries
+{
+    Replace,
+    Add,
+};
+
+void writeMenu(UiMenu& menu, bp::object const& value, MenuEntries mode, bool invokeCallback)
+{
+    bp::tuple const form = bp::extract<bp::tuple>(value);
+    bp::list const entries = bp::extract<bp::list>(form[0]);
+    int const count = bp::extract<int>(entries.attr("__len__")());
+    if (mode == MenuEntries::Replace)
+        menu.removeAll();
+    for (int i = 0; i < count; ++i)
+        menu.append(bp::extract<std::string>(entries[i])().c_str());
+    menu.setSelection(bp::extract<int>(form[1]), invokeCallback);
+}
+
+/// Writes the value of a widget that has one.
+void writeValue(RCShdPtr<UiWidget> const& widget, bp::object const& value, MenuEntries mode, bool invokeCallback)
+{
+    if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
+        field->setString(bp::extract<char const*>(value), UiTextField::End, false, invokeCallback);
+    else if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
+        toggle->setState(bp::extract<bool>(value), invokeCallback);
+    else
+        writeMenu(*dynamicCast<UiMenu>(widget), value, mode, invokeCallback);
+}
+
+} // namespace
+
+std::string const Dialog::_closeButtonClickedKey = "CloseButtonClicked";
+
+Dialog::Dialog(std::string const& title, std::string const& xmlString, int width, int height,
+               Positionner const& position)
+    : _xml(xmlString), _title(title), _width(width), _height(height), _topLevel(UiAppMgr::getInstance().getTopLevel()),
+      _widgetCbs(makeShd<WidgetCbs>(this))
+{
+    createUi(position);
+}
+
+Dialog::~Dialog()
+{
+    _container->hide();
+    _container->clearParent();
+    WidgetCbs::releaseAll(_callbacks);
+    WidgetCbs::releaseAll(_closeCallbacks);
+}
+
+void Dialog::createUi(Positionner const&)
+{
+    if (_width < 1 || _height < 1)
+    {
+        GeVector2<int> const screen = WsScreen::getInstance().getSize();
+        _width = sizeOnScreen(_width, screen.x);
+        _height = sizeOnScreen(_height, screen.y);
+    }
+    if (_topLevel.isNull())
+    {
+        GeVector2<int> const screen = WsScreen::getInstance().getSize();
+        GeRectangle<int> frame;
+        frame.xMin = (screen.x - _width) / 2;
+        frame.yMin = (screen.y - _height) / 2;
+        frame.xMax = frame.xMin + _width;
+        frame.yMax = frame.yMin + _height + titleHeight;
+        RCShdPtr<WsWindowStyle> const style = WsWindowStyleUtils::getNormalWindowStyle(
+            frame, 0, BorderStyle(0), TitleBarStyle(0), TaskBarStyle(0), StackingStyle(0), CloseButtonStyle(1));
+        _topLevel = UiTopLevel::create(_title.c_str(), _title.c_str(), style, nullptr);
+        _ownTopLevel = true;
+        _container = createTopLevelPanel(_topLevel);
+    }
+    XmlDocument const document(_xml);
+    RCShdPtr<XmlElement> const root = document.getRoot();
+    UiWidgetFactory::createWidget(_container, *root);
+}
+
+RCShdPtr<UiContainer> Dialog::createTopLevelPanel(RCShdPtr<UiTopLevel> const& topLevel)
+{
+    RCShdPtr<UiContainer> const root = topLevel->getRootContainer();
+    constexpr auto fill = UiConstraint::Type(3);
+    constexpr auto low = UiConstraint::Target(0);
+    constexpr auto high = UiConstraint::Target(1);
+    UiConstraint const constraint(0.0F, 0.0F, 0.0F, 0.0F, fill, fill, fill, fill, low, low, high, high, "", "", "", "");
+    RCShdPtr<UiContainer> panel = UiContainer::create(root, "panel", nullptr);
+    panel->setConstraint(constraint);
+    return panel;
+}
+
+std::string Dialog::launch()
+{
+    clearCloseCallbacks();
+    setupCloseCallbacks();
+    if (_ownTopLevel)
+    {
+        UiAppMgr::getInstance().setTopLevel(_topLevel);
+        _topLevel->show();
+    }
+    _container->getParent()->front(_container);
+    _container->show();
+    {
+        UiCursorGuard const cursor(WsCursorRegistry::Normal);
+        _closed = false;
+        UiApplication::getInstance()->localMessageLoop(&_closed, &_closed);
+    }
+    _container->hide();
+    if (_ownTopLevel)
+    {
+        if (RCShdPtr<WsWindow> const window = _topLevel->getOSWindow())
+            window->flushAllEvents();
+        _topLevel->hide();
+        UiAppMgr::getInstance().releaseTopLevel();
+    }
+    return getCloseButtonClicked();
+}
+
+void Dialog::redraw()
+{
+    _topLevel->redraw();
+}
+
+void Dialog::hide() const
+{
+    _container->hide();
+}
+
+std::string Dialog::getCloseButtonClicked() const
+{
+    return _closeButtonClicked;
+}
+
+void Dialog::clearCloseCallbacks()
+{
+    for (RCStrongPtr<CallbackSet> const& set : _closeCallbacks)
+        if (RCShdPtr<UiPushButton> const button = dynamicCast<UiPushButton>(getWidget(set->widgetName)))
+            if (!button->getPiWidget()->removeCallback(set->eventType, set->handler.get()))
+                unwireNamesake(*set);
+    WidgetCbs::releaseAll(_closeCallbacks);
+}
+
+void Dialog::unwireNamesake(CallbackSet const& set) const
+{
+    PrdPredicate<UiWidget> const isNamesake([&set](UiWidget const& widget)
+                                            { return widget.getName() == set.widgetName; });
+    Iterator<RCShdPtr<UiWidget>> widgets = _container->findWidgets(isNamesake);
+    for (widgets.first(); !widgets.atEnd(); widgets.next())
+        if (widgets.item()->getPiWidget()->removeCallback(set.eventType, set.handler.get()))
+            return;
+}
+
+void Dialog::setupCloseCallbacks()
+{
+    PrdPredicate<UiWidget> const isCloseButton =
+        UiWidgetPredicate::isType(RttiGenType1<UiPushButton, UiWidget>::getInstance()) &&
+        UiWidgetPredicate::nameStartsWith(closeButtonPrefix);
+    Iterator<RCShdPtr<UiWidget>> widgets = _container->findWidgets(isCloseButton);
+    if (widgets.getCardinality() == 0)
+        throw UiError(__FILE__, __LINE__, "Cannot close dialog: there must be at least one close button");
+    for (widgets.first(); !widgets.atEnd(); widgets.next())
+    {
+        RCShdPtr<UiPushButton> const button = dynamicCast<UiPushButton>(widgets.item());
+        if (!button)
+            continue;
+        auto const set = makeStrong<CallbackSet>(CallbackSet{button->getName(), PiWidget::Activate, nullptr, {}});
+        _closeCallbacks.push_back(set);
+        _widgetCbs->addCloseHandler(button->getPiWidget(), set);
+    }
+}
+
+RCShdPtr<UiWidget> Dialog::getWidget(std::string const& name) const
+{
+    RCShdPtr<UiWidget> widget = _container->findWidget(LiString(name));
+    if (!widget)
+        throw UiError(__FILE__, __LINE__, "Cannot find widget: the specified widget does not exist.");
+    return widget;
+}
+
+bp::object Dialog::getValue(std::string const& widgetName) const
+{
+    return getWidgetValue(_container, widgetName);
+}
+
+bp::dict Dialog::getValues() const
+{
+    bp::dict values;
+    getWidgetValues(_container, values);
+    return values;
+}
+
+void Dialog::setValue(std::string const& widgetName, bp::object const& value, bool invokeCallback)
+{
+    setWidgetValue(_container, widgetName, value, invokeCallback);
+}
+
+void Dialog::setValue(std::string const& widgetName, bp::object const& value)
+{
+    setValue(widgetName, value, true);
+}
+
+void Dialog::setValues(bp::dict const& values, bool invokeCallback)
+{
+    setWidgetValues(_container, values, invokeCallback);
+}
+
+void Dialog::setValues(bp::dict const& values)
+{
+    setValues(values, true);
+}
+
+bp::object Dialog::getWidgetValue(RCShdPtr<UiContainer> container, std::string const& widgetName) const
+{
+    for (RCShdPtr<UiWidget> const& child : container->getChildren())
+    {
+        if (RCShdPtr<UiContainer> const inner = dynamicCast<UiContainer>(child))
+        {
+            bp::object value = getWidgetValue(inner, widgetName);
+            if (!value.is_none())
+                return value;
+        }
+        else if (hasValue(child) && child->getName() == widgetName)
+            return readValue(child);
+    }
+    return bp::object();
+}
+
+void Dialog::getWidgetValues(RCShdPtr<UiContainer> container, bp::dict& values) const
+{
+    if (std::string const closeButton = getCloseButtonClicked(); !closeButton.empty())
+        values[getCloseButtonClickedKey()] = closeButton;
+    for (RCShdPtr<UiWidget> const& child : container->getChildren())
+    {
+        if (RCShdPtr<UiContainer> const inner = dynamicCast<UiContainer>(child))
+            getWidgetValues(inner, values);
+        else if (hasValue(child))
+            values[child->getName()] = readValue(child);
+    }
+}
+
+bool Dialog::setWidgetValue(RCShdPtr<UiContainer> container, std::string const& widgetName, bp::object const& value,
+                            bool invokeCallback)
+{
+    for (RCShdPtr<UiWidget> const& child : container->getChildren())
+    {
+        if (RCShdPtr<UiContainer> const inner = dynamicCast<UiContainer>(child))
+        {
+            if (setWidgetValue(inner, widgetName, value, invokeCallback))
+                return true;
+        }
+        else if (child->getName() == widgetName && hasValue(child))
+        {
+            writeValue(child, value, MenuEntries::Replace, invokeCallback);
+            return true;
+        }
+    }
+    return false;
+}
+
+void Dialog::setWidgetValues(RCShdPtr<UiContainer> container, bp::dict const& values, bool invokeCallback)
+{
+    for (RCShdPtr<UiWidget> const& child : container->getChildren())
+    {
+        if (RCShdPtr<UiContainer> const inner = dynamicCast<UiContainer>(child))
+            setWidgetValues(inner, values, invokeCallback);
+        else if (values.has_key(child->getName()) && hasValue(child))
+            writeValue(child, values.get(child->getName()), MenuEntries::Add, invokeCallback);
+    }
+}
+
+void Dialog::addCallback(std::string const& widgetName, PiWidget::EventType eventType, PyObject* cb)
+{
+    RCShdPtr<UiWidget> const widget = getWidget(widgetName);
+    auto const set = makeStrong<CallbackSet>(CallbackSet{widgetName, eventType, cb, {}});
+    _callables.add(*set);
+    _callbacks.push_back(set);
+    if (RCShdPtr<PiWidget> const piWidget = findEventFace(widget))
+        _widgetCbs->addPythonHandler(piWidget, set);
+}
+
+void Dialog::removeCallback(std::string const& widgetName, PiWidget::EventType eventType, PyObject* cb)
+{
+    RCShdPtr<UiWidget> const widget = getWidget(widgetName);
+    auto const found =
+        std::find_if(_callbacks.begin(), _callbacks.end(),
+                     [&](RCStrongPtr<CallbackSet> const& set)
+                     { return set->widgetName == widgetName && set->eventType == eventType && set->callable == cb; });
+    if (found == _callbacks.end())
+        return;
+    RCStrongPtr<CallbackSet> const set = *found;
+    if (RCShdPtr<PiWidget> const piWidget = findEventFace(widget))
+        piWidget->removeCallback(eventType, set->handler.get());
+    _callbacks.erase(found);
+    WidgetCbs::release(set);
+    _callables.remove(*set);
+}
+
+void Dialog::setWidgetResourceName(std::string const& widgetName, std::string const& resName)
+{
+    UiWidget::setWidgetResTable(getWidget(widgetName), resName);
+}
+
+void Dialog::displayWidget(std::string const& widgetName, bool display) const
+{
+    getWidget(widgetName)->display(display);
+}
+
+void Dialog::showWidget(std::string const& widgetName) const
+{
+    getWidget(widgetName)->display(true);
+}
+
+void Dialog::hideWidget(std::string const& widgetName) const
+{
+    getWidget(widgetName)->display(false);
+}
+
+bool Dialog::isDisplayed(std::string const& widgetName) const
+{
+    return getWidget(widgetName)->isDisplayed();
+}
+
+void Dialog::enableWidget(std::string const& widgetName, bool enable) const
+{
+    getWidget(widgetName)->setEnabled(enable);
+}
+
+bool Dialog::isEnabled(std::string const& widgetName) const
+{
+    return getWidget(widgetName)->isEnabled();
+}
+
+} // namespace Kv::PyextUi

@@ -1,0 +1,145 @@
+#pragma once
+
+#include <boost/python/dict.hpp>
+#include <boost/python/object.hpp>
+
+#include "appUi/uiAppMgr.h"
+#include "base/rcShdPtr.h"
+#include "base/rcStrongPtr.h"
+#include "kvPyextUiExport.h"
+#include "pyCallables.h"
+#include "pyWidgetCbs.h"
+#include "ui/uiContainer.h"
+#include "ui/uiTopLevel.h"
+
+#include <string>
+#include <vector>
+
+namespace Kv::PyextUi
+{
+
+/// A push button whose name starts with this closes its dialog.
+inline std::string const closeButtonPrefix = "CloseButton_";
+
+/// A dialog: a window built from a description, whose widgets a script fills, reads and hears of, and which runs
+/// modally until one of its close buttons is pressed. Held through `RCShdPtr`; owns its window and every handler that
+/// it gives to the widgets in it.
+///
+/// A failure that the dialog finds itself is a `UiError`; those of the host pass through.
+class KVPYEXTUI_API Dialog : public RCBase<LkCounter<int>>
+{
+public:
+    /// Places a dialog inside the application: its vertical centre lies on a boundary of equal bands of the main panel.
+    struct Positionner
+    {
+        Positionner(int divisionCount, int boundary) : divisions(divisionCount), position(boundary) {}
+
+        /// The number of bands; not zero.
+        int divisions;
+        /// The index of the boundary.
+        int position;
+    };
+
+    /// Builds the dialog; it stands on no screen before `launch`. `xmlString` is the description itself, `width` and
+    /// `height` are the size of the content in pixels, where anything below 1 stands for 80 % of the screen.
+    Dialog(std::string const& title, std::string const& xmlString, int width, int height, Positionner const& position);
+    Dialog(Dialog const&) = delete;
+    Dialog& operator=(Dialog const&) = delete;
+    ~Dialog() override;
+
+    /// Shows the dialog and blocks until a close button ends it. Gives the button's name. What a script's callback
+    /// raises comes out of it.
+    virtual std::string launch();
+
+    /// Paints the window anew.
+    virtual void redraw();
+
+    /// Name of the close button pressed last; empty before the first.
+    virtual std::string getCloseButtonClicked() const;
+
+    /// The key under which `getValues` gives the close button.
+    static std::string const& getCloseButtonClickedKey() { return _closeButtonClickedKey; }
+
+    void hide() const;
+
+    /// The next press of a close button, only that, leaves the dialog open.
+    void disableNextClose() { _disableNextClose = true; }
+
+    /// The value of the first widget of that name that has one; None if there is none, or it holds none.
+    boost::python::object getValue(std::string const& widgetName) const;
+
+    /// The values by widget name, and the close button pressed last if there is one.
+    boost::python::dict getValues() const;
+
+    /// Writes the first widget of that name that takes a value; without one nothing happens. With `invokeCallback` the
+    /// callbacks of the change run.
+    void setValue(std::string const& widgetName, boost::python::object const& value, bool invokeCallback);
+    void setValue(std::string const& widgetName, boost::python::object const& value);
+
+    /// Writes every widget that `values` names, in the order of the widgets. The entries of a menu are added to those
+    /// that it has.
+    void setValues(boost::python::dict const& values, bool invokeCallback);
+    void setValues(boost::python::dict const& values);
+
+    /// Calls `cb` for events of that type on the widget from now on. `cb` is kept until it is removed.
+    void addCallback(std::string const& widgetName, PiWidget::EventType eventType, PyObject* cb);
+
+    /// Takes back the first `addCallback` with the same widget, type and object; without one nothing happens.
+    void removeCallback(std::string const& widgetName, PiWidget::EventType eventType, PyObject* cb);
+
+    /// Names the resource in which the widget's tooltip stands.
+    void setWidgetResourceName(std::string const& widgetName, std::string const& resName);
+
+    void displayWidget(std::string const& widgetName, bool display) const;
+    void showWidget(std::string const& widgetName) const;
+    void hideWidget(std::string const& widgetName) const;
+    bool isDisplayed(std::string const& widgetName) const;
+    void enableWidget(std::string const& widgetName, bool enable) const;
+    bool isEnabled(std::string const& widgetName) const;
+
+    /// The callables of the scripts' callbacks, whose references the wrappers of the dialog share.
+    PyCallables& getCallables() { return _callables; }
+
+protected:
+    virtual boost::python::object getWidgetValue(RCShdPtr<UiContainer> container, std::string const& widgetName) const;
+    virtual void getWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict& values) const;
+    /// True once a widget has taken the value.
+    virtual bool setWidgetValue(RCShdPtr<UiContainer> container, std::string const& widgetName,
+                                boost::python::object const& value, bool invokeCallback);
+    virtual void setWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict const& values,
+                                 bool invokeCallback);
+
+private:
+    friend class WidgetCbs;
+
+    using CallbackSets = std::vector<RCStrongPtr<CallbackSet>>;
+
+    void createUi(Positionner const& position);
+    static RCShdPtr<UiContainer> createTopLevelPanel(RCShdPtr<UiTopLevel> const& topLevel);
+
+    void clearCloseCallbacks();
+    /// Takes the handler of a close button from the button that has it, where several bear the name.
+    void unwireNamesake(CallbackSet const& set) const;
+    void setupCloseCallbacks();
+
+    RCShdPtr<UiWidget> getWidget(std::string const& name) const;
+
+    static std::string const _closeButtonClickedKey;
+
+    std::string _xml;
+    std::string _title;
+    int _width;
+    int _height;
+    bool _ownTopLevel = false;
+    RCShdPtr<UiTopLevel> _topLevel;
+    RCShdPtr<UiContainer> _container;
+    std::string _closeButtonClicked;
+    RCShdPtr<WidgetCbs> _widgetCbs;
+    CallbackSets _closeCallbacks;
+    CallbackSets _callbacks;
+    PyCallables _callables;
+    bool _closed;
+    bool _disableNextClose = false;
+};
+
+} // namespace Kv::PyextUi

@@ -1,0 +1,70 @@
+#include <boost/python.hpp>
+#include <boost/python/object/find_instance.hpp>
+
+#include "pyDialogHolder.h"
+
+namespace bp = boost::python;
+
+namespace Kv::PyextUi
+{
+
+namespace
+{
+
+class SharingDialog : public ManagedDialog
+{
+public:
+    explicit SharingDialog(RCShdPtr<Dialog> const& dialog) : ManagedDialog(dialog)
+    {
+        dialog->getCallables().addShare();
+    }
+    SharingDialog(SharingDialog const&) = delete;
+    SharingDialog& operator=(SharingDialog const&) = delete;
+    ~SharingDialog() override { getValue()->getCallables().releaseShare(); }
+};
+
+/// The callables that a Python object may report as its own: those of a dialog that nobody but such objects holds.
+PyObject* findOwnedCallables(PyObject* self)
+{
+    auto const* const managed = static_cast<RCShdPtr<ManagedDialog> const*>(
+        bp::objects::find_instance_impl(self, bp::type_id<RCShdPtr<ManagedDialog>>()));
+    if (!managed || !dynamic_cast<SharingDialog const*>(managed->get()) || (*managed)->getReferenceCount() != 1)
+        return nullptr;
+    Dialog& dialog = *(*managed)->getValue();
+    return dialog.getReferenceCount() == dialog.getCallables().getShareCount() ? dialog.getCallables().getDictionary()
+                                                                               : nullptr;
+}
+
+// Neither of the two calls the slot of the base class, which would find these again and never end.
+
+int traverse(PyObject* self, visitproc visit, void* arg)
+{
+    Py_VISIT(Py_TYPE(self));
+    if (PyObject* const* const dictionary = _PyObject_GetDictPtr(self))
+        Py_VISIT(*dictionary);
+    Py_VISIT(findOwnedCallables(self));
+    return 0;
+}
+
+/// What keeps the callables is their dictionary, which the collector clears itself.
+int clear(PyObject* self)
+{
+    if (PyObject** const dictionary = _PyObject_GetDictPtr(self))
+        Py_CLEAR(*dictionary);
+    return 0;
+}
+
+} // namespace
+
+RCShdPtr<ManagedDialog> makeManaged(RCShdPtr<Dialog> const& dialog)
+{
+    return RCShdPtr<ManagedDialog>(new SharingDialog(dialog));
+}
+
+void supportGarbageCollection(PyTypeObject* dialogClass)
+{
+    dialogClass->tp_traverse = traverse;
+    dialogClass->tp_clear = clear;
+}
+
+} // namespace Kv::PyextUi

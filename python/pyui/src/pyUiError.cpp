@@ -1,0 +1,8 @@
+#include "pyUiError.h"
+
+namespace Kv::PyextInit
+{
+
+template class ModError<PyextUi::Ui>;
+
+} // namespace Kv::PyextInit

@@ -1,0 +1,66 @@
+#pragma once
+
+#include <Python.h>
+
+#include "base/cbHandler.h"
+#include "base/rcBase.h"
+#include "base/rcShdPtr.h"
+#include "base/rcStrongPtr.h"
+#include "ui/piWidget.h"
+
+#include <string>
+#include <vector>
+
+namespace Kv
+{
+
+/// One wired callback: of a close button, or of a script. It and its handler hold each other until `release`, so that
+/// both outlive a dispatch in which they are taken out.
+struct CallbackSet
+{
+    std::string widgetName;
+    PiWidget::EventType eventType;
+    /// The script's callable, borrowed; null for a close button.
+    PyObject* callable;
+    /// Null for a script's callback on a widget that raises no events.
+    RCStrongPtr<CbHandler<EvEvent>> handler;
+};
+
+} // namespace Kv
+
+namespace Kv::PyextUi
+{
+
+class Dialog;
+
+/// What the handlers of a dialog are bound to. Turns events into the close of the dialog and into calls of Python.
+class WidgetCbs : public RCBase<LkCounter<int>>
+{
+public:
+    /// `dialog` is borrowed: it owns the hub.
+    explicit WidgetCbs(Dialog* dialog) : _dialog(dialog) {}
+
+    /// Wires a set of a close button to the button's events.
+    void addCloseHandler(RCShdPtr<PiWidget> const& piWidget, RCStrongPtr<CallbackSet> const& set);
+
+    /// Wires a set of a script to a widget's events.
+    void addPythonHandler(RCShdPtr<PiWidget> const& piWidget, RCStrongPtr<CallbackSet> const& set);
+
+    /// Lets go of what a set and its handler hold of each other. A dispatch under way goes on with both.
+    static void release(RCStrongPtr<CallbackSet> const& set);
+
+    /// Releases each set, first to last, and empties the vector.
+    static void releaseAll(std::vector<RCStrongPtr<CallbackSet>>& sets);
+
+private:
+    using Handler = CbDataMethod<WidgetCbs, EvEvent, RCStrongPtr<CallbackSet>>;
+
+    void addHandler(RCShdPtr<PiWidget> const& piWidget, RCStrongPtr<CallbackSet> const& set, Handler::Method method);
+
+    void onCloseButton(EvEvent& event, RCStrongPtr<CallbackSet> set);
+    void onEvent(EvEvent& event, RCStrongPtr<CallbackSet> set);
+
+    Dialog* _dialog;
+};
+
+} // namespace Kv::PyextUi

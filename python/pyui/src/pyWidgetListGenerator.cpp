@@ -1,0 +1,323 @@
+#include <boost/python.hpp>
+
+#include "pyWidgetListGenerator.h"
+
+#include "base/cbHandler.h"
+#include "gfx/wsFontRegistry.h"
+#include "pyDialog.h"
+#include "pyUiError.h"
+#include "resmgt/liStringSubstituter.h"
+#include "resmgt/liStringUtil.h"
+#include "resmgt/xmlWriter.h"
+#include "ui/uiConstraint.h"
+
+#include <algorithm>
+#include <sstream>
+
+namespace bp = boost::python;
+
+namespace Kv::PyextUi
+{
+
+namespace
+{
+
+std::string const textFieldType = "TextField";
+std::string const toggleButtonType = "ToggleButton";
+std::string const pushButtonType = "PushButton";
+std::string const menuType = "Menu";
+std::string const labelType = "Label";
+std::string const closeButtonsContainer = "CloseButtonsContainer";
+
+// All in layout units.
+constexpr int rowPitch = 4;
+constexpr int rowHeight = 4;
+constexpr int captionMargin = 3;
+constexpr int toggleButtonWidth = 4;
+constexpr int menuWidth = 20;
+constexpr int rightMargin = -1;
+constexpr int pushButtonMargin = 4;
+constexpr int closeButtonWidth = 12;
+constexpr int closeButtonStep = 14;
+constexpr int closeButtonHeight = 4;
+constexpr int closeBarHeight = 5;
+
+// The width of the caption column is known only when all rows are written. Until then these stand in for it.
+constexpr int labelColumnPlaceholder = -999;
+constexpr int widgetColumnPlaceholder = -888;
+
+struct Substituter
+{
+    void writeNumber(std::string& text, int number) { text = LiStringUtil::convertNb(number); }
+};
+
+int lengthOf(bp::object const& sequence)
+{
+    return bp::extract<int>(sequence.attr("__len__")());
+}
+
+int measurePushButton(std::string const& name)
+{
+    int const pixels = static_cast<int>(WsFontRegistry::getInstance().getDefaultFont()->getStringWidth(name.c_str()));
+    return static_cast<int>(UiConstraint::pixelsToUIUnits({static_cast<float>(pixels), 0}).x) + pushButtonMargin;
+}
+
+} // namespace
+
+WidgetListGenerator::WidgetListGenerator(bp::list const& widgetEntries, bp::list const& closeButtonLabels)
+    : _widgets(widgetEntries), _closeButtons(closeButtonLabels)
+{
+    if (lengthOf(_closeButtons) == 0)
+        _closeButtons.append(okLabel);
+}
+
+WidgetListGenerator::~WidgetListGenerator() = default;
+
+std::string WidgetListGenerator::generate()
+{
+    std::ostringstream stream;
+    _writer = std::make_unique<XmlWriter>(stream, 2);
+    writeContainerHead("MainContainer", {1, "u", "l", ""}, {1, "u", "b", ""}, {-1, "uu", "r", ""}, {-4, "uu", "t", ""});
+    writeContainerHead(closeButtonsContainer, {0, "u", "l", ""}, {0, "u", "b", ""}, {0, "uu", "r", ""},
+                       {closeBarHeight, "u", "h", ""});
+    writeCloseButtons();
+    _writer->closeTag();
+    _writer->closeTag();
+    writeContainerHead("UserDefinedWidgetsContainer", {0, "u", "l", ""}, {1, "u", "s", closeButtonsContainer},
+                       {0, "uu", "r", ""}, {0, "uu", "t", ""});
+    int const labelColumnWidth = writeRows();
+    for (int i = 0; i < 4; ++i)
+        _writer->closeTag();
+    std::string text = stream.str();
+    _writer.reset();
+    substitutePlaceholders(text, labelColumnWidth);
+    return text;
+}
+
+int WidgetListGenerator::writeRows()
+{
+    std::size_t longest = 0;
+    int rowOffset = 0;
+    int const count = lengthOf(_widgets);
+    for (int index = 0; index < count; ++index)
+    {
+        WidgetEntry const entry = readWidgetEntry(index);
+        longest = std::max(longest, entry.label.size());
+        writeRow(entry.type, entry.name, entry.label, rowOffset, entry.value);
+        rowOffset += rowPitch;
+    }
+    return longest == 0 ? 0 : static_cast<int>(longest) + captionMargin;
+}
+
+void WidgetListGenerator::writeContainerHead(std::string const& name, Edge const& x1, Edge const& y1, Edge const& x2,
+                                             Edge const& y2)
+{
+    _writer->openTag("Container");
+    _writer->openTag("Widget");
+    _writer->writeAttrib("Name", name);
+    writeConstraint(x1, y1, x2, y2);
+    _writer->closeTag();
+    _writer->openTag("Group");
+    _writer->writeAttrib("Type", "Children");
+}
+
+void WidgetListGenerator::writeCloseButtons()
+{
+    int const count = lengthOf(_closeButtons);
+    int x = 0;
+    for (int i = 0; i < count; ++i)
+    {
+        std::string const label = bp::extract<std::string>(_closeButtons[i]);
+        bool const alignRight = i == 1 && count == 2;
+        writeCloseButton(label, x, closeButtonWidth, alignRight);
+        x += closeButtonStep;
+    }
+}
+
+void WidgetListGenerator::writeCloseButton(std::string const& label, int x, int width, bool alignRight)
+{
+    _writer->openTag(pushButtonType);
+    _writer->openTag("Widget");
+    _writer->writeAttrib("Name", closeButtonPrefix + label);
+    writeLabelString(label);
+    if (alignRight)
+        writeConstraint({width, "u", "w", ""}, {0, "u", "b", ""}, {0, "uu", "r", ""},
+                        {closeButtonHeight, "u", "h", ""});
+    else
+        writeConstraint({x, "u", "l", ""}, {0, "u", "b", ""}, {width, "u", "w", ""}, {closeButtonHeight, "u", "h", ""});
+    writeLabelAlign("Center", "Center");
+    _writer->closeTag();
+    _writer->closeTag();
+}
+
+WidgetListGenerator::WidgetEntry WidgetListGenerator::readWidgetEntry(int index) const
+{
+    bp::tuple const entry = bp::extract<bp::tuple>(_widgets[index]);
+    int const length = lengthOf(entry);
+    if (length < 2)
+        throw UiError(__FILE__, __LINE__, "Incomplete widget description");
+    WidgetEntry read;
+    read.type = bp::extract<std::string>(entry[0]);
+    read.name = bp::extract<std::string>(entry[1]);
+    if (length >= 3)
+        read.label = bp::extract<std::string>(entry[2]);
+    if (length >= 4)
+        read.value = entry[3];
+    return read;
+}
+
+void WidgetListGenerator::writeRow(std::string const& type, std::string const& name, std::string const& label,
+                                   int rowOffset, bp::object const& value)
+{
+    if (!label.empty())
+    {
+        writeRowLabel(label, rowOffset);
+        _writer->closeTag();
+        _writer->closeTag();
+    }
+    void (WidgetListGenerator::*writeValue)(bp::object const&) = nullptr;
+    if (type == textFieldType)
+    {
+        openRowWidget(type, name, rowOffset, rightMargin, "r");
+        writeValue = &WidgetListGenerator::writeTextValue;
+    }
+    else if (type == toggleButtonType)
+    {
+        openRowWidget(type, name, rowOffset, toggleButtonWidth, "w");
+        writeValue = &WidgetListGenerator::writeStateValue;
+    }
+    else if (type == menuType)
+    {
+        openRowWidget(type, name, rowOffset, menuWidth, "w");
+        writeValue = &WidgetListGenerator::writeMenuValue;
+    }
+    else if (type == labelType)
+    {
+        openRowWidget(type, name, rowOffset, 0, "r");
+        writeValue = &WidgetListGenerator::writeTextValue;
+    }
+    else if (type == pushButtonType)
+        openRowWidget(type, name, rowOffset, measurePushButton(name), "w");
+    else
+        openRowWidget(type, name, rowOffset, rightMargin, "r");
+    if (writeValue)
+    {
+        int const truth = PyObject_IsTrue(value.ptr());
+        if (truth < 0)
+            bp::throw_error_already_set();
+        if (truth > 0)
+            (this->*writeValue)(value);
+    }
+    _writer->closeTag();
+    _writer->closeTag();
+}
+
+void WidgetListGenerator::writeRowLabel(std::string const& label, int rowOffset)
+{
+    _writer->openTag(labelType);
+    _writer->openTag("Widget");
+    _writer->writeAttrib("Name", labelType + "_" + label);
+    writeConstraint({0, "u", "l", ""}, {rowHeight, "u", "h", ""}, {labelColumnPlaceholder, "u", "w", ""},
+                    {-rowOffset, "uu", "t", ""});
+    writeLabelString(label);
+    writeLabelAlign("Left", "Center");
+}
+
+void WidgetListGenerator::openRowWidget(std::string const& type, std::string const& name, int rowOffset, int x2Value,
+                                        std::string const& x2Target)
+{
+    bool const isPushButton = type == pushButtonType;
+    _writer->openTag(type);
+    _writer->openTag("Widget");
+    _writer->writeAttrib("Name", name);
+    if (isPushButton)
+        writeLabelString(name);
+    writeConstraint({widgetColumnPlaceholder, "u", "l", ""}, {rowHeight, "u", "h", ""}, {x2Value, "uu", x2Target, ""},
+                    {-rowOffset, "uu", "t", ""});
+    writeLabelAlign(isPushButton ? "Center" : "Left", "Center");
+}
+
+void WidgetListGenerator::writeConstraint(Edge const& x1, Edge const& y1, Edge const& x2, Edge const& y2)
+{
+    _writer->openTag("Layout");
+    _writer->openTag("Constraint");
+    writeEdge("X1", x1.value, x1.type, x1.target, x1.sibling);
+    writeEdge("Y1", y1.value, y1.type, y1.target, y1.sibling);
+    writeEdge("X2", x2.value, x2.type, x2.target, x2.sibling);
+    writeEdge("Y2", y2.value, y2.type, y2.target, y2.sibling);
+    _writer->closeTag();
+    _writer->closeTag();
+}
+
+void WidgetListGenerator::writeEdge(std::string const& edge, int value, std::string const& type,
+                                    std::string const& target, std::string const& sibling)
+{
+    _writer->openTag(edge);
+    _writer->writeAttrib("Value", value);
+    _writer->writeAttrib("Type", type);
+    _writer->writeAttrib("Target", target);
+    if (!sibling.empty())
+        _writer->writeAttrib("Sibling", sibling);
+    _writer->closeTag();
+}
+
+void WidgetListGenerator::writeLabelString(std::string const& text)
+{
+    _writer->openTag("LabelString");
+    _writer->writeTag("Text", text);
+    _writer->closeTag();
+}
+
+void WidgetListGenerator::writeLabelAlign(std::string const& h, std::string const& v)
+{
+    _writer->openTag("LabelAlign");
+    _writer->openTag("Align");
+    _writer->writeAttrib("H", h);
+    _writer->writeAttrib("V", v);
+    _writer->closeTag();
+    _writer->closeTag();
+}
+
+void WidgetListGenerator::writeTextValue(bp::object const& value)
+{
+    std::string const text = bp::extract<std::string>(value);
+    if (!text.empty())
+        writeLabelString(text);
+}
+
+void WidgetListGenerator::writeStateValue(bp::object const& value)
+{
+    _writer->openTag("State");
+    bool const state = bp::extract<bool>(value);
+    _writer->writeTag("Int", state ? 1 : 0);
+    _writer->closeTag();
+}
+
+void WidgetListGenerator::writeMenuValue(bp::object const& value)
+{
+    bp::tuple const form = bp::extract<bp::tuple>(value);
+    bp::list const items = bp::extract<bp::list>(form[0]);
+    int const selection = bp::extract<int>(form[1]);
+    _writer->openTag("MenuString");
+    int const count = lengthOf(items);
+    for (int i = 0; i < count; ++i)
+        _writer->writeTag("Text", bp::extract<std::string>(items[i])());
+    _writer->closeTag();
+    _writer->openTag("Selection");
+    _writer->writeTag("Int", selection);
+    _writer->closeTag();
+}
+
+void WidgetListGenerator::substitutePlaceholders(std::string& text, int width)
+{
+    using NumberHandler = CbDataMethod<Substituter, std::string, int>;
+    Substituter writer;
+    NumberHandler labelColumn(&writer, &Substituter::writeNumber, width);
+    NumberHandler widgetColumn(&writer, &Substituter::writeNumber, width);
+    LiStringSubstituter substituter;
+    substituter.add(LiStringUtil::convertNb(labelColumnPlaceholder), &labelColumn);
+    substituter.add(LiStringUtil::convertNb(widgetColumnPlaceholder), &widgetColumn);
+    text = substituter.substitute(text);
+}
+
+} // namespace Kv::PyextUi

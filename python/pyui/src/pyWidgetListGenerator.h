@@ -1,0 +1,84 @@
+#pragma once
+
+#include <boost/python/list.hpp>
+#include <boost/python/object.hpp>
+
+#include <memory>
+#include <string>
+
+namespace Kv
+{
+
+class XmlWriter;
+
+namespace PyextUi
+{
+
+/// The label of the close button that a dialog always has.
+inline std::string const okLabel = "OK";
+
+/// Turns a list of widget entries into the description of a form: a row for each entry, with a caption on the left and
+/// the widget on the right, and a bar of close buttons along the bottom. Each entry is a tuple ( type, name, label,
+/// initial state ), of which the last two can be left out. Made for one call of `generate`.
+class WidgetListGenerator
+{
+public:
+    /// Both lists are shared with the caller: an empty `closeButtons` gets "OK" as its one label.
+    WidgetListGenerator(boost::python::list const& widgetEntries, boost::python::list const& closeButtonLabels);
+    ~WidgetListGenerator();
+
+    /// The description. Throws `UiError` for an entry that is too short, and sets Python's `TypeError` or `IndexError`
+    /// for one of the wrong form.
+    std::string generate();
+
+private:
+    struct WidgetEntry
+    {
+        std::string type;
+        std::string name;
+        std::string label;
+        boost::python::object value;
+    };
+
+    /// Where an edge lies, as the description says it.
+    struct Edge
+    {
+        int value;
+        std::string type;
+        std::string target;
+        std::string sibling;
+    };
+
+    /// Writes the rows and gives the width of the caption column, in layout units.
+    int writeRows();
+
+    /// Leaves the `Container` and its `Group` open.
+    void writeContainerHead(std::string const& name, Edge const& x1, Edge const& y1, Edge const& x2, Edge const& y2);
+    void writeCloseButtons();
+    void writeCloseButton(std::string const& label, int x, int width, bool alignRight);
+    WidgetEntry readWidgetEntry(int index) const;
+    void writeRow(std::string const& type, std::string const& name, std::string const& label, int rowOffset,
+                  boost::python::object const& value);
+    /// Leaves the `Label` and its `Widget` open.
+    void writeRowLabel(std::string const& label, int rowOffset);
+    /// Leaves the widget element and its `Widget` open.
+    void openRowWidget(std::string const& type, std::string const& name, int rowOffset, int x2Value,
+                       std::string const& x2Target);
+    void writeConstraint(Edge const& x1, Edge const& y1, Edge const& x2, Edge const& y2);
+    void writeEdge(std::string const& edge, int value, std::string const& type, std::string const& target,
+                   std::string const& sibling);
+    void writeLabelString(std::string const& text);
+    void writeLabelAlign(std::string const& h, std::string const& v);
+    void writeTextValue(boost::python::object const& value);
+    void writeStateValue(boost::python::object const& value);
+    void writeMenuValue(boost::python::object const& value);
+    static void substitutePlaceholders(std::string& text, int width);
+
+    boost::python::list _widgets;
+    boost::python::list _closeButtons;
+    std::unique_ptr<XmlWriter> _writer;
+};
+
+} // namespace PyextUi
+
+} // namespace Kv

@@ -1,0 +1,268 @@
+#pragma once
+
+namespace Kv::PyextUi::Docs
+{
+
+// The docstrings of the module, in epydoc markup.
+
+constexpr char const* module = "Quorvane Velmora internal UI extension module.";
+
+constexpr char const* showDialog =
+    R"(Shows a dialog that a file describes, and blocks until one of its close buttons is pressed.
+
+@param title: The title of the dialog.
+@type title: C{str}
+@param xmlFile: The path of the file with the dialog's description, in XML.
+@type xmlFile: C{str}
+@param width: The width of the dialog's content in pixels. A value below 1 stands for 80 % of the screen.
+Defaults to -1.
+@type width: C{int}
+@param height: The height of the dialog's content in pixels. A value below 1 stands for 80 % of the screen.
+Defaults to -1.
+@type height: C{int}
+@param initialValues: The values that the widgets start with, by widget name, in the forms of L{Dialog.setValues}.
+No callback runs for them. Defaults to {}.
+@type initialValues: C{dict}
+@return: The widgets' values by widget name as they stood when the dialog closed, whichever button closed it, and the
+name of that button under C{CloseButtonClicked}.
+@rtype: C{dict}
+@raise UiError: If the file cannot be opened, or the dialog has no close button.
+@raise RuntimeError: If the description is faulty (the words name the line), or if there is no display to show it on.)";
+
+constexpr char const* showSimpleDialog =
+    R"(Shows a form made from a list of widgets, and blocks until it is closed. Example::
+
+    values = ui.showSimpleDialog( 'Awards', [
+        ( 'TextField', 'Show', 'Show', 'Academy Awards' ),
+        ( 'ToggleButton', 'Win', 'Do you win ?', True ) ], 400, True )
+    if values[ 'CloseButtonClicked' ] == 'CloseButton_OK':
+        print( values[ 'Show' ], values[ 'Win' ] )
+
+@param title: The title of the dialog.
+@type title: C{str}
+@param list: The widgets from top to bottom, in the form of L{makeXmlFromWidgetList}.
+@type list: C{list}
+@param width: The width of the dialog's content in pixels. The height follows from the number of widgets.
+@type width: C{int}
+@param cancelButton: Whether there is a button "Cancel" beside "OK". Default is C{False}.
+@type cancelButton: C{bool}
+@param initialValues: The values that the widgets start with, by widget name, in the forms of L{Dialog.setValues}.
+No callback runs for them. Defaults to {}.
+@type initialValues: C{dict}
+@return: The widgets' values by widget name as they stood when the dialog closed, whichever button closed it, and the
+name of that button, C{CloseButton_OK} or C{CloseButton_Cancel}, under C{CloseButtonClicked}.
+@rtype: C{dict}
+@raise UiError: If an entry of the list has fewer than two elements.
+@raise TypeError: If an entry or a value is of the wrong form.
+@raise RuntimeError: If a widget type is unknown, or if there is no display to show the dialog on.)";
+
+constexpr char const* showMessageBox =
+    R"(Shows lines of text, and blocks until one of the close buttons is pressed. The box is as wide as its longest line.
+
+@param title: The title of the box.
+@type title: C{str}
+@param messages: The lines from top to bottom.
+@type messages: C{list} of C{str}
+@param closeButtons: The labels of the close buttons. An empty list gets the label "OK". Defaults to [].
+@type closeButtons: C{list} of C{str}
+@return: The label of the button that closed the box.
+@rtype: C{str}
+@raise IndexError: If the box was ended without one of its buttons.
+@raise RuntimeError: If there is no display to show the box on.)";
+
+constexpr char const* makeXmlFromWidgetList =
+    R"(Makes the description of a form from a list of widgets: a row for each, with its label on the left, and the close
+buttons along the bottom. Nothing is shown.
+
+@param widgets: The widgets from top to bottom, each a tuple ( type, name, label, initial state ) of which the last two
+can be left out. The type is one of C{TextField}, C{ToggleButton}, C{Menu}, C{Label} and C{PushButton}. The initial state
+of a C{TextField} or C{Label} is a C{str}, that of a C{ToggleButton} a C{bool}, that of a C{Menu} a tuple of the list of
+its entries and the index of the selected one. A C{PushButton} shows its name.
+@type widgets: C{list} of C{tuple}
+@param closeButtons: The labels of the close buttons. The button's name is C{CloseButton_} and the label. An empty list
+gets the label "OK". Defaults to [].
+@type closeButtons: C{list} of C{str}
+@return: The description, for L{createDialog}.
+@rtype: C{str}
+@raise UiError: If an entry has fewer than two elements.
+@raise TypeError: If an entry or a value is of the wrong form.
+@raise RuntimeError: If a text holds a character that a description cannot hold.)";
+
+constexpr char const* createDialog =
+    R"(Makes a dialog from a description. It is launched by L{Dialog.launch}.
+
+@param title: The title of the dialog.
+@type title: C{str}
+@param xmlString: The dialog's description, in XML.
+@type xmlString: C{str}
+@param width: The width of the dialog's content in pixels. A value below 1 stands for 80 % of the screen.
+Defaults to -1.
+@type width: C{int}
+@param height: The height of the dialog's content in pixels. A value below 1 stands for 80 % of the screen.
+Defaults to -1.
+@type height: C{int}
+@param initialValues: The values that the widgets start with, by widget name, in the forms of L{Dialog.setValues}.
+No callback runs for them. Defaults to {}.
+@type initialValues: C{dict}
+@return: The dialog.
+@rtype: L{Dialog}
+@raise RuntimeError: If the description is faulty; the words name the line.)";
+
+constexpr char const* dialog =
+    R"(A dialog, whose widgets can be filled, read, and heard of. There is no public constructor: L{createDialog} is the only
+way to get hold of a C{Dialog}.
+
+A dialog can use four kinds of widgets: push button, toggle button, text field and menu. A push button whose name begins
+with C{CloseButton_} closes the dialog.
+
+A widget raises these events, for which L{addCallback} registers a callable:
+  - C{EventType.ENABLE}: a widget has been enabled
+  - C{EventType.DISABLE}: a widget has been disabled
+  - C{EventType.STATE}: a toggle button's state has changed
+  - C{EventType.ACTIVATE}: a widget has been activated (clicked)
+  - C{EventType.VALUE_CHANGED}: a text field's value has been changed, when the user changes it and presses the Enter key
+
+Example::
+
+    def myCallbackFunction1( dialog, widgetName, eventType ):
+        print( widgetName, dialog.getValue( widgetName ) )
+
+    xml = ui.makeXmlFromWidgetList( [ ( 'ToggleButton', 'Vote', 'Do you vote ?' ) ], [ 'OK', 'Cancel' ] )
+    dialog = ui.createDialog( 'MyDialog', xml, 400, 84 )
+    dialog.addCallback( 'Vote', ui.EventType.ACTIVATE, myCallbackFunction1 )
+    dialog.launch()
+    print( dialog.getValues() ))";
+
+constexpr char const* launch =
+    R"(Shows the dialog and blocks until one of its close buttons is pressed. It can be launched any number of times; its
+widgets keep their values. What a callback raises in the meantime comes out of it.
+
+@return: The name of the close button.
+@rtype: C{str}
+@raise UiError: If the dialog has no close button.
+@raise RuntimeError: If there is no display to show the dialog on.)";
+
+constexpr char const* getValue =
+    R"(Gets the value of a widget: the text of a text field as a C{str}, the state of a toggle button as a C{bool}, the text
+of the selected entry of a menu as a C{str}.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@return: The value, or C{None} if no widget of that name has one.
+@rtype: C{str}, C{bool} or C{None})";
+
+constexpr char const* getValues =
+    R"(Gets the values of all widgets, each in the form of L{getValue}.
+
+@return: The values by widget name. Once a close button has been pressed, its name is there under
+C{CloseButtonClicked}.
+@rtype: C{dict})";
+
+constexpr char const* setValue =
+    R"(Sets the value of a widget. Nothing happens if no widget of that name takes one.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@param value: The value: a C{str} or C{None} for a text field, a C{bool} for a toggle button, a tuple of the list of the
+entries and the index of the selected one for a menu, whose entries are replaced.
+@param invokeCallback: Whether the callbacks of the widget run for the change. Defaults to C{True}.
+@type invokeCallback: C{bool}
+@raise TypeError: If the value is of the wrong form.
+@raise IndexError: If the tuple for a menu is too short.)";
+
+constexpr char const* setValues =
+    R"(Sets the values of the widgets that C{values} names, from the top of the dialog to the bottom. A name that no widget
+has is ignored.
+
+@param values: The values by widget name, each in the form of L{setValue}; but the entries of a menu are added to
+those that it has, and the index counts in all of them.
+@type values: C{dict}
+@param invokeCallback: Whether the callbacks of the widgets run for the changes. Defaults to C{True}.
+@type invokeCallback: C{bool}
+@raise TypeError: If a value is of the wrong form. The widgets above keep what they were given.
+@raise IndexError: If the tuple for a menu is too short.)";
+
+constexpr char const* addCallback =
+    R"(Registers a callable for an event of a widget. It is kept until it is removed, or the dialog goes.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@param eventType: The event.
+@type eventType: L{EventType}
+@param cb: The callable, called as C{def func( Dialog, widgetName, eventType )}. Its result is ignored.
+@raise UiError: If the widget does not exist.)";
+
+constexpr char const* removeCallback =
+    R"(Takes back one registration by L{addCallback}. If there is none for the same widget, event and object, nothing
+happens.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@param eventType: The event.
+@type eventType: L{EventType}
+@param cb: The very object that was registered.
+@raise UiError: If the widget does not exist.)";
+
+constexpr char const* setWidgetResourceName =
+    R"(Names the UI resource that a widget has been built from, in which its tooltip is found.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@param resName: The resource: a full path or a bare file name, with or without the extension.
+@type resName: C{str}
+@raise UiError: If the widget does not exist.)";
+
+constexpr char const* displayWidget =
+    R"(Shows or hides a widget. A hidden one keeps its value.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@param display: C{True} to show the widget, C{False} to hide it.
+@type display: C{bool}
+@raise UiError: If the widget does not exist.)";
+
+constexpr char const* showWidget =
+    R"(Shows a widget.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@raise UiError: If the widget does not exist.)";
+
+constexpr char const* hideWidget =
+    R"(Hides a widget. It keeps its value.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@raise UiError: If the widget does not exist.)";
+
+constexpr char const* isDisplayed =
+    R"(Tells whether a widget is displayed.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@return: C{True} if it is.
+@rtype: C{bool}
+@raise UiError: If the widget does not exist.)";
+
+constexpr char const* enableWidget =
+    R"(Enables or disables a widget. A disabled one keeps its value and takes no input.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@param enable: C{True} to enable the widget, C{False} to disable it.
+@type enable: C{bool}
+@raise UiError: If the widget does not exist.)";
+
+constexpr char const* isEnabled =
+    R"(Tells whether a widget is enabled.
+
+@param widgetName: The name of the widget.
+@type widgetName: C{str}
+@return: C{True} if it is.
+@rtype: C{bool})";
+
+constexpr char const* disableNextClose =
+    R"(Keeps the dialog open at the next press of a close button, and only at that. Called in an C{ACTIVATE} callback of a
+close button, it holds for the press that the callback runs for.)";
+
+} // namespace Kv::PyextUi::Docs

@@ -1,0 +1,1 @@
+"""Quorvane Velmora for scripts: C{from quorvane_velmora import ui}."""

@@ -1,0 +1,438 @@
+#include "resmgt/liString.h"
+#include "resmgt/liStringSubstituter.h"
+#include "resmgt/liStringUtil.h"
+#include "resmgt/osFile.h"
+#include "resmgt/xmlDocument.h"
+#include "resmgt/xmlError.h"
+#include "resmgt/xmlWriter.h"
+
+#include <cstdio>
+#include <fstream>
+#include <functional>
+#include <gtest/gtest.h>
+#include <optional>
+#include <sstream>
+#include <string>
+#include <thread>
+#include <vector>
+
+using namespace Kv;
+using namespace std::string_literals;
+
+namespace
+{
+
+constexpr int maximumDepth = 1024;
+
+std::string repeated(int count, std::string const& text)
+{
+    std::string result;
+    for (int i = 0; i < count; ++i)
+        result += text;
+    return result;
+}
+
+/// The words of the exception that `action` must end with.
+template <typename Exception> std::string wordsOf(std::function<void()> const& action)
+{
+    try
+    {
+        action();
+    }
+    catch (Exception const& exception)
+    {
+        return exception.getReason();
+    }
+    ADD_FAILURE() << "nothing was refused";
+    return {};
+}
+
+XmlElement rootOf(std::string const& text)
+{
+    return *XmlDocument(text).getRoot();
+}
+
+void expectContains(std::string const& text, std::string const& part)
+{
+    EXPECT_NE(text.find(part), std::string::npos) << "no \"" << part << "\" in \"" << text << "\"";
+}
+
+void expectRefused(std::string const& text, int line, std::string const& words)
+{
+    SCOPED_TRACE(LiStringUtil::getPrintable(text));
+    try
+    {
+        XmlDocument const document(text);
+        ADD_FAILURE() << "nothing was refused";
+    }
+    catch (XmlError const& error)
+    {
+        EXPECT_EQ(error.getLine(), line) << error.what();
+        expectContains(error.what(), "line " + std::to_string(line) + ": ");
+        expectContains(error.what(), words);
+        EXPECT_TRUE(LiStringUtil::isUtf8(error.what()));
+    }
+}
+
+/// Appends a counting number to whatever pattern it is called for.
+class CountingHandler : public CbHandler<std::string>
+{
+public:
+    void call(std::string& text) override { text += std::to_string(++_calls); }
+
+private:
+    int _calls = 0;
+};
+
+/// Replaces by a fixed text.
+class FixedHandler : public CbHandler<std::string>
+{
+public:
+    explicit FixedHandler(std::string replacement) : _replacement(std::move(replacement)) {}
+    void call(std::string& text) override { text = _replacement; }
+
+private:
+    std::string _replacement;
+};
+
+} // namespace
+
+TEST(XmlWriter, LaysADocumentOutByItsIndentation)
+{
+    std::ostringstream stream;
+    XmlWriter writer(stream, 2);
+    writer.openTag("Widget");
+    writer.writeAttrib("Name", "a<b");
+    writer.openTag("X1");
+    writer.writeAttrib("Value", -999);
+    writer.closeTag();
+    writer.writeTag("Text", "abc");
+    writer.writeTag("Int", -1);
+    writer.writeTag("Text", static_cast<char const*>(nullptr));
+    writer.closeTag();
+    EXPECT_EQ(stream.str(), "<Widget Name=\"a&lt;b\">\n  <X1 Value=\"-999\"/>\n  <Text>abc</Text>\n  <Int>-1</Int>\n"
+                            "  <Text/>\n</Widget>\n");
+}
+
+TEST(XmlWriter, IsReadBackExactly)
+{
+    std::vector<std::string> const texts = {"",
+                                            " ",
+                                            "\n\t ",
+                                            "\r",
+                                            "\r\n",
+                                            " a\r\n\tb ",
+                                            "<>&\"'",
+                                            "&amp;&#10;&",
+                                            "]]>",
+                                            "<!-- -->",
+                                            "<![CDATA[x]]>",
+                                            "<?xml?>",
+                                            "\xef\xbb\xbfmark",
+                                            "\x7f\xc2\x80\xc2\x85\xe2\x80\xa8",
+                                            "\xc3\xb6 \xe2\x82\xac \xf0\x9f\x98\x80\xef\xbf\xbd",
+                                            repeated(100000, "&<\r")};
+    std::ostringstream stream;
+    XmlWriter writer(stream, 3);
+    writer.openTag("\xc3\x84ste.1-:_");
+    for (std::string const& text : texts)
+    {
+        writer.openTag("Group");
+        writer.writeAttrib("a", text);
+        writer.writeAttrib("\xc3\xa9", text);
+        writer.writeTag("Text", text);
+        writer.closeTag();
+    }
+    writer.closeTag();
+
+    XmlElement const root = rootOf(stream.str());
+    EXPECT_EQ(root.getName(), "\xc3\x84ste.1-:_");
+    std::vector<XmlElement> const groups = root.getChildren();
+    ASSERT_EQ(groups.size(), texts.size());
+    for (std::size_t i = 0; i < texts.size(); ++i)
+    {
+        SCOPED_TRACE(LiStringUtil::getPrintable(texts[i]));
+        EXPECT_EQ(groups[i].getAttributeNames(), (std::vector<std::string>{"a", "\xc3\xa9"}));
+        EXPECT_EQ(groups[i].getAttribute("a"), texts[i]);
+        EXPECT_EQ(groups[i].getAttribute("\xc3\xa9"), texts[i]);
+        EXPECT_EQ(groups[i].findChild("Text")->getText(), texts[i]);
+    }
+}
+
+TEST(XmlWriter, RefusesWhatXmlCannotHoldAndGoesOnAsBefore)
+{
+    std::ostringstream stream;
+    XmlWriter writer(stream, 1);
+    writer.openTag("Root");
+    writer.writeAttrib("a", 1);
+    std::string const before = stream.str();
+
+    for (std::string const& text : {"a\0b"s, "\x01"s, "\x1f"s, "\xff"s, "\xc3"s, "\xc0\x80"s, "\xed\xa0\x80"s,
+                                    "\xef\xbf\xbe"s, "\xef\xbf\xbf"s, "\xf4\x90\x80\x80"s})
+    {
+        SCOPED_TRACE(LiStringUtil::getPrintable(text));
+        expectContains(wordsOf<XmlError>([&] { writer.writeAttrib("b", text); }), LiStringUtil::getPrintable(text));
+        expectContains(wordsOf<XmlError>([&] { writer.writeTag("Text", text); }), LiStringUtil::getPrintable(text));
+    }
+    for (std::string const& name : {""s, "a b"s, "1"s, "-a"s, "a<"s, "a\0"s, "a\n"s, "a=''"s, "\xff"s, "\xc3\x97"s})
+    {
+        SCOPED_TRACE(LiStringUtil::getPrintable(name));
+        expectContains(wordsOf<XmlError>([&] { writer.openTag(name); }), LiStringUtil::getPrintable(name));
+        expectContains(wordsOf<XmlError>([&] { writer.writeTag(name, 1); }), LiStringUtil::getPrintable(name));
+        expectContains(wordsOf<XmlError>([&] { writer.writeAttrib(name, 1); }), LiStringUtil::getPrintable(name));
+    }
+    expectContains(wordsOf<XmlError>([&] { writer.writeAttrib("a", 2); }), "twice");
+
+    EXPECT_EQ(stream.str(), before);
+    writer.writeAttrib("b", 2);
+    writer.closeTag();
+    expectContains(wordsOf<XmlError>([&] { writer.openTag("Other"); }), "second root");
+    EXPECT_EQ(stream.str(), "<Root a=\"1\" b=\"2\"/>\n");
+}
+
+TEST(XmlWriter, RefusesCallsThatGiveNoDocument)
+{
+    std::ostringstream stream;
+    XmlWriter writer(stream, 0);
+    expectContains(wordsOf<XmlError>([&] { writer.closeTag(); }), "no open element");
+    expectContains(wordsOf<XmlError>([&] { writer.writeAttrib("a", 1); }), "'a'");
+    writer.openTag("Root");
+    writer.writeTag("Text", "");
+    expectContains(wordsOf<XmlError>([&] { writer.writeAttrib("a", 1); }), "'a'");
+    writer.closeTag();
+    expectContains(wordsOf<XmlError>([&] { writer.closeTag(); }), "no open element");
+    expectContains(wordsOf<XmlError>([&] { writer.openTag("Other"); }), "second root");
+    expectContains(wordsOf<XmlError>([&] { writer.writeTag("Other", 1); }), "second root");
+    EXPECT_EQ(stream.str(), "<Root>\n<Text/>\n</Root>\n");
+
+    std::ostringstream broken;
+    broken.setstate(std::ios::badbit);
+    expectContains(wordsOf<XmlError>([&] { XmlWriter(broken, 0).openTag("Root"); }), "stream");
+    expectContains(wordsOf<XmlError>([&] { XmlWriter(stream, -1); }), "-1");
+}
+
+TEST(XmlDocument, GivesElementsWithTheirLinesThatOutliveIt)
+{
+    XmlElement const root = rootOf("\xef\xbb\xbf<?xml version='1.0' encoding=\"utf-8\"?>\r\n<!-- a -->\r<Root>\n"
+                                   "  <A x='1'\n y=\"2\"/><?skip <this> ?><B> <!--c--></B>text\n <A/></Root>\n");
+    EXPECT_EQ(root.getLine(), 3);
+    std::vector<XmlElement> const children = root.getChildren();
+    ASSERT_EQ(children.size(), 3U);
+    EXPECT_EQ(children[0].getLine(), 4);
+    EXPECT_EQ(children[1].getLine(), 5);
+    EXPECT_EQ(children[2].getLine(), 6);
+    EXPECT_EQ(root.findChild("A")->getAttribute("y"), "2");
+    EXPECT_FALSE(root.findChild("C"));
+    EXPECT_FALSE(children[2].findAttribute("x"));
+    EXPECT_EQ(wordsOf<XmlError>([&] { children[2].getAttribute("x"); }), "line 6: element 'A' has no attribute 'x'");
+    EXPECT_TRUE(root.hasText());
+    EXPECT_EQ(children[1].getText(), " ");
+    EXPECT_FALSE(children[1].hasText());
+}
+
+TEST(XmlDocument, DecodesReferencesAndLineEnds)
+{
+    XmlElement const root = rootOf("<a b='&lt;&amp;lt;&#x20AC;&#9;&#10;\t\r\n\r\n&apos;&#0065;'>"
+                                   "\r\n1\r2&#13;\n&quot;&gt;]]<!-- & --> <![CDATA[&amp;\r\n<]]>&#x1F600;</a>");
+    EXPECT_EQ(root.getAttribute("b"), "<&lt;\xe2\x82\xac\t\n   'A");
+    EXPECT_EQ(root.getText(), "\n1\n2\r\n\">]] &amp;\n<\xf0\x9f\x98\x80");
+}
+
+TEST(XmlDocument, HasNoRootWhereThereIsNoElement)
+{
+    for (char const* const text : {"", " \r\n", "\xef\xbb\xbf", "<!-- a -->\n", "<?xml version=\"1.0\"?>", "<?a?>"})
+        EXPECT_TRUE(XmlDocument(text).getRoot().isNull()) << text;
+    EXPECT_THROW(XmlDocument("").getRoot()->getName(), ExNullPtr);
+}
+
+TEST(XmlDocument, RefusesWhatIsNotOneWholeElement)
+{
+    expectRefused("hello", 1, "text outside of the root element: 'hello");
+    expectRefused("x", 1, "text outside");
+    expectRefused("<a/>\n x", 2, "text outside");
+    expectRefused("<a/>\n&#32;", 2, "text outside");
+    expectRefused("\n<![CDATA[]]><a/>", 2, "text outside");
+    expectRefused("\xef\xbb\xbf\xef\xbb\xbf<a/>", 1, "byte order mark");
+    expectRefused("<a/>\n<b/>", 2, "second root element: 'b'");
+    for (char const* const text : {"<", "\n <", "<a", "<a>", "<a/", "<a></b>", "</a>", "<a></a", "<a/><", "<a/> <",
+                                   "<a><b></a></b>", "<!-- a", "<a><![CDATA[x</a>", "<a><?p</a>"})
+        expectRefused(text, text[0] == '\n' ? 2 : 1, "no well-formed XML");
+}
+
+TEST(XmlDocument, RefusesMalformedMarkup)
+{
+    for (char const* const text : {"\n<a b/>", "\n<a b=1/>", "\n<a b='1'c='2'/>", "\n<a b='1/>", "\n< a/>", "\n<1/>",
+                                   "\n<a></a b>", "\n<a>< b/></a>", "\n<a/ >", "\n<!a>"})
+        expectRefused(text, 2, "no well-formed XML");
+    expectRefused("<a b='1'\nc='2'\nb='3'/>", 3, "'b' stands twice in element 'a'");
+    expectRefused("<a b='\n<'/>", 2, "'<' inside an attribute");
+    expectRefused("<a>\n]]></a>", 2, "']]>' inside a text");
+    expectRefused("<a>\n<!-- -- --></a>", 2, "'--' inside a comment");
+    expectRefused("<!--\n--->", 2, "comment that ends");
+    expectRefused("<a>\n<\xc3\x97/></a>", 2, "no XML name: '\xc3\x97'");
+    expectRefused("<a\n\xc3\x97='1'/>", 2, "no XML name: '\xc3\x97'");
+    expectRefused("\n<?\xc3\x97?><a/>", 2, "no XML name: '\xc3\x97'");
+    expectRefused("\n<!DOCTYPE a [<!ENTITY b 'c'>]><a>&b;</a>", 2, "DOCTYPE");
+}
+
+TEST(XmlDocument, RefusesForbiddenCharactersAndReferences)
+{
+    expectRefused("<a>\n\xff</a>", 2, "not valid UTF-8: '<a>\\n\\xff</a>'");
+    expectRefused("<a>\r\xed\xa0\x80</a>", 2, "not valid UTF-8");
+    expectRefused("<a/>\r\n\0"s, 2, "cannot hold");
+    expectRefused("<a b='\n\x01'/>", 2, R"(cannot hold: '<a b=\'\n\x01\'/>')");
+    expectRefused("<!--\xef\xbf\xbf--><a/>", 1, "cannot hold");
+    for (std::string const reference :
+         {"&#0;",  "&#1;", "&#x1f;", "&#xD800;", "&#xFFFE;", "&#x110000;", "&#99999999999;",
+          "&#;",   "&#x;", "&#X41;", "&#-1;",    "&#4 1;",   "&#65x;",     "&foo;",
+          "&AMP;", "&;",   "&",      "& ",       "&amp",     "&&amp;"})
+    {
+        expectRefused("<a>\n" + reference + "</a>", 2, "reference");
+        expectRefused("<a b='\n" + reference + "'/>", 2, "reference");
+    }
+}
+
+TEST(XmlDocument, TakesOnlyDeclarationsOfUtf8)
+{
+    for (char const* const rest : {"version='1.0'", R"(version="1.1" )", "version='1.0' encoding='US-ascii'",
+                                   "version = '1.0'\nencoding = 'Utf-8' standalone='no'"})
+        EXPECT_EQ(rootOf("<?xml "s + rest + "?><a/>").getName(), "a") << rest;
+    expectRefused("<?xml version='1.0' encoding='latin-1'?><a/>", 1, "not UTF-8 but 'latin-1'");
+    for (char const* const rest :
+         {"", " ", " encoding='utf-8'", " version='2.0'", " version='1.'", " version='1.0'>",
+          " version='1.0' standalone='yes' encoding='utf-8'", " version='1.0' a='b'",
+          " version='1.0' standalone='maybe'", " version='1.0'></xml><b", " version='1.0' encoding='&#117;tf-8'"})
+        expectRefused("<?xml"s + rest + "?><a/>", 1, "XML declaration");
+    expectRefused("<?xml version='1.0'", 1, "not closed");
+    expectRefused("\n<?xml version='1.0'?><a/>", 2, "not the first thing");
+    expectRefused("<a/>\n<?XML version='1.0'?>", 2, "not the first thing");
+}
+
+TEST(XmlLimits, ReaderAndWriterStopAtTheSameDepth)
+{
+    std::ostringstream stream;
+    XmlWriter writer(stream, 1);
+    for (int i = 0; i < maximumDepth; ++i)
+        writer.openTag("a");
+    expectContains(wordsOf<XmlError>([&] { writer.openTag("a"); }), "1024");
+    expectContains(wordsOf<XmlError>([&] { writer.writeTag("a", 1); }), "1024");
+    for (int i = 0; i < maximumDepth; ++i)
+        writer.closeTag();
+
+    int depth = 0;
+    for (std::optional<XmlElement> element = rootOf(stream.str()); element; element = element->findChild("a"))
+        EXPECT_EQ(element->getLine(), ++depth);
+    EXPECT_EQ(depth, maximumDepth);
+
+    expectRefused(repeated(maximumDepth + 1, "<a>\n") + repeated(maximumDepth + 1, "</a>"), maximumDepth + 1, "1024");
+    expectRefused(repeated(100000, "<a>") + repeated(100000, "</a>"), 1, "1024");
+    expectRefused(repeated(100000, "<a>"), 1, "no well-formed XML");
+}
+
+TEST(XmlLimits, LargeDocumentsCostWhatTheyHold)
+{
+    constexpr int rows = 200000;
+    XmlElement const root = rootOf("<a>\n" + repeated(rows, "<b c='&amp;'>&lt;</b>\n") + "</a>");
+    int line = 1;
+    for (XmlElement const& child : root.getChildren())
+    {
+        ASSERT_EQ(child.getLine(), ++line);
+        ASSERT_EQ(child.getAttribute("c") + child.getText(), "&<");
+    }
+    EXPECT_EQ(line, rows + 1);
+
+    std::string wide = "<a";
+    for (int i = 0; i < rows; ++i)
+        wide += "\nb" + std::to_string(i) + "=''";
+    EXPECT_EQ(rootOf(wide + "/>").getAttributeNames().size(), static_cast<std::size_t>(rows));
+    expectRefused(wide + "\nb7=''/>", rows + 2, "'b7' stands twice");
+}
+
+TEST(LiStringSubstituter, ReplacesEveryOccurrenceOnce)
+{
+    CountingHandler counting;
+    FixedHandler fixed("-999");
+    FixedHandler empty("");
+    LiStringSubstituter substituter;
+    EXPECT_EQ(substituter.substitute("-999"), "-999");
+    substituter.add("-999", &counting);
+    substituter.add("-888", &fixed);
+    substituter.add("-8", &empty);
+    substituter.add("-88", &fixed);
+    EXPECT_EQ(substituter.substitute(""), "");
+    EXPECT_EQ(substituter.substitute("--999-99-888x-889-999-999"), "--9991-99-999x89-9992-9993");
+
+    LiStringSubstituter overlapping;
+    overlapping.add("aa", &empty);
+    overlapping.add("a\0b"s, &fixed);
+    EXPECT_EQ(overlapping.substitute("aaa a\0b"s), "a -999");
+
+    expectContains(wordsOf<ExBase>([&] { substituter.add("", &fixed); }), "empty");
+    expectContains(wordsOf<ExBase>([&] { substituter.add("x", nullptr); }), "'x'");
+}
+
+TEST(LiStringUtil, NamesAndShowsATextThatIsNoUtf8)
+{
+    EXPECT_NO_THROW(LiStringUtil::requireUtf8("\xe2\x82\xac", "Label"));
+    EXPECT_EQ(wordsOf<ExBase>([] { LiStringUtil::requireUtf8("a'\n\xffg", "Label"); }),
+              "Label: not valid UTF-8: 'a\\'\\n\\xffg'");
+    expectContains(wordsOf<ExBase>([] { LiStringUtil::requireUtf8("a\0b"s, "Label"); }), "'a\\x00b'");
+
+    std::string const words = wordsOf<ExBase>(
+        []
+        { LiStringUtil::requireUtf8(repeated(1000, "\xe2\x82\xac") + "\xe2\x82" + std::string(1000, 'x'), "Label"); });
+    expectContains(words, "\xe2\x82\xac\\xe2\\x82xx");
+    expectContains(words, "Label: not valid UTF-8: '...\xe2\x82\xac");
+    EXPECT_TRUE(LiStringUtil::isUtf8(words));
+    EXPECT_LT(words.size(), 200U);
+}
+
+TEST(LiString, KeepsItsBytes)
+{
+    EXPECT_TRUE(LiString(static_cast<char const*>(nullptr)).isEmpty());
+    EXPECT_EQ(LiString("a\0b"s).toString(), "a\0b"s);
+    EXPECT_NE(LiString("a\0b"s), LiString("a"));
+    EXPECT_STREQ(LiString("abc"s).getChars(), "abc");
+}
+
+TEST(OsFile, TellsSizesAndNamesWhatHasNone)
+{
+    std::string const folder = testing::TempDir();
+    std::string const path = folder + "resmgtTest.txt";
+    std::ofstream(path) << "12345";
+    EXPECT_EQ(OsFile(OsFilePath(path)).getSize(), 5U);
+    EXPECT_EQ(std::remove(path.c_str()), 0);
+    expectContains(wordsOf<ExBase>([&] { OsFile(OsFilePath(path)).getSize(); }), path);
+    expectContains(wordsOf<ExBase>([&] { OsFile(OsFilePath(folder)).getSize(); }), folder);
+    EXPECT_THROW(OsFile(OsFilePath()).getSize(), ExBase);
+}
+
+TEST(OsFile, LetsOneThreadAtATimeHandleDescriptors)
+{
+    int inside = 0;
+    int entries = 0;
+    auto const enterOften = [&]
+    {
+        for (int i = 0; i < 1000; ++i)
+        {
+            OsFile::FileDescriptorManipGuard const guard;
+            OsFile::FileDescriptorManipGuard const again;
+            entries += ++inside == 1 ? 1 : 0;
+            std::this_thread::yield();
+            --inside;
+        }
+    };
+    std::thread other(enterOften);
+    enterOften();
+    other.join();
+    EXPECT_EQ(entries, 2000);
+}
+
+TEST(OsFilePath, KeepsThePathAsGiven)
+{
+    EXPECT_TRUE(OsFilePath().isEmpty());
+    EXPECT_TRUE(OsFilePath(std::string()).isEmpty());
+    EXPECT_STREQ(OsFilePath("a//./b/"s).getChars(), "a//./b/");
+    EXPECT_EQ(OsFilePath("\xff"s).toString(), "\xff");
+    expectContains(wordsOf<ExBase>([] { OsFilePath("a\0b"s); }), "'a\\x00b'");
+}
