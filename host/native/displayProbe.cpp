@@ -8,7 +8,6 @@
 #include <QStringList>
 
 #include <cstring>
-#include <memory>
 #include <sys/socket.h>
 #include <sys/un.h>
 #include <unistd.h>
@@ -49,22 +48,6 @@ QStringList pluginFolders()
     for (QString const& path : QCoreApplication::libraryPaths())
         folders << path + QStringLiteral("/platforms");
     return folders;
-}
-
-bool answersX11(std::string& refusal)
-{
-    QString const display = environment("DISPLAY");
-    if (display.isEmpty())
-    {
-        refusal = "DISPLAY is not set";
-        return false;
-    }
-    std::unique_ptr<xcb_connection_t, decltype(&xcb_disconnect)> const connection(xcb_connect(nullptr, nullptr),
-                                                                                  &xcb_disconnect);
-    if (!xcb_connection_has_error(connection.get()))
-        return true;
-    refusal = "DISPLAY " + quoted(display) + " cannot be opened";
-    return false;
 }
 
 bool connects(std::string const& socketPath)
@@ -123,21 +106,6 @@ bool answersFrameBuffer(QString const& platform, std::string& refusal)
     return canOpen(QStringLiteral("/dev/fb0"), refusal);
 }
 
-/// True if what the platform draws on is there. Platforms that draw on nothing outside the process are always fine.
-bool answers(QString const& platform, std::string& refusal)
-{
-    QString const name = nameOf(platform);
-    if (name == QLatin1String("xcb"))
-        return answersX11(refusal);
-    if (name.startsWith(QLatin1String("wayland")))
-        return answersWayland(refusal);
-    if (name == QLatin1String("linuxfb"))
-        return answersFrameBuffer(platform, refusal);
-    if (name == QLatin1String("eglfs") || name == QLatin1String("minimalegl") || name == QLatin1String("vkkhrdisplay"))
-        return answersGraphicsCard(refusal);
-    return true;
-}
-
 } // namespace
 
 DisplayProbe::DisplayProbe()
@@ -156,7 +124,7 @@ DisplayProbe::DisplayProbe()
         }
 }
 
-DisplayChoice DisplayProbe::choose() const
+DisplayChoice DisplayProbe::choose()
 {
     QString const asked = environment("QT_QPA_PLATFORM");
     return asked.isEmpty() ? chooseAnswering() : chooseAsked(asked);
@@ -178,7 +146,7 @@ bool DisplayProbe::canLoad(QString const& name, std::string& refusal) const
     return false;
 }
 
-DisplayChoice DisplayProbe::chooseAsked(QString const& asked) const
+DisplayChoice DisplayProbe::chooseAsked(QString const& asked)
 {
     std::string refusals;
     for (QString const& platform : asked.split(QLatin1Char(';'), Qt::SkipEmptyParts))
@@ -193,7 +161,7 @@ DisplayChoice DisplayProbe::chooseAsked(QString const& asked) const
     return {{}, "there is no display: QT_QPA_PLATFORM is " + quoted(asked) + ", but " + refusals + remedy};
 }
 
-DisplayChoice DisplayProbe::chooseAnswering() const
+DisplayChoice DisplayProbe::chooseAnswering()
 {
     std::string refusal;
     if (!environment("WAYLAND_DISPLAY").isEmpty() && isUsable(QStringLiteral("wayland"), refusal))
@@ -203,9 +171,38 @@ DisplayChoice DisplayProbe::chooseAnswering() const
     return {{}, "there is no display: " + refusal + remedy};
 }
 
-bool DisplayProbe::isUsable(QString const& platform, std::string& refusal) const
+bool DisplayProbe::isUsable(QString const& platform, std::string& refusal)
 {
     return canLoad(nameOf(platform), refusal) && answers(platform, refusal);
+}
+
+bool DisplayProbe::answers(QString const& platform, std::string& refusal)
+{
+    QString const name = nameOf(platform);
+    if (name == QLatin1String("xcb"))
+        return answersX11(refusal);
+    if (name.startsWith(QLatin1String("wayland")))
+        return answersWayland(refusal);
+    if (name == QLatin1String("linuxfb"))
+        return answersFrameBuffer(platform, refusal);
+    if (name == QLatin1String("eglfs") || name == QLatin1String("minimalegl") || name == QLatin1String("vkkhrdisplay"))
+        return answersGraphicsCard(refusal);
+    return true;
+}
+
+bool DisplayProbe::answersX11(std::string& refusal)
+{
+    QString const display = environment("DISPLAY");
+    if (display.isEmpty())
+    {
+        refusal = "DISPLAY is not set";
+        return false;
+    }
+    _display.reset(xcb_connect(nullptr, nullptr), &xcb_disconnect);
+    if (!xcb_connection_has_error(_display.get()))
+        return true;
+    refusal = "DISPLAY " + quoted(display) + " cannot be opened";
+    return false;
 }
 
 } // namespace Kv

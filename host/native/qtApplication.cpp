@@ -93,7 +93,7 @@ void QtApplication::start()
     if (_tried || QCoreApplication::instance())
         return;
     _tried = true;
-    DisplayProbe const probe;
+    DisplayProbe probe;
     DisplayChoice choice = probe.choose();
     _refusal = choice.refusal;
     // Without a display texts are measured all the same.

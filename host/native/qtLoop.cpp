@@ -21,9 +21,10 @@ constexpr std::chrono::milliseconds tickInterval(50);
 void forgetExit()
 {
     QSignalBlocker const silent(QCoreApplication::instance());
-    QMetaObject::invokeMethod(
-        QCoreApplication::instance(), [] { QCoreApplication::exit(); }, Qt::QueuedConnection);
+    auto const exit = QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::awake,
+                                       QCoreApplication::instance(), [] { QCoreApplication::exit(); });
     QCoreApplication::exec();
+    QObject::disconnect(exit);
 }
 
 } // namespace

@@ -70,9 +70,12 @@ private:
     /// Gives many entries a list with a scroll bar: styles that open a box like a menu fill the screen with them.
     void shortenPopup()
     {
-        QString const sheet = count() > maxShown ? QStringLiteral("QComboBox { combobox-popup: 0; }") : QString();
-        if (styleSheet() != sheet)
-            setStyleSheet(sheet);
+        bool const isLong = count() > maxShown;
+        QString const sheet = isLong ? QStringLiteral("QComboBox { combobox-popup: 0; }") : QString();
+        if (styleSheet() == sheet)
+            return;
+        setStyleSheet(sheet);
+        view()->setVerticalScrollBarPolicy(isLong ? Qt::ScrollBarAsNeeded : Qt::ScrollBarAlwaysOff);
     }
 
     /// Makes room in the popup for the longest entry, as far as the screen goes.
