@@ -40,7 +40,8 @@ public:
 protected:
     RCBase() = default;
     RCBase(RCBase const&) {}
-    RCBase& operator=(RCBase const&) { return *this; }
+    /// The count belongs to the object, not to its value.
+    RCBase& operator=(RCBase const&) { return *this; } // NOLINT(cert-oop54-cpp)
 
 private:
     mutable Counter _counter;

@@ -51,7 +51,8 @@ void PiWidget::fire(EventType type)
 {
     Dispatch const dispatch(this);
     EvEvent event(type);
-    for (std::size_t i = 0, count = _entries.size(); i < count; ++i)
+    // By index: a handler can add entries.
+    for (std::size_t i = 0, count = _entries.size(); i < count; ++i) // NOLINT(modernize-loop-convert)
         if (Entry const entry = _entries[i]; entry.handler && entry.type == type)
             entry.handler->call(event);
 }

@@ -19,7 +19,7 @@ UiContainer::~UiContainer()
 {
     for (RCShdPtr<UiWidget> const& child : _children)
         child->_parent = nullptr;
-    dropPeer();
+    UiContainer::dropPeer();
 }
 
 RCShdPtr<UiContainer> UiContainer::create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*)

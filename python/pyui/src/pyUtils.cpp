@@ -18,7 +18,7 @@ struct FileCloser
     void operator()(std::FILE* file) const
     {
         OsFile::FileDescriptorManipGuard const guard;
-        std::fclose(file);
+        static_cast<void>(std::fclose(file));
     }
 };
 

@@ -83,13 +83,15 @@ bp::handle<> importGraphModule()
     return bp::handle<>(module);
 }
 
-/// The package and the bare name are two modules of one process: the second body registers the same types again, which
-/// Boost.Python answers with a warning unless the first converter is forgotten.
-template <typename T> void forgetConverter()
+/// The package and the bare name are two modules of one process, and the body runs for each. They share one class for
+/// each type, so that what a script has from the one is good for the other. True if the class is there already.
+template <typename T> bool shareClass(char const* name)
 {
     bp::converter::registration const* const known = bp::converter::registry::query(bp::type_id<T>());
-    if (known)
-        const_cast<bp::converter::registration*>(known)->m_to_python = nullptr;
+    if (!known || !known->m_class_object)
+        return false;
+    bp::scope().attr(name) = bp::object(bp::handle<>(bp::borrowed(known->m_class_object)));
+    return true;
 }
 
 void defineFunctions()
@@ -113,7 +115,8 @@ void defineFunctions()
 
 void registerEventType()
 {
-    forgetConverter<PiWidget::EventType>();
+    if (shareClass<PiWidget::EventType>("EventType"))
+        return;
     bp::enum_<PiWidget::EventType>("EventType")
         .value("ENABLE", PiWidget::Enable)
         .value("DISABLE", PiWidget::Disable)
@@ -128,7 +131,8 @@ void registerDialog()
     using SetValueNotifying = void (Dialog::*)(std::string const&, bp::object const&, bool);
     using SetValues = void (Dialog::*)(bp::dict const&);
     using SetValuesNotifying = void (Dialog::*)(bp::dict const&, bool);
-    forgetConverter<RCShdPtr<ManagedDialog>>();
+    if (shareClass<Dialog>("Dialog"))
+        return;
     bp::class_<Dialog, RCShdPtr<ManagedDialog>, boost::noncopyable> dialog("Dialog", Docs::dialog, bp::no_init);
     supportGarbageCollection(reinterpret_cast<PyTypeObject*>(dialog.ptr()));
     dialog.def("launch", &Dialog::launch, Docs::launch)

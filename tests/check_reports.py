@@ -1,0 +1,31 @@
+"""Reads what the sanitizers wrote during a test run, and fails for every error and for each leak that was allocated by
+one of the project's own libraries. The interpreter and the toolkit keep much until the end of the process; that is
+theirs."""
+
+import pathlib
+import re
+import sys
+
+RUNTIMES = re.compile(r'lib(asan|ubsan|stdc\+\+)\.so')
+OURS = re.compile(r'/libKV\w+\.so')
+FRAME = re.compile(r'^\s+#\d+ .*$', re.MULTILINE)
+
+
+def allocated_by_us(leak):
+    for frame in FRAME.findall(leak):
+        if not RUNTIMES.search(frame):
+            return bool(OURS.search(frame))
+    return False
+
+
+def findings(report):
+    if 'runtime error:' in report or re.search(r'ERROR: AddressSanitizer', report):
+        return [report]
+    return [leak for leak in re.split(r'\n\n', report) if 'leak of' in leak and allocated_by_us(leak)]
+
+
+found = [text for path in sorted(pathlib.Path(sys.argv[1]).glob('report.*'))
+         for text in findings(path.read_text(errors='replace'))]
+print('\n\n'.join(text[:4000] for text in found[:20]))
+print('sanitizer reports of ours: %d' % len(found))
+sys.exit(1 if found else 0)

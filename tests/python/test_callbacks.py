@@ -1,0 +1,282 @@
+"""Callables on widget events: what raises them, with what they are called, and how they are taken back."""
+
+import gc
+import weakref
+
+import pytest
+
+from callback_tools import EVENTS, UNKNOWN, listen, make_dialog, no_wait_is_endless  # noqa: F401
+from quorvane_velmora import ui
+from PyQt6.QtCore import Qt
+from PyQt6.QtTest import QTest
+from PyQt6.QtWidgets import QComboBox
+
+ACTIVATE, STATE, VALUE_CHANGED = ui.EventType.ACTIVATE, ui.EventType.STATE, ui.EventType.VALUE_CHANGED
+
+
+def click(name):
+    return lambda user: user.click(name)
+
+
+def keys(name, *pressed):
+    def step(user):
+        user.find(name).setFocus()
+        for key in pressed:
+            user.type(key) if isinstance(key, str) else user.press(key)
+    return step
+
+
+def pick(*pressed):
+    """Opens the menu's list with the mouse and chooses in it with the keyboard."""
+    def step(user):
+        box = user.find('Menu')
+        assert isinstance(box, QComboBox)
+        user.click('Menu')
+        for key in pressed:
+            QTest.keyClick(box.view(), key)
+    return step
+
+
+Down, Return, Space, Backspace = Qt.Key.Key_Down, Qt.Key.Key_Return, Qt.Key.Key_Space, Qt.Key.Key_Backspace
+Escape = Qt.Key.Key_Escape
+
+
+@pytest.mark.parametrize('widget, action, events', [
+    ('Button', click('Button'), [ACTIVATE]),
+    ('Button', keys('Button', Space), [ACTIVATE]),
+    ('Button', keys('Button', Return), [ACTIVATE]),
+    ('Toggle', click('Toggle'), [STATE, ACTIVATE]),
+    ('Toggle', keys('Toggle', Space), [STATE, ACTIVATE]),
+    ('Text', click('Text'), [ACTIVATE]),
+    ('Text', keys('Text', 'new', Return), [VALUE_CHANGED]),
+    ('Text', keys('Text', 'new'), []),
+    ('Text', keys('Text', Return), []),
+    ('Text', keys('Text', 'n', Return, Return), [VALUE_CHANGED]),
+    ('Text', keys('Text', 'n', Backspace, Return), []),
+    ('Menu', pick(Down, Return), [VALUE_CHANGED, ACTIVATE]),
+    ('Menu', keys('Menu', Down), [VALUE_CHANGED, ACTIVATE]),
+    ('Menu', pick(Return), [ACTIVATE]),
+    ('Menu', pick(Down, Escape), []),
+], ids=lambda value: value if isinstance(value, str) else '')
+def test_the_user_raises_events(user, widget, action, events):
+    dialog = make_dialog()
+    heard = listen(dialog, widget)
+    user.plan(lambda someone: someone.find('Text').deselect(), action, lambda someone: someone.close())
+    dialog.launch()
+    assert heard == [(widget, event) for event in events]
+
+
+SETTERS = [('Text', 'new', VALUE_CHANGED), ('Text', 'old', VALUE_CHANGED), ('Text', None, VALUE_CHANGED),
+           ('Toggle', True, STATE), ('Toggle', False, STATE),
+           ('Menu', (['a', 'b'], 1), VALUE_CHANGED), ('Menu', (['a', 'b'], 0), VALUE_CHANGED)]
+
+
+@pytest.mark.parametrize('widget, value, event', SETTERS)
+def test_a_setter_raises_the_event_of_a_change_unless_it_is_told_not_to(user, widget, value, event):
+    dialog = make_dialog()
+    heard = listen(dialog, widget)
+
+    def set_in_every_way(_=None):
+        for setter in (dialog.setValue, lambda name, *rest: dialog.setValues({name: rest[0]}, *rest[1:])):
+            del heard[:]
+            setter(widget, value, False)
+            assert heard == []
+            setter(widget, value)
+            setter(widget, value, True)
+            assert heard == [(widget, event)] * 2
+
+    set_in_every_way()
+    user.plan(set_in_every_way, lambda someone: someone.close())
+    dialog.launch()
+    set_in_every_way()
+
+
+def test_a_callable_gets_a_dialog_for_the_same_widgets_the_name_and_the_event(user):
+    dialog = make_dialog()
+    calls = []
+    dialog.addCallback('Toggle', STATE, lambda *arguments: calls.append(arguments))
+    dialog.addCallback('Toggle', STATE, lambda given, *_: given.setValue('Text', given.getValue('Text') + '!', False))
+    user.plan(click('Toggle'), lambda someone: someone.close())
+    dialog.launch()
+    (given, name, event), = calls
+    assert type(given) is ui.Dialog and given is not dialog
+    assert (name, type(name)) == ('Toggle', str)
+    assert event is STATE
+    assert given.getValues() == dialog.getValues() == {
+        'Text': 'old!', 'Toggle': True, 'Menu': 'a', 'CloseButtonClicked': 'CloseButton_OK'}
+
+
+def test_callables_of_one_event_run_in_order_of_registration_and_as_often_as_registered(user):
+    dialog = make_dialog()
+    order = []
+
+    def first(*_):
+        order.append('first')
+
+    def second(*_):
+        order.append('second')
+        return order
+
+    for callable_ in (first, second, first):
+        dialog.addCallback('Button', ACTIVATE, callable_)
+    user.plan(click('Button'),
+              lambda _: dialog.removeCallback('Button', ACTIVATE, first), click('Button'),
+              lambda _: dialog.removeCallback('Button', ACTIVATE, first), click('Button'),
+              lambda _: dialog.removeCallback('Button', ACTIVATE, first),
+              lambda someone: someone.close())
+    dialog.launch()
+    assert order == ['first', 'second', 'first', 'second', 'first', 'second']
+
+
+class Equal:
+    """Says of everything that it is the same."""
+
+    def __eq__(self, other):
+        return True
+
+    def __hash__(self):
+        return 0
+
+    def method(self, *_):
+        pass
+
+
+def test_a_callable_is_taken_back_by_identity():
+    dialog = make_dialog()
+    calls = []
+    kept = calls.append
+
+    class Listener:
+        def hear(self, *_):
+            calls.append('heard')
+
+    listener = Listener()
+    kept = listener.hear
+    dialog.addCallback('Toggle', STATE, kept)
+    for other in (listener.hear, Equal(), Equal().method, None):
+        dialog.removeCallback('Toggle', STATE, other)
+    dialog.removeCallback('Toggle', ACTIVATE, kept)
+    dialog.removeCallback('Button', STATE, kept)
+    dialog.setValue('Toggle', True)
+    assert calls == ['heard']
+    dialog.removeCallback('Toggle', STATE, kept)
+    dialog.setValue('Toggle', True)
+    assert calls == ['heard']
+
+
+def test_a_callable_is_kept_for_as_long_as_it_is_registered():
+    dialog = make_dialog()
+    calls = []
+    dialog.addCallback('Toggle', STATE, lambda *_: calls.append('heard'))
+    gc.collect()
+    dialog.setValue('Toggle', True)
+    assert calls == ['heard']
+
+    def twice(*_):
+        calls.append('twice')
+
+    gone = weakref.ref(twice)
+    for _ in range(2):
+        dialog.addCallback('Toggle', STATE, twice)
+    dialog.removeCallback('Toggle', STATE, twice)
+    del twice
+    dialog.setValue('Toggle', True)
+    assert calls == ['heard', 'heard', 'twice']
+    dialog.removeCallback('Toggle', STATE, gone())
+    assert gone() is None
+
+
+def test_a_label_accepts_a_callable_and_never_calls_it(user):
+    dialog = make_dialog()
+    heard = listen(dialog, 'Note', 'MainContainer', 'UserDefinedWidgetsContainer')
+
+    def never(*_):
+        heard.append('never')
+
+    gone = weakref.ref(never)
+    dialog.addCallback('Note', ACTIVATE, never)
+
+    def disturb(someone):
+        someone.click('Note')
+        for name in ('Note', 'UserDefinedWidgetsContainer'):
+            dialog.enableWidget(name, False)
+            dialog.setValue(name, 'text')
+
+    user.plan(disturb, lambda someone: someone.close())
+    dialog.launch()
+    dialog.removeCallback('Note', ACTIVATE, never)
+    del never
+    assert heard == [] and gone() is None
+
+
+@pytest.mark.parametrize('operation', ['addCallback', 'removeCallback'])
+def test_an_unknown_widget_is_refused_and_nothing_kept(operation):
+    dialog = make_dialog()
+
+    def callback(*_):
+        pass
+
+    gone = weakref.ref(callback)
+    with pytest.raises(ui.UiError) as refused:
+        getattr(dialog, operation)('Nobody', ACTIVATE, callback)
+    assert str(refused.value) == UNKNOWN
+    del callback, refused
+    assert gone() is None
+
+
+def test_only_an_event_type_names_an_event():
+    dialog = make_dialog()
+    with pytest.raises(TypeError):
+        dialog.addCallback('Button', 23, print)
+    assert [int(event) for event in EVENTS] == [1, 2, 22, 23, 24]
+
+
+def test_a_callback_on_a_close_button_can_keep_the_dialog_open(user):
+    dialog = make_dialog()
+    seen = []
+
+    def validate(given, name, _):
+        if given.getValue('Text') != 'good':
+            given.disableNextClose()
+        seen.append(name)
+
+    dialog.addCallback('CloseButton_OK', ACTIVATE, validate)
+    user.plan(lambda someone: someone.close(), lambda _: seen.append(dialog.getValues()['CloseButtonClicked']),
+              keys('Text', 'good'), lambda someone: someone.close())
+    assert dialog.launch() == 'CloseButton_OK'
+    assert seen == ['CloseButton_OK'] * 3
+    assert dialog.getValue('Text') == 'good'
+
+
+@pytest.mark.parametrize('times', [1, 2])
+def test_one_close_is_suppressed_for_the_next_run_however_often_it_was_asked_for(user, times):
+    dialog = make_dialog()
+    user.plan(lambda someone: someone.close())
+    dialog.launch()
+    for _ in range(times):
+        dialog.disableNextClose()
+    names = []
+    user.plan(lambda someone: someone.close('Cancel'), lambda _: names.append(dialog.getValues()['CloseButtonClicked']),
+              lambda someone: someone.close())
+    assert dialog.launch() == 'CloseButton_OK'
+    assert names == ['CloseButton_Cancel']
+
+
+def test_callbacks_stay_from_run_to_run(user):
+    dialog = make_dialog()
+    heard = listen(dialog, 'Button', 'CloseButton_OK')
+    for run in range(1, 4):
+        user.plan(click('Button'), lambda someone: someone.close())
+        dialog.launch()
+        assert heard == [('Button', ACTIVATE), ('CloseButton_OK', ACTIVATE)] * run
+
+
+@pytest.mark.parametrize('unfit', [lambda dialog: None, lambda *_, must: None, 'text', None])
+def test_what_cannot_be_called_so_fails_at_the_event(user, unfit):
+    dialog = make_dialog()
+    dialog.addCallback('Button', ACTIVATE, unfit)
+    user.plan(click('Button'), lambda someone: someone.close())
+    with pytest.raises(TypeError):
+        dialog.launch()
+    dialog.removeCallback('Button', ACTIVATE, unfit)
+    assert dialog.launch() == 'CloseButton_OK'

@@ -1,0 +1,227 @@
+"""How the module is imported, and everything that a script then finds in it."""
+
+import os
+import re
+import shutil
+
+import pytest
+
+from quorvane_velmora import ui
+from scripts import run_script
+
+LIBS = os.path.dirname(ui.__file__)
+XML = ui.makeXmlFromWidgetList([('TextField', 'a')])
+
+
+def test_both_names_of_the_module_work_side_by_side_in_one_process():
+    printed = run_script('''
+import sys, warnings
+warnings.simplefilter('error')
+from quorvane_velmora import ui
+from quorvane_velmora.libs import libKVpyextUi
+assert libKVpyextUi is ui
+xml = ui.makeXmlFromWidgetList([('TextField', 'a')])
+first = ui.createDialog('first', xml)
+sys.path.insert(0, sys.argv[1])
+import libKVpyextUi as bare
+assert bare is not ui and bare.UiError is ui.UiError
+second = bare.createDialog('second', xml)
+for dialog, module in (first, bare), (second, ui):
+    dialog.setValue('a', dialog.getValue('a') + 'x')
+    dialog.addCallback('a', module.EventType.STATE, print)
+    assert dialog.getValues() == {'a': 'x'}
+    try:
+        dialog.hideWidget('b')
+    except module.UiError as error:
+        print(error)
+sys.stderr.write('')
+''', LIBS)
+    assert printed == 'Cannot find widget: the specified widget does not exist.\n' * 2
+
+
+def test_two_names_give_no_warning(capfd):
+    import subprocess, sys
+    from scripts import environment
+    done = subprocess.run([sys.executable, '-W', 'always', '-c',
+                           'import sys; sys.path.insert(0, sys.argv[1]); import libKVpyextUi, quorvane_velmora.ui', LIBS],
+                          env=environment(), capture_output=True, text=True, check=True)
+    assert done.stderr == ''
+
+
+def test_the_bare_name_finds_the_graph_module_beside_it():
+    run_script('''
+import sys
+import libKVpyextUi
+assert 'libKVpyextGraph' in sys.modules and 'quorvane_velmora' not in sys.modules
+assert libKVpyextUi.createDialog('t', libKVpyextUi.makeXmlFromWidgetList([])).getValues() == {}
+''', PYTHONPATH=LIBS)
+
+
+def test_the_import_fails_with_the_name_of_a_graph_module_that_is_nowhere(tmp_path):
+    package = tmp_path / 'quorvane_velmora'
+    shutil.copytree(os.path.dirname(LIBS), package, ignore=shutil.ignore_patterns('libKVpyextGraph*'))
+    run_script('''
+import sys
+for attempt in range(2):
+    try:
+        from quorvane_velmora import ui
+        sys.exit('imported')
+    except ImportError as error:
+        assert error.name == 'libKVpyextGraph', repr(error)
+''', PYTHONPATH=str(tmp_path))
+
+
+def test_the_toolkit_is_loaded_only_where_a_text_must_be_measured():
+    run_script('''
+def toolkit():
+    with open('/proc/self/maps') as maps:
+        return 'libQt' in maps.read()
+from quorvane_velmora import ui
+ui.instantiateAppMgr()
+assert not toolkit()
+xml = ui.makeXmlFromWidgetList([(kind, kind, kind) for kind in ('TextField', 'ToggleButton', 'Menu', 'Label')])
+assert not toolkit()
+ui.makeXmlFromWidgetList([('PushButton', 'measured')])
+assert toolkit()
+''', QT_QPA_PLATFORM='offscreen')
+
+
+FUNCTIONS = {  # every parameter in order with a value; how many must be there; those that can be named
+    'showDialog': ([('title', 't'), ('xmlFile', '/missing'), ('width', 1), ('height', 1), ('initialValues', {})], 2,
+                   {'width', 'height', 'initialValues'}),
+    'showSimpleDialog': ([('title', 't'), ('list', [()]), ('width', 1), ('cancelButton', True), ('initialValues', {})],
+                         3, {'cancelButton', 'initialValues'}),
+    'showMessageBox': ([('title', 't'), ('messages', [1]), ('closeButtons', [])], 2, {'closeButtons'}),
+    'makeXmlFromWidgetList': ([('widgets', []), ('closeButtons', [])], 1, {'closeButtons'}),
+    'createDialog': ([('title', 't'), ('xmlString', XML), ('width', 1), ('height', 1), ('initialValues', {})], 2,
+                     {'width', 'height', 'initialValues'}),
+    'instantiateAppMgr': ([], 0, set()),
+}
+METHODS = {
+    'launch': [],
+    'getValue': [('widgetName', 'a')],
+    'getValues': [],
+    'setValue': [('widgetName', 'a'), ('value', 'x'), ('invokeCallback', True)],
+    'setValues': [('values', {}), ('invokeCallback', True)],
+    'addCallback': [('widgetName', 'a'), ('eventType', ui.EventType.STATE), ('cb', print)],
+    'removeCallback': [('widgetName', 'a'), ('eventType', ui.EventType.STATE), ('cb', print)],
+    'setWidgetResourceName': [('widgetName', 'a'), ('resName', 'r')],
+    'displayWidget': [('widgetName', 'a'), ('display', True)],
+    'showWidget': [('widgetName', 'a')],
+    'hideWidget': [('widgetName', 'a')],
+    'isDisplayed': [('widgetName', 'a')],
+    'enableWidget': [('widgetName', 'a'), ('enable', True)],
+    'isEnabled': [('widgetName', 'a')],
+    'disableNextClose': [],
+}
+
+
+def test_names_stand_in_the_order_of_their_registration():
+    def public(scope):
+        return [name for name in vars(scope) if not name.startswith('_')]
+
+    functions = list(FUNCTIONS)
+    assert public(ui) == functions[:5] + ['EventType', 'Dialog'] + functions[5:] + ['UiError']
+    assert public(ui.Dialog) == list(METHODS)
+    assert [(name, int(value)) for name, value in ui.EventType.names.items()] == [
+        ('ENABLE', 1), ('DISABLE', 2), ('STATE', 22), ('ACTIVATE', 23), ('VALUE_CHANGED', 24)]
+
+
+def is_refused(call, *arguments, **keywords):
+    try:
+        call(*arguments, **keywords)
+    except Exception as failure:
+        return type(failure).__name__ == 'ArgumentError'
+    return False
+
+
+@pytest.mark.parametrize('name', FUNCTIONS)
+def test_functions_take_by_name_just_what_can_be_left_out(name):
+    parameters, required, named = FUNCTIONS[name]
+    function = getattr(ui, name)
+    values = [value for _, value in parameters]
+    assert is_refused(function, *values, unknown=1)
+    for index, (parameter, value) in enumerate(parameters):
+        allowed = parameter in named
+        assert is_refused(function, *values[:index], **{parameter: value}) != allowed, parameter
+        assert is_refused(function, *values[:index], **dict(parameters[index:])) != allowed, parameter
+        if index != required:
+            assert is_refused(function, *values[:required], **{parameter: value}), parameter + ' alone'
+
+
+@pytest.mark.parametrize('name', METHODS)
+def test_methods_take_nothing_by_name(name):
+    dialog = ui.createDialog('t', XML)
+    parameters = METHODS[name]
+    values = [value for _, value in parameters]
+    assert is_refused(getattr(dialog, name), *values, unknown=1)
+    assert is_refused(getattr(ui.Dialog, name), self=dialog, **dict(parameters))
+    for index, (parameter, value) in enumerate(parameters):
+        assert is_refused(getattr(dialog, name), *values[:index], **{parameter: value})
+        assert is_refused(getattr(dialog, name), *values[:index], **dict(parameters[index:]))
+
+
+@pytest.mark.parametrize('call', [
+    lambda dialog: ui.createDialog('t', XML, '400'),
+    lambda dialog: ui.createDialog('t', XML, 400, '300'),
+    lambda dialog: ui.createDialog('t', XML, 4.5),
+    lambda dialog: ui.createDialog('t', XML, 400, 300, [('a', 'x')]),
+    lambda dialog: ui.createDialog(None, XML),
+    lambda dialog: ui.showSimpleDialog('t', []),
+    lambda dialog: ui.showSimpleDialog('t', [], '400'),
+    lambda dialog: ui.showMessageBox('t', ('a', 'b')),
+    lambda dialog: ui.showMessageBox('t', ['a'], ('OK',)),
+    lambda dialog: ui.makeXmlFromWidgetList((('TextField', 'a'),)),
+    lambda dialog: dialog.addCallback('a', 23, print),
+    lambda dialog: dialog.getValue(5),
+    lambda dialog: dialog.setValues([('a', 'x')]),
+    lambda dialog: dialog.launch(1),
+])
+def test_arguments_of_a_wrong_type_are_refused_before_anything_happens(call):
+    dialog = ui.createDialog('t', XML)
+    assert is_refused(call, dialog)
+    assert dialog.getValues() == {'a': ''}
+
+
+def test_a_dialog_has_no_constructor_for_scripts():
+    with pytest.raises(RuntimeError):
+        ui.Dialog()
+    assert type(ui.createDialog('t', XML)) is ui.Dialog
+
+
+def test_the_module_has_one_exception_whose_text_is_the_reason():
+    assert issubclass(ui.UiError, Exception) and ui.UiError.__name__ == 'UiError'
+    with pytest.raises(ui.UiError) as caught:
+        ui.showDialog('t', '/no/such file')
+    assert str(caught.value) == 'Error opening file: /no/such file'
+
+
+DEFAULTS = {'width': 'Defaults to -1', 'height': 'Defaults to -1', 'initialValues': 'Defaults to {}',
+            'closeButtons': 'Defaults to []', 'cancelButton': 'Default is C{False}',
+            'invokeCallback': 'Defaults to C{True}'}
+FAIL_ON_UNKNOWN_NAME = ['addCallback', 'removeCallback', 'setWidgetResourceName', 'displayWidget', 'showWidget',
+                        'hideWidget', 'isDisplayed', 'enableWidget']
+
+
+@pytest.mark.parametrize('owner, name', [(ui, name) for name in FUNCTIONS if name != 'instantiateAppMgr'] +
+                         [(ui.Dialog, name) for name in METHODS])
+def test_docstrings_tell_of_every_parameter_and_its_default_without_signatures(owner, name):
+    text = getattr(owner, name).__doc__.strip()
+    assert text[0].isupper() and 'signature' not in text and '->' not in text
+    parameters = METHODS[name] if owner is ui.Dialog else FUNCTIONS[name][0]
+    told = dict(re.findall(r'@param (\w+):(.*?)(?=\n@|\Z)', text, re.DOTALL))
+    assert list(told) == [parameter for parameter, _ in parameters]
+    optional = {'width'} if name != 'showSimpleDialog' else set()
+    for parameter in set(told) & set(DEFAULTS) - ({'width'} - optional):
+        assert DEFAULTS[parameter] in told[parameter].replace('\n', ' ')
+    assert ('@raise UiError: If the widget does not exist.' in text) == (name in FAIL_ON_UNKNOWN_NAME)
+
+
+def test_the_module_and_the_dialog_say_what_they_are():
+    assert ui.__doc__ == 'Quorvane Velmora internal UI extension module.'
+    assert ui.instantiateAppMgr.__doc__ is None
+    for words in ('no public constructor', 'createDialog', 'push button', 'toggle button', 'text field', 'menu',
+                  'a widget has been enabled', 'a widget has been disabled', "a toggle button's state has changed",
+                  'a widget has been activated (clicked)', 'when the user changes it and presses the Enter key',
+                  'def myCallbackFunction1( dialog, widgetName, eventType )', 'getValues'):
+        assert words in ui.Dialog.__doc__

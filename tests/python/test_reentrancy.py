@@ -1,0 +1,298 @@
+"""What callbacks may do to the dialog, to its other callbacks and to other dialogs while they run."""
+
+import gc
+
+import pytest
+
+from callback_tools import listen, make_dialog, no_wait_is_endless, patient, run_script  # noqa: F401
+from quorvane_velmora import ui
+from PyQt6.QtCore import Qt
+from PyQt6.QtWidgets import QApplication
+
+ACTIVATE, STATE, VALUE_CHANGED = ui.EventType.ACTIVATE, ui.EventType.STATE, ui.EventType.VALUE_CHANGED
+
+
+def click(name):
+    return lambda user: user.click(name)
+
+
+def close(user):
+    user.close()
+
+
+def open_windows():
+    return [window.windowTitle() for window in QApplication.topLevelWidgets() if window.isVisible()]
+
+
+def test_a_callback_removes_itself(user):
+    dialog = make_dialog()
+    order = []
+
+    def once(given, name, event):
+        order.append('once')
+        given.removeCallback(name, event, once)
+        gc.collect()
+        order.append(name)
+
+    dialog.addCallback('Button', ACTIVATE, once)
+    dialog.addCallback('Button', ACTIVATE, lambda *_: order.append('always'))
+    user.plan(click('Button'), click('Button'), close)
+    dialog.launch()
+    assert order == ['once', 'Button', 'always', 'always']
+
+
+def test_a_lambda_that_nobody_else_keeps_removes_itself(user):
+    dialog = make_dialog()
+    kept, order = [], []
+    kept.append(lambda given, name, event: (given.removeCallback(name, event, kept.pop()), gc.collect(),
+                                            order.append(name)))
+    dialog.addCallback('Button', ACTIVATE, kept[0])
+    user.plan(click('Button'), click('Button'), close)
+    dialog.launch()
+    assert order == ['Button']
+
+
+def test_a_removed_next_one_does_not_run_and_an_added_one_waits_for_the_next_event(user):
+    dialog = make_dialog()
+    order = []
+
+    def removed(*_):
+        order.append('removed')
+
+    def added(*_):
+        order.append('added')
+
+    def change(given, name, event):
+        order.append('change')
+        given.removeCallback(name, event, removed)
+        given.addCallback(name, event, added)
+
+    for callback in (change, removed, lambda *_: order.append('last')):
+        dialog.addCallback('Button', ACTIVATE, callback)
+    user.plan(click('Button'), lambda _: order.append('|'), click('Button'), close)
+    dialog.launch()
+    assert order == ['change', 'last', '|', 'change', 'last', 'added']
+
+
+def test_a_callback_that_adds_and_removes_in_a_nested_event_disturbs_neither(user):
+    dialog = make_dialog()
+    order = []
+
+    def inner(*_):
+        order.append('inner')
+
+    def outer(given, name, event):
+        order.append('outer')
+        if len(order) == 1:
+            given.setValue('Toggle', True)
+            given.removeCallback(name, event, inner)
+
+    dialog.addCallback('Toggle', STATE, outer)
+    dialog.addCallback('Toggle', STATE, inner)
+    user.plan(click('Toggle'), close)
+    dialog.launch()
+    assert order == ['outer', 'outer', 'inner']
+    dialog.setValue('Toggle', True)
+    assert order[3:] == ['outer']
+
+
+def test_events_that_raise_events_end_with_the_recursion_error_of_python():
+    printed = run_script('''
+from callback_tools import PatientUser, make_dialog, ui
+dialog, depth = make_dialog(), [0]
+def again(given, name, event):
+    depth[0] += 1
+    given.setValue('Text' if name == 'Toggle' else 'Toggle', name == 'Text' or 'text')
+dialog.addCallback('Text', ui.EventType.VALUE_CHANGED, again)
+dialog.addCallback('Toggle', ui.EventType.STATE, again)
+user = PatientUser()
+for attempt in range(2):
+    user.plan(lambda user: user.click('Toggle'))
+    try:
+        dialog.launch()
+    except RecursionError:
+        print('answered', depth[0] > 100)
+try:
+    dialog.setValue('Toggle', True)
+except RecursionError:
+    print('answered')
+dialog.removeCallback('Toggle', ui.EventType.STATE, again)
+user.plan(lambda user: user.click('Toggle'), lambda user: user.close())
+print(dialog.launch())
+user.stop()
+assert not user.failures, user.failures
+''')
+    assert printed.split() == ['answered', 'True'] * 2 + ['answered', 'CloseButton_OK']
+
+
+def test_launches_that_open_launches_end_with_the_recursion_error_of_python():
+    printed = run_script('''
+import sys
+from callback_tools import make_dialog, ui
+from PyQt6.QtCore import QTimer
+from PyQt6.QtTest import QTest
+from PyQt6.QtWidgets import QApplication, QWidget
+sys.setrecursionlimit(150)
+depth = [0]
+def press():
+    QTimer.singleShot(0, press)
+    window = QApplication.activeModalWidget()
+    if window:
+        window.findChild(QWidget, 'Button').click()
+def deeper(*_):
+    depth[0] += 1
+    inner = make_dialog()
+    inner.addCallback('Button', ui.EventType.ACTIVATE, deeper)
+    inner.launch()
+hooked = []
+sys.excepthook = lambda *seen: hooked.append(seen)
+make_dialog(); ui.showMessageBox
+ui.makeXmlFromWidgetList([('TextField', 'a', 'measured')])
+app = QApplication.instance() or QApplication([])
+QTimer.singleShot(0, press)
+try:
+    deeper()
+except RecursionError:
+    print('answered', depth[0] > 10)
+''')
+    assert printed.split() == ['answered', 'True']
+
+
+@pytest.mark.parametrize('operation', ['hideWidget', 'disable'])
+@pytest.mark.parametrize('name', ['Button', 'Toggle', 'Text', 'Menu'])
+def test_a_callback_hides_or_disables_its_own_widget(user, operation, name):
+    dialog = make_dialog()
+    heard = listen(dialog, name)
+
+    def vanish(given, widget, _):
+        given.hideWidget(widget) if operation == 'hideWidget' else given.enableWidget(widget, False)
+
+    event = VALUE_CHANGED if name in ('Menu', 'Text') else ACTIVATE
+    dialog.addCallback(name, event, vanish)
+
+    def act(someone):
+        someone.find(name).setFocus()
+        if name == 'Text':
+            someone.type('new')
+        someone.press({'Text': Qt.Key.Key_Return, 'Menu': Qt.Key.Key_Down}.get(name, Qt.Key.Key_Space))
+
+    user.plan(act, lambda someone: heard.append('|'), click(name), close)
+    assert dialog.launch() == 'CloseButton_OK'
+    assert (name, event) in heard[:heard.index('|')]
+    assert heard[-1] == '|'
+    assert (dialog.isDisplayed(name), dialog.isEnabled(name)) == (operation != 'hideWidget', operation != 'disable')
+
+
+def test_a_callback_launches_a_dialog_from_which_another_is_launched(patient):
+    dialogs = [make_dialog(title) for title in ('one', 'two', 'three')]
+    order = []
+
+    def open_next(level):
+        def callback(*_):
+            dialogs[level].setValue('Text', 'from below')
+            order.append((level, dialogs[level].launch()))
+        return callback
+
+    for level in (1, 2):
+        dialogs[level - 1].addCallback('Button', ACTIVATE, open_next(level))
+    patient.plan(click('Button'), click('Button'),
+                 lambda someone: order.append(someone.window().windowTitle()),
+                 lambda someone: someone.close('Cancel'),
+                 lambda someone: order.append(someone.window().windowTitle()), close,
+                 click('Toggle'), lambda someone: someone.close('Cancel'))
+    assert dialogs[0].launch() == 'CloseButton_Cancel'
+    assert order == ['three', (2, 'CloseButton_Cancel'), 'two', (1, 'CloseButton_OK')]
+    assert [dialog.getValue('Toggle') for dialog in dialogs] == [True, False, False]
+    assert open_windows() == []
+
+
+def test_a_window_below_takes_no_input_while_a_callback_has_another_open(patient):
+    outer, inner = make_dialog('outer'), make_dialog('inner')
+    heard = listen(outer, 'Toggle', 'Text', 'CloseButton_OK')
+    outer.addCallback('Button', ACTIVATE, lambda *_: inner.launch())
+
+    def disturb(user):
+        below, = (window for window in QApplication.topLevelWidgets() if window.windowTitle() == 'outer')
+        user.window = lambda: below
+        for name in ('Toggle', 'Text', 'CloseButton_OK'):
+            user.click(name)
+        del user.window
+        below.close()
+
+    patient.plan(click('Button'), disturb, close, lambda user: heard.append(user.window().windowTitle()), close)
+    assert outer.launch() == 'CloseButton_OK'
+    assert heard == ['outer', ('CloseButton_OK', ACTIVATE)]
+
+
+def test_a_callback_launches_its_own_dialog_again(patient):
+    dialog = make_dialog()
+    order = []
+    dialog.addCallback('Button', ACTIVATE, lambda given, *_: order.append(given.launch()))
+    patient.plan(click('Button'), click('Toggle'), lambda user: user.close('Cancel'))
+    assert dialog.launch() == 'CloseButton_Cancel'
+    assert order == ['CloseButton_Cancel']
+    patient.plan(click('Toggle'), close)
+    assert dialog.launch() == 'CloseButton_OK'
+    assert dialog.getValue('Toggle') is False
+
+
+@pytest.mark.parametrize('raises', [False, True])
+@pytest.mark.parametrize('act, name, event', [
+    (click('Button'), 'Button', ACTIVATE),
+    (lambda user: user.press(Qt.Key.Key_Return), 'Text', VALUE_CHANGED),
+    (click('Toggle'), 'Toggle', STATE),
+    (lambda user: (user.find('Menu').setFocus(), user.press(Qt.Key.Key_Down)), 'Menu', VALUE_CHANGED),
+    (click('CloseButton_OK'), 'CloseButton_OK', ACTIVATE),
+], ids=['click', 'Enter', 'toggle', 'menu', 'close'])
+def test_a_callback_drops_the_last_reference_to_the_dialog(patient, act, name, event, raises):
+    before = len(QApplication.allWidgets())
+    outer = make_dialog('outer')
+    kept = [make_dialog('dropped')]
+
+    def drop(*_):
+        kept.clear()
+        gc.collect()
+        if raises:
+            raise ValueError('after the drop')
+
+    kept[0].addCallback(name, event, drop)
+
+    def run_it(*_):
+        kept[0].launch()
+
+    outer.addCallback('Button', ACTIVATE, run_it)
+
+    def edit(user):
+        user.find('Text').setFocus()
+        user.type('edited')
+
+    patient.plan(click('Button'), edit, act, *([] if name.startswith('Close') or raises else [close]), close)
+    if raises:
+        with pytest.raises(ValueError, match='after the drop'):
+            outer.launch()
+        patient.plan(close)
+        outer.launch()
+    else:
+        assert outer.launch() == 'CloseButton_OK'
+    del outer, drop, run_it
+    gc.collect()
+    assert len(QApplication.allWidgets()) <= before
+
+
+def test_close_buttons_of_one_name_close_every_run(user):
+    dialog = ui.createDialog('Names', ui.makeXmlFromWidgetList(
+        [('PushButton', 'CloseButton_OK'), ('PushButton', 'CloseButton_OK')], ['OK']), 400, 112)
+
+    def press_one(place):
+        def step(someone):
+            buttons = someone.window().findChildren(type(someone.find('CloseButton_OK')), 'CloseButton_OK')
+            assert len(buttons) == 3
+            buttons[place].click()
+        return step
+
+    for place in (0, 1, 2, 0):
+        user.plan(press_one(place))
+        assert dialog.launch() == 'CloseButton_OK'
+    dialog.disableNextClose()
+    user.plan(press_one(1), press_one(2))
+    assert dialog.launch() == 'CloseButton_OK'
