@@ -2,16 +2,14 @@
 a dialog of its own, and an end for every wait."""
 
 import os
-import pathlib
 import signal
 import subprocess
 import sys
-import traceback
 
 import pytest
 
-from conftest import User
 from quorvane_velmora import ui
+from user import User
 from PyQt6.QtCore import QTimer
 
 EVENTS = (ui.EventType.ENABLE, ui.EventType.DISABLE, ui.EventType.STATE, ui.EventType.ACTIVATE,
@@ -41,24 +39,18 @@ class PatientUser(User):
     def plan(self, *steps):
         self._steps.extend(steps)
         ui.makeXmlFromWidgetList([('PushButton', 'measured')])  # the application is there from here on
-        QTimer.singleShot(5, self._next)
-
-    def stop(self):
-        self._steps.clear()
+        if self._timer is None:
+            self._timer = QTimer()
+            self._timer.setSingleShot(True)
+            self._timer.timeout.connect(self._next)
+        self._timer.start(5)
 
     def _next(self):
-        if not self._steps:
-            return
-        step = self._steps.pop(0) if self.window() else None
-        QTimer.singleShot(5, self._next)
-        if step is None:
-            return
-        try:
-            step(self)
-        except BaseException as failure:
-            self.failures.append(''.join(traceback.format_exception(failure)))
-            self.stop()
-            signal.setitimer(signal.ITIMER_REAL, 0.01, 0.1)
+        self._timer.start(5)
+        super()._next()
+        # From here on anew: what the step ended must have come to its end.
+        if self._timer is not None:
+            self._timer.start(5)
 
 
 @pytest.fixture
@@ -77,15 +69,16 @@ def no_wait_is_endless():
         raise TimeoutError('the dialog is still open')
 
     previous = signal.signal(signal.SIGALRM, give_up)
-    signal.setitimer(signal.ITIMER_REAL, 30, 0.1)
+    signal.alarm(20)
     yield
-    signal.setitimer(signal.ITIMER_REAL, 0)
+    signal.alarm(0)
     signal.signal(signal.SIGALRM, previous)
 
 
 def run_script(text, timeout=120):
     """Runs a script in a process of its own, beside these tools, and gives what it printed."""
-    done = subprocess.run([sys.executable, '-c', text], cwd=pathlib.Path(__file__).parent, env=dict(os.environ),
-                          stdout=subprocess.PIPE, stderr=subprocess.PIPE, text=True, timeout=timeout)
-    assert done.returncode == 0, done.stderr
+    environment = dict(os.environ, PYTHONPATH=os.pathsep.join(os.path.abspath(path) for path in sys.path))
+    done = subprocess.run([sys.executable, '-c', text], env=environment, stdout=subprocess.PIPE,
+                          stderr=subprocess.PIPE, text=True, timeout=timeout)
+    assert done.returncode == 0, done.stdout + done.stderr
     return done.stdout

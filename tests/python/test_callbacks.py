@@ -20,7 +20,7 @@ def click(name):
 
 def keys(name, *pressed):
     def step(user):
-        user.find(name).setFocus()
+        user.find(name).setFocus(Qt.FocusReason.TabFocusReason)
         for key in pressed:
             user.type(key) if isinstance(key, str) else user.press(key)
     return step
@@ -38,7 +38,7 @@ def pick(*pressed):
 
 
 Down, Return, Space, Backspace = Qt.Key.Key_Down, Qt.Key.Key_Return, Qt.Key.Key_Space, Qt.Key.Key_Backspace
-Escape = Qt.Key.Key_Escape
+Escape, End = Qt.Key.Key_Escape, Qt.Key.Key_End
 
 
 @pytest.mark.parametrize('widget, action, events', [
@@ -52,7 +52,7 @@ Escape = Qt.Key.Key_Escape
     ('Text', keys('Text', 'new'), []),
     ('Text', keys('Text', Return), []),
     ('Text', keys('Text', 'n', Return, Return), [VALUE_CHANGED]),
-    ('Text', keys('Text', 'n', Backspace, Return), []),
+    ('Text', keys('Text', End, 'n', Backspace, Return), []),
     ('Menu', pick(Down, Return), [VALUE_CHANGED, ACTIVATE]),
     ('Menu', keys('Menu', Down), [VALUE_CHANGED, ACTIVATE]),
     ('Menu', pick(Return), [ACTIVATE]),
@@ -61,7 +61,7 @@ Escape = Qt.Key.Key_Escape
 def test_the_user_raises_events(user, widget, action, events):
     dialog = make_dialog()
     heard = listen(dialog, widget)
-    user.plan(lambda someone: someone.find('Text').deselect(), action, lambda someone: someone.close())
+    user.plan(action, lambda someone: someone.close())
     dialog.launch()
     assert heard == [(widget, event) for event in events]
 
@@ -144,7 +144,6 @@ class Equal:
 def test_a_callable_is_taken_back_by_identity():
     dialog = make_dialog()
     calls = []
-    kept = calls.append
 
     class Listener:
         def hear(self, *_):

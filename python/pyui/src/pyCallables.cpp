@@ -1,5 +1,6 @@
 #include "pyCallables.h"
 
+#include "pyCompat.h"
 #include "pyWidgetCbs.h"
 
 #include <boost/python/errors.hpp>
@@ -40,7 +41,10 @@ void PyCallables::remove(CallbackSet const& set)
 
 bp::handle<> PyCallables::find(CallbackSet const& set) const
 {
-    return bp::handle<>(bp::borrowed(bp::allow_null(PyDict_GetItem(_dictionary, keyOf(set).get()))));
+    PyObject* const callable = PyCompat::dictGetItem(_dictionary, keyOf(set).get());
+    if (!callable && PyErr_Occurred())
+        bp::throw_error_already_set();
+    return bp::handle<>(bp::borrowed(bp::allow_null(callable)));
 }
 
 void PyCallables::addShare()

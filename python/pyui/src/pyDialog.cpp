@@ -343,11 +343,13 @@ void Dialog::removeCallback(std::string const& widgetName, PiWidget::EventType e
     if (found == _callbacks.end())
         return;
     RCStrongPtr<CallbackSet> const set = *found;
+    // Goes last: the end of a callable can run anything.
+    bp::handle<> const callable = _callables.find(*set);
+    _callables.remove(*set);
     if (RCShdPtr<PiWidget> const piWidget = findEventFace(widget))
         piWidget->removeCallback(eventType, set->handler.get());
     _callbacks.erase(found);
     WidgetCbs::release(set);
-    _callables.remove(*set);
 }
 
 void Dialog::setWidgetResourceName(std::string const& widgetName, std::string const& resName)
