@@ -10,6 +10,7 @@
 #include "native/qtToggle.h"
 #include "native/qtWindow.h"
 #include "native/textEstimate.h"
+#include "native/windowWidget.h"
 
 #include <QApplication>
 #include <QFontMetricsF>
@@ -154,10 +155,14 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     if (*until)
         return;
     _application.requireLoop();
+    QPointer<QWidget> const window = QApplication::activeModalWidget();
     std::exception_ptr const error = QtLoop(until, end).run();
     QtGuard::getInstance().destroyWaiting();
-    if (error)
-        QtGuard::getInstance().rethrow(error);
+    if (!error)
+        return;
+    if (auto* const left = dynamic_cast<WindowWidget*>(window.data()))
+        left->stopWaiting();
+    QtGuard::getInstance().rethrow(error);
 }
 
 void QtPlatform::endLoop()

@@ -13,13 +13,6 @@ namespace Kv
 namespace
 {
 
-/// False where windows never cover each other, and the toolkit complains when they are asked to.
-bool hasStack()
-{
-    QString const name = QGuiApplication::platformName();
-    return name != QLatin1String("offscreen") && name != QLatin1String("minimal");
-}
-
 /// Takes the windows down that are left when the application goes, while they still can be destroyed.
 void destroyLeftWindows()
 {
@@ -47,7 +40,6 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, QRect cons
     goWithApplication();
     WindowWidget* const native = getNative();
     native->setWindowTitle(QString::fromStdString(title));
-    native->setWindowModality(Qt::ApplicationModal);
     native->setGeometry(frame);
     native->getArea().setWidget(_content->getNative());
 }
@@ -68,17 +60,14 @@ void QtWindow::setContentSize(int width, int height)
 
 void QtWindow::show()
 {
-    QWidget* const native = _native.get();
+    WindowWidget* const native = getNative();
     if (!native)
         return;
     // The native window must be there for the owner to be told of.
     native->winId();
     if (_owner && _owner->windowHandle())
         native->windowHandle()->setTransientParent(_owner->windowHandle());
-    native->show();
-    if (hasStack())
-        native->raise();
-    native->activateWindow();
+    native->showModal();
 }
 
 void QtWindow::hide()

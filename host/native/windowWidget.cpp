@@ -5,6 +5,7 @@
 #include <QApplication>
 #include <QCloseEvent>
 #include <QKeyEvent>
+#include <QTimer>
 
 #include <functional>
 #include <utility>
@@ -17,6 +18,13 @@ namespace
 
 /// How often a layout may make scroll bars come and go before it is left as it is.
 constexpr int maxRounds = 4;
+
+/// False where windows never cover each other, and the toolkit complains when they are asked to.
+bool hasStack()
+{
+    QString const name = QGuiApplication::platformName();
+    return name != QLatin1String("offscreen") && name != QLatin1String("minimal");
+}
 
 /// Says when the room that it has for its content changes.
 class ContentArea final : public QScrollArea
@@ -58,10 +66,42 @@ std::vector<QPointer<WindowWidget>> WindowWidget::findAll()
     return windows;
 }
 
+void WindowWidget::showModal()
+{
+    _awaited = true;
+    // A visible window keeps the modality that it was shown with.
+    if (isVisible() && windowModality() != Qt::ApplicationModal)
+        hide();
+    setWindowModality(Qt::ApplicationModal);
+    show();
+    if (hasStack())
+        raise();
+    activateWindow();
+}
+
+void WindowWidget::stopWaiting()
+{
+    _awaited = false;
+    QTimer::singleShot(0, this, [this] { letOthersIn(); });
+}
+
+void WindowWidget::letOthersIn()
+{
+    if (_awaited || !isVisible())
+        return;
+    hide();
+    setWindowModality(Qt::NonModal);
+    setAttribute(Qt::WA_ShowWithoutActivating);
+    show();
+    setAttribute(Qt::WA_ShowWithoutActivating, false);
+    if (QWidget* const modal = QApplication::activeModalWidget())
+        modal->activateWindow();
+}
+
 void WindowWidget::showEvent(QShowEvent* event)
 {
     QWidget::showEvent(event);
-    if (!event->spontaneous())
+    if (!event->spontaneous() && isModal())
         blockOthers();
     // Not on the screen yet, but with its final size: the first picture is laid out.
     tellRoom();

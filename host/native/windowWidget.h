@@ -24,6 +24,13 @@ public:
     /// All that there are now, shown or not.
     static std::vector<QPointer<WindowWidget>> findAll();
 
+    /// Shows the window, modal to all others, and activates it.
+    void showModal();
+
+    /// Nobody waits for this window any more, though it stays shown: with the next turn of a loop it lets the user
+    /// reach the others again, unless it is shown anew or gone until then.
+    void stopWaiting();
+
     /// What scrolls the content. Natively a child of this.
     QScrollArea& getArea() { return *_area; }
 
@@ -38,6 +45,7 @@ protected:
 private:
     void tellRoom();
     void blockOthers();
+    void letOthersIn();
 
     QtEar<NtWindowListener> _ear;
     QScrollArea* _area;
@@ -45,6 +53,7 @@ private:
     /// The room as it was told last; none is told to a hidden window.
     QSize _told;
     bool _telling = false;
+    bool _awaited = false;
 
     /// Keep input from the windows that were open when this one was shown, while it is.
     std::vector<std::unique_ptr<QtInputDrop>> _blocked;
