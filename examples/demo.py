@@ -30,7 +30,8 @@ def play():
     from player import Player
 
     folder = os.path.join(os.getcwd(), 'build', 'demo')
-    os.makedirs(folder, exist_ok=True)
+    os.makedirs(folder, mode=0o700, exist_ok=True)
+    os.environ.setdefault('XDG_RUNTIME_DIR', folder)
     player = Player(folder, [
         [
             lambda person: person.type('Golden Reel Awards'),
