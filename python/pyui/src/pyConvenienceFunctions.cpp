@@ -2,7 +2,6 @@
 
 #include "pyConvenienceFunctions.h"
 
-#include "gfx/wsFontRegistry.h"
 #include "pyUtils.h"
 #include "pyWidgetListGenerator.h"
 #include "ui/uiConstraint.h"
@@ -28,11 +27,6 @@ constexpr int closeButtonWidth = 14;
 constexpr int closeButtonGap = 2;
 constexpr int sideMargin = 2;
 
-int lengthOf(bp::list const& list)
-{
-    return bp::extract<int>(list.attr("__len__")());
-}
-
 int heightFor(int rowCount)
 {
     return rowHeight * rowCount + heightBase;
@@ -55,13 +49,6 @@ RCShdPtr<Dialog> makeDialog(std::string const& title, std::string const& xmlStri
     RCShdPtr<Dialog> dialog = makeDialog(title, xmlString, width, height);
     dialog->setValues(initialValues, false);
     return dialog;
-}
-
-/// Width of a text in layout units.
-int measure(std::string const& text)
-{
-    int const pixels = static_cast<int>(WsFontRegistry::getInstance().getDefaultFont()->getStringWidth(text.c_str()));
-    return static_cast<int>(UiConstraint::pixelsToUIUnits({static_cast<float>(pixels), 0}).x);
 }
 
 } // namespace
@@ -105,7 +92,7 @@ std::string showMessageBox(std::string const& title, bp::list const& messages, b
     for (int i = 0; i < lineCount; ++i)
     {
         std::string const line = bp::extract<std::string>(messages[i]);
-        contentWidth = std::max(contentWidth, measure(line));
+        contentWidth = std::max(contentWidth, measureInUnits(line));
         widgets.append(bp::make_tuple("Label", "Msg", "", line));
     }
     contentWidth += sideMargin;

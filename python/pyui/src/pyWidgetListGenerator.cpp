@@ -51,18 +51,18 @@ struct Substituter
     void writeNumber(std::string& text, int number) { text = LiStringUtil::convertNb(number); }
 };
 
+} // namespace
+
 int lengthOf(bp::object const& sequence)
 {
     return bp::extract<int>(sequence.attr("__len__")());
 }
 
-int measurePushButton(std::string const& name)
+int measureInUnits(std::string const& text)
 {
-    int const pixels = static_cast<int>(WsFontRegistry::getInstance().getDefaultFont()->getStringWidth(name.c_str()));
-    return static_cast<int>(UiConstraint::pixelsToUIUnits({static_cast<float>(pixels), 0}).x) + pushButtonMargin;
+    int const pixels = static_cast<int>(WsFontRegistry::getInstance().getDefaultFont()->getStringWidth(text.c_str()));
+    return static_cast<int>(UiConstraint::pixelsToUIUnits({static_cast<float>(pixels), 0}).x);
 }
-
-} // namespace
 
 WidgetListGenerator::WidgetListGenerator(bp::list const& widgetEntries, bp::list const& closeButtonLabels)
     : _widgets(widgetEntries), _closeButtons(closeButtonLabels)
@@ -197,7 +197,7 @@ void WidgetListGenerator::writeRow(std::string const& type, std::string const& n
         writeValue = &WidgetListGenerator::writeTextValue;
     }
     else if (type == pushButtonType)
-        openRowWidget(type, name, rowOffset, measurePushButton(name), "w");
+        openRowWidget(type, name, rowOffset, measureInUnits(name) + pushButtonMargin, "w");
     else
         openRowWidget(type, name, rowOffset, rightMargin, "r");
     if (writeValue)

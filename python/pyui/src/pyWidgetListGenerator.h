@@ -17,6 +17,12 @@ namespace PyextUi
 /// The label of the close button that a dialog always has.
 inline std::string const okLabel = "OK";
 
+/// How long a Python sequence says it is.
+int lengthOf(boost::python::object const& sequence);
+
+/// Width of a text in the default font, in whole layout units.
+int measureInUnits(std::string const& text);
+
 /// Turns a list of widget entries into the description of a form: a row for each entry, with a caption on the left and
 /// the widget on the right, and a bar of close buttons along the bottom. Each entry is a tuple ( type, name, label,
 /// initial state ), of which the last two can be left out. Made for one call of `generate`.
