@@ -1,5 +1,7 @@
 #include "native/qtLabel.h"
 
+#include "native/qtText.h"
+
 namespace Kv
 {
 
@@ -23,7 +25,7 @@ QtLabel::QtLabel(QWidget* parent, std::string const& name) : QtPeer(makeNative<Q
 void QtLabel::setText(std::string const& text)
 {
     if (QLabel* const label = getNative())
-        label->setText(QString::fromStdString(text));
+        label->setText(toQString(text));
 }
 
 void QtLabel::setAlign(NtAlign align)

@@ -1,6 +1,7 @@
 #include "native/qtMenu.h"
 
 #include "native/qtLabel.h"
+#include "native/qtText.h"
 
 #include <QAbstractItemView>
 #include <QScreen>
@@ -128,7 +129,7 @@ void QtMenu::append(std::string const& entry)
         return;
     // The first entry would select itself.
     int const selected = box->currentIndex();
-    box->addItem(QString::fromStdString(entry));
+    box->addItem(toQString(entry));
     box->setCurrentIndex(selected);
 }
 

@@ -1,6 +1,7 @@
 #include "native/qtNative.h"
 
 #include "native/qtGuard.h"
+#include "native/qtText.h"
 
 #include <QCoreApplication>
 #include <QTextDocument>
@@ -14,7 +15,7 @@ QtNative::QtNative(QWidget* widget, std::string const& name, int inset) : _widge
 {
     if (!_widget)
         return;
-    QString const text = QString::fromStdString(name);
+    QString const text = toQString(name);
     _widget->setObjectName(text);
     _widget->setAccessibleName(text);
     if (_widget->isWindow())
@@ -56,7 +57,7 @@ void QtNative::setEnabled(bool enabled) const
 
 void QtNative::setTooltip(std::string const& text) const
 {
-    QString tip = QString::fromStdString(text);
+    QString tip = toQString(text);
     if (Qt::mightBeRichText(tip))
         tip = Qt::convertFromPlainText(tip, Qt::WhiteSpaceNormal);
     if (QWidget* const widget = get())

@@ -6,6 +6,7 @@
 #include "native/qtLoop.h"
 #include "native/qtMenu.h"
 #include "native/qtPushButton.h"
+#include "native/qtText.h"
 #include "native/qtTextField.h"
 #include "native/qtToggle.h"
 #include "native/qtWindow.h"
@@ -80,7 +81,7 @@ void QtPlatform::setScriptHook(NtScriptHook* hook)
 
 float QtPlatform::measureText(std::string const& text)
 {
-    QString const string = QString::fromStdString(text);
+    QString const string = toQString(text);
     double const width = _application.hasGui() ? measure(string) : estimateTextWidth(string);
     return static_cast<float>(std::ceil(width));
 }

@@ -1,5 +1,7 @@
 #include "native/qtPushButton.h"
 
+#include "native/qtText.h"
+
 #include <QKeyEvent>
 
 namespace Kv
@@ -59,7 +61,7 @@ void QtPushButton::setText(std::string const& text)
 {
     // A lone ampersand would become the mark of a shortcut.
     if (QPushButton* const button = getNative())
-        button->setText(QString::fromStdString(text).replace(QLatin1Char('&'), QLatin1String("&&")));
+        button->setText(toQString(text).replace(QLatin1Char('&'), QLatin1String("&&")));
 }
 
 } // namespace Kv

@@ -1,6 +1,7 @@
 #include "native/qtTextField.h"
 
 #include "native/qtLabel.h"
+#include "native/qtText.h"
 
 #include <QKeyEvent>
 #include <QMouseEvent>
@@ -81,7 +82,7 @@ QtTextField::~QtTextField()
 void QtTextField::setText(std::string const& text, bool cursorAtEnd)
 {
     QLineEdit* const field = getNative();
-    QString const newText = QString::fromStdString(text);
+    QString const newText = toQString(text);
     // The same text again would lose the user's selection and undo steps.
     if (!field || field->text() == newText)
         return;

@@ -1,6 +1,7 @@
 #include "native/qtWindow.h"
 
 #include "native/qtInputDrop.h"
+#include "native/qtText.h"
 #include "native/windowWidget.h"
 
 #include <QApplication>
@@ -39,7 +40,7 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, QRect cons
 {
     goWithApplication();
     WindowWidget* const native = getNative();
-    native->setWindowTitle(QString::fromStdString(title));
+    native->setWindowTitle(toQString(title));
     native->setGeometry(frame);
     native->getArea().setWidget(_content->getNative());
 }
