@@ -4,6 +4,7 @@
 #include "base/rcExUtil.h"
 
 #include <cstddef>
+#include <type_traits>
 #include <typeinfo>
 #include <utility>
 
@@ -22,7 +23,11 @@ public:
     RCShdPtr(T* object) : _object(object) { acquire(); }
     RCShdPtr(RCShdPtr const& other) : _object(other._object) { acquire(); }
     RCShdPtr(RCShdPtr&& other) noexcept : _object(std::exchange(other._object, nullptr)) {}
-    template <typename U> RCShdPtr(RCShdPtr<U> const& other) : _object(other.get()) { acquire(); }
+    template <typename U, typename = std::enable_if_t<std::is_convertible_v<U*, T*>>>
+    RCShdPtr(RCShdPtr<U> const& other) : _object(other.get())
+    {
+        acquire();
+    }
     ~RCShdPtr() { reset(); }
 
     RCShdPtr& operator=(RCShdPtr other) noexcept

@@ -3,6 +3,7 @@
 #include "base/rcExUtil.h"
 
 #include <memory>
+#include <type_traits>
 #include <typeinfo>
 #include <utility>
 
@@ -16,7 +17,10 @@ template <typename T> class RCStrongPtr
 public:
     RCStrongPtr() = default;
     template <typename U> RCStrongPtr(std::shared_ptr<U> object) : _object(std::move(object)) {}
-    template <typename U> RCStrongPtr(RCStrongPtr<U> const& other) : _object(other.getShared()) {}
+    template <typename U, typename = std::enable_if_t<std::is_convertible_v<U*, T*>>>
+    RCStrongPtr(RCStrongPtr<U> const& other) : _object(other.getShared())
+    {
+    }
 
     /// Borrowed; null for a null pointer.
     T* get() const { return _object.get(); }
