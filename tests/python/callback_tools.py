@@ -20,7 +20,7 @@ UNKNOWN = 'Cannot find widget: the specified widget does not exist.'
 
 def make_dialog(title='Form', buttons=('OK', 'Cancel')):
     return ui.createDialog(title, ui.makeXmlFromWidgetList([
-        ('TextField', 'Text', '', 'old'), ('ToggleButton', 'Toggle', '', False), ('Menu', 'Menu', '', (['a', 'b'], 0)),
+        ('TextField', 'Text', 'Caption', 'old'), ('ToggleButton', 'Toggle', '', False), ('Menu', 'Menu', '', (['a', 'b'], 0)),
         ('PushButton', 'Button'), ('PushButton', 'Other'), ('Label', 'Note', '', 'note')], list(buttons)), 400, 224)
 
 
@@ -46,10 +46,11 @@ class PatientUser(User):
         self._timer.start(5)
 
     def _next(self):
-        self._timer.start(5)
+        if self._steps:
+            self._timer.start(5)
         super()._next()
         # From here on anew: what the step ended must have come to its end.
-        if self._timer is not None:
+        if self._steps:
             self._timer.start(5)
 
 
@@ -65,8 +66,12 @@ def patient():
 @pytest.fixture(autouse=True)
 def no_wait_is_endless():
     """A dialog that nobody closes any more fails its test."""
-    def give_up(*_):
-        raise TimeoutError('the dialog is still open')
+    def give_up(_, frame):
+        # In the user's own slot it would be lost: again, until it comes in the loop of the dialog.
+        if os.path.basename(frame.f_code.co_filename) in ('user.py', 'callback_tools.py'):
+            signal.setitimer(signal.ITIMER_REAL, 0.007)
+        else:
+            raise TimeoutError('the dialog is still open')
 
     previous = signal.signal(signal.SIGALRM, give_up)
     signal.alarm(20)
@@ -75,8 +80,9 @@ def no_wait_is_endless():
     signal.signal(signal.SIGALRM, previous)
 
 
-def run_script(text, timeout=120):
+def run_script(text, timeout=300):
     """Runs a script in a process of its own, beside these tools, and gives what it printed."""
+    signal.alarm(0)  # the process has an end of its own
     environment = dict(os.environ, PYTHONPATH=os.pathsep.join(os.path.abspath(path) for path in sys.path))
     done = subprocess.run([sys.executable, '-c', text], env=environment, stdout=subprocess.PIPE,
                           stderr=subprocess.PIPE, text=True, timeout=timeout)

@@ -11,12 +11,16 @@ from PyQt6.QtWidgets import QApplication, QWidget
 
 class User:
     """Does things to dialogs while they block in launch. The steps given to `plan` run one after the other, each once
-    the one before has returned and a dialog of ours has the stage; what goes wrong in one fails the test."""
+    the one before has returned and a dialog of ours has the stage. What goes wrong in one fails the test, and so does a
+    dialog that the last one leaves open for long; both are then closed."""
+
+    PATIENCE = 1000  # turns of the timer
 
     def __init__(self):
         self.failures = []
         self._steps = []
         self._timer = None
+        self._idle = 0
 
     def plan(self, *steps):
         ui.makeXmlFromWidgetList([('PushButton', 'measured')])  # the application is there from here on
@@ -45,7 +49,16 @@ class User:
 
     def _next(self):
         window = self.window()
-        if not self._steps or window is None:
+        if window is None:
+            return
+        if self.failures:
+            self._steps.clear()
+            window.close()
+            return
+        self._idle = 0 if self._steps else self._idle + 1
+        if self._idle > self.PATIENCE:
+            self.failures.append('left open: ' + window.windowTitle())
+        if not self._steps:
             return
         step = self._steps.pop(0)
         try:
@@ -59,9 +72,9 @@ class User:
         return QApplication.activeModalWidget()
 
     def find(self, name, kind=QWidget):
-        found = self.window().findChild(kind, name)
-        assert found is not None, 'no widget named ' + name
-        return found
+        found = [widget for widget in self.window().findChildren(kind) if widget.objectName() == name]
+        assert found, 'no widget named ' + name
+        return found[0]
 
     def click(self, name):
         QTest.mouseClick(self.find(name), Qt.MouseButton.LeftButton)
@@ -69,13 +82,15 @@ class User:
     def close(self, label='OK'):
         self.click('CloseButton_' + label)
 
-    @staticmethod
-    def focus():
-        """The name of the widget that has the keyboard."""
-        return QApplication.focusWidget().objectName()
+    def focused(self):
+        """The widget that has the keyboard. Where no window system says so, an open window may not be active."""
+        return QApplication.focusWidget() or self.window().focusWidget() or self.window()
+
+    def focus(self):
+        return self.focused().objectName()
 
     def type(self, text):
-        QTest.keyClicks(QApplication.focusWidget(), text)
+        QTest.keyClicks(self.focused(), text)
 
     def press(self, key, modifier=Qt.KeyboardModifier.NoModifier):
-        QTest.keyClick(QApplication.focusWidget() or self.window(), key, modifier)
+        QTest.keyClick(self.focused(), key, modifier)

@@ -1,0 +1,170 @@
+#include <boost/python.hpp>
+
+#include "gfx/wsCursorRegistry.h"
+#include "pyui/src/pyDialogHolder.h"
+#include "pyui/src/pyUiError.h"
+#include "ui/uiCursorGuard.h"
+
+#include <gtest/gtest.h>
+#include <memory>
+#include <string>
+
+namespace bp = boost::python;
+
+using namespace Kv;
+using PyextUi::Dialog;
+using PyextUi::UiError;
+
+namespace
+{
+
+class Tag;
+using TestError = PyextInit::ModError<Tag>;
+
+/// The names of one script, with the module in it as `ui`.
+class Script : public testing::Test
+{
+protected:
+    Script()
+    {
+        names["__builtins__"] = bp::import("builtins");
+        run("import gc, weakref\n"
+            "from quorvane_velmora import ui\n"
+            "def make():\n"
+            "    entries = [('TextField', 'Text', '', 'old'), ('ToggleButton', 'Toggle', '', False)]\n"
+            "    return ui.createDialog('Title', ui.makeXmlFromWidgetList(entries, []), 400, 112)\n");
+    }
+
+    void run(char const* text) { bp::exec(text, names); }
+
+    std::string evaluate(char const* text) { return bp::extract<std::string>(bp::str(bp::eval(text, names))); }
+
+    RCShdPtr<ManagedDialog> getManaged(char const* expression)
+    {
+        return bp::extract<RCShdPtr<ManagedDialog>&>(bp::eval(expression, names))();
+    }
+
+    bp::dict names;
+};
+
+void raiseThroughTheBase()
+{
+    std::unique_ptr<ExBase> const held(UiError("source.cpp", 17, "There is no such thing.").clone());
+    held->raise();
+}
+
+} // namespace
+
+TEST_F(Script, SeesAModuleErrorThatWasHeldAndRaisedAsTheBase)
+{
+    EXPECT_THROW(raiseThroughTheBase(), UiError);
+    EXPECT_THROW(raiseThroughTheBase(), PyextInit::Error);
+    names["fail"] = bp::make_function(&raiseThroughTheBase);
+    run("try:\n    fail()\nexcept ui.UiError as error:\n    caught = error\n");
+    EXPECT_EQ(evaluate("caught"), "There is no such thing.");
+    EXPECT_EQ(evaluate("type(caught) is ui.UiError and type(caught).__mro__[1] is Exception"), "True");
+}
+
+TEST_F(Script, NamesTheModuleInItsErrors)
+{
+    EXPECT_EQ(UiError("source.cpp", 17, "reason").getModName(), "ui");
+    EXPECT_STREQ(UiError("source.cpp", 17, "reason").getDetailedReason(), "reason (source.cpp:17)");
+}
+
+TEST_F(Script, GetsNoExceptionTypeWithoutNames)
+{
+    auto const wordsOf = [](char const* modName, char const* className) -> std::string
+    {
+        try
+        {
+            TestError::initialize(modName, className);
+        }
+        catch (ExAssertionFailed const& failed)
+        {
+            return failed.getReason();
+        }
+        return "";
+    };
+    EXPECT_NE(wordsOf("", "TestError").find("!_modName.empty()"), std::string::npos);
+    EXPECT_NE(wordsOf("test", "").find("!_className.empty()"), std::string::npos);
+    EXPECT_EQ(wordsOf("test", "TestError"), "");
+    TestError::exceptionTranslator(TestError("source.cpp", 17, "reason"));
+    bp::handle<> const type(bp::borrowed(PyErr_Occurred()));
+    PyErr_Clear();
+    EXPECT_EQ(std::string(bp::extract<std::string>(bp::str(bp::object(type)))), "<class 'test.TestError'>");
+    EXPECT_EQ(PyextInit::Error::newException("test", "TestError"), type.get());
+}
+
+TEST_F(Script, GetsNoDialogFromPointersToNone)
+{
+    EXPECT_THROW(bp::object(RCShdPtr<ManagedDialog>()), ExNullPtr);
+    EXPECT_THROW(get_pointer(RCShdPtr<ManagedDialog>()), ExNullPtr);
+    bp::object const none(makeShd<ManagedDialog>(RCShdPtr<Dialog>()));
+    EXPECT_TRUE(none.is_none());
+}
+
+TEST_F(Script, GetsEachObjectFreshlyStampedAndTheirDialogOnce)
+{
+    run("dialog, given = make(), []\n"
+        "dialog.addCallback('Toggle', ui.EventType.STATE, lambda one, *_: given.append(one))\n"
+        "dialog.setValue('Toggle', True)\ndialog.setValue('Toggle', False)\n");
+    RCShdPtr<ManagedDialog> const own = getManaged("dialog");
+    for (char const* const expression : {"given[0]", "given[1]"})
+    {
+        RCShdPtr<ManagedDialog> const other = getManaged(expression);
+        EXPECT_NE(other.get(), own.get());
+        EXPECT_EQ(other->getValue(), own->getValue());
+        EXPECT_EQ(other->getInterpreterId(), PiPythonUtils::getCurrentPythonInterpreterId());
+    }
+    EXPECT_EQ(own->getInterpreterId(), PiPythonUtils::getCurrentPythonInterpreterId());
+    EXPECT_FALSE(own->getInterpreterId().is_nil());
+}
+
+TEST_F(Script, LeavesADialogThatNativeCodeHolds)
+{
+    run("dialog, heard = make(), []\n"
+        "def callback(given, *_):\n"
+        "    heard.append(given.getValue('Toggle'))\n"
+        "callback.dialog = dialog\n"
+        "gone, object_gone = weakref.ref(callback), weakref.ref(dialog)\n"
+        "dialog.addCallback('Toggle', ui.EventType.STATE, callback)\n"
+        "del callback\n");
+    RCShdPtr<Dialog> dialog = getManaged("dialog")->getValue();
+    run("del dialog\ngc.collect()\n");
+    dialog->setValue("Toggle", bp::object(true));
+    EXPECT_EQ(evaluate("heard"), "[True]");
+    EXPECT_EQ(evaluate("object_gone() is None"), "False") << "its callable still has it";
+    dialog.reset();
+    run("gc.collect()\n");
+    EXPECT_EQ(evaluate("(gone(), object_gone())"), "(None, None)");
+}
+
+TEST_F(Script, HasItsOwnExceptionComeThroughANativeLaunchThatIsWellUnwound)
+{
+    run("import signal\n"
+        "class Own(BaseException): pass\n"
+        "def alarm(*_):\n    raise Own()\n"
+        "signal.signal(signal.SIGALRM, alarm)\n"
+        "dialog = make()\n");
+    UiCursorGuard const busy(WsCursorRegistry::Busy);
+    RCShdPtr<Dialog> const dialog = getManaged("dialog")->getValue();
+    for (int round = 0; round < 2; ++round)
+    {
+        run("signal.setitimer(signal.ITIMER_REAL, 0.05)\n");
+        EXPECT_THROW(dialog->launch(), bp::error_already_set);
+        EXPECT_TRUE(PyErr_ExceptionMatches(bp::object(names["Own"]).ptr()));
+        PyErr_Clear();
+        EXPECT_EQ(WsCursorRegistry::getInstance().getCurrent(), WsCursorRegistry::Busy);
+    }
+    run("del dialog\ngc.collect()\n");
+    EXPECT_EQ(dialog->getReferenceCount(), 1);
+}
+
+int main(int argc, char** argv)
+{
+    testing::InitGoogleTest(&argc, argv);
+    Py_Initialize();
+    bp::import("sys").attr("path").attr("insert")(0, KV_PACKAGE_DIR);
+    int const result = RUN_ALL_TESTS();
+    return Py_FinalizeEx() == 0 ? result : 1;
+}

@@ -1,0 +1,263 @@
+"""What a callback raises comes out where the script can catch it, and leaves everything in working order."""
+
+import gc
+import sys
+import traceback
+
+import pytest
+
+from callback_tools import listen, make_dialog, no_wait_is_endless, patient  # noqa: F401
+from quorvane_velmora import ui
+from PyQt6.QtCore import QEventLoop, QTimer, Qt
+from PyQt6.QtTest import QTest
+from PyQt6.QtWidgets import QApplication, QPushButton
+
+ACTIVATE, STATE = ui.EventType.ACTIVATE, ui.EventType.STATE
+
+
+class Own(BaseException):
+    pass
+
+
+def click(name):
+    return lambda user: user.click(name)
+
+
+def close(user):
+    user.close()
+
+
+def raising(exception):
+    def deep_inside():
+        raise exception
+
+    def callback(*_):
+        deep_inside()
+
+    return callback
+
+
+def functions(exception):
+    return [frame.name for frame in traceback.extract_tb(exception.__traceback__)]
+
+
+def listen_to_reports(monkeypatch):
+    """Gives the list into which goes from now on what is reported since nobody can catch it."""
+    reported = []
+    monkeypatch.setattr(sys, 'unraisablehook', lambda report: reported.append(report.exc_value))
+    return reported
+
+
+EXCEPTIONS = [ValueError('of the script'), SystemExit(3), KeyboardInterrupt(), Own(), ui.UiError('own words')]
+
+
+@pytest.mark.parametrize('exception', EXCEPTIONS, ids=lambda exception: type(exception).__name__)
+def test_an_exception_comes_out_of_launch_and_the_dialog_runs_again(user, exception):
+    dialog = make_dialog()
+    callback = raising(exception)
+    dialog.addCallback('Button', ACTIVATE, callback)
+    heard = listen(dialog, 'Button')
+    cursor = QApplication.overrideCursor()
+    for _ in range(2):
+        user.plan(click('Button'))
+        with pytest.raises(type(exception)) as caught:
+            dialog.launch()
+        assert caught.value is exception
+        assert functions(exception)[-2:] == ['callback', 'deep_inside']
+        assert heard == []
+        assert QApplication.overrideCursor() is cursor
+        exception.__traceback__ = None
+    dialog.removeCallback('Button', ACTIVATE, callback)
+    user.plan(click('Button'), close)
+    assert dialog.launch() == 'CloseButton_OK'
+    assert heard == [('Button', ACTIVATE)]
+
+
+@pytest.mark.parametrize('exception', EXCEPTIONS, ids=lambda exception: type(exception).__name__)
+@pytest.mark.parametrize('set_it', [lambda dialog: dialog.setValue('Toggle', True),
+                                    lambda dialog: dialog.setValues({'Toggle': True})], ids=['setValue', 'setValues'])
+def test_an_exception_comes_out_of_the_setter_that_raised_the_event(user, exception, set_it):
+    dialog = make_dialog()
+    dialog.addCallback('Toggle', STATE, raising(exception))
+    caught = []
+
+    def set_and_catch(_=None):
+        try:
+            set_it(dialog)
+        except BaseException as error:
+            caught.append((error, functions(error)[-2:], dialog.getValue('Toggle')))
+            error.__traceback__ = None
+
+    set_and_catch()
+    user.plan(set_and_catch, close)
+    assert dialog.launch() == 'CloseButton_OK'
+    assert caught == [(exception, ['callback', 'deep_inside'], True)] * 2
+
+
+def test_an_exception_of_a_disabling_operation_comes_out_of_it():
+    dialog = make_dialog()
+    dialog.addCallback('Toggle', ui.EventType.DISABLE, raising(ValueError('of the script')))
+    with pytest.raises(ValueError, match='of the script'):
+        dialog.enableWidget('Toggle', False)
+    assert dialog.isEnabled('Toggle') is False
+
+
+def test_the_window_of_a_run_that_failed_goes_with_its_dialog(user):
+    before = set(QApplication.allWidgets())
+    dialog = make_dialog()
+    dialog.addCallback('Button', ACTIVATE, raising(ValueError()))
+    user.plan(click('Button'))
+    with pytest.raises(ValueError):
+        dialog.launch()
+    del dialog
+    gc.collect()
+    assert set(QApplication.allWidgets()) <= before
+    assert QApplication.activeModalWidget() is None
+
+
+@pytest.mark.parametrize('kept', [True, False], ids=['kept', 'dropped'])
+def test_a_dialog_goes_on_when_it_catches_what_the_run_of_an_inner_one_raised(patient, kept):
+    outer, inner = make_dialog('outer'), [make_dialog('inner')]
+    inner[0].addCallback('Button', ACTIVATE, raising(ValueError('of the script')))
+    seen = []
+
+    def run_inner(*_):
+        try:
+            inner[0].launch()
+        except ValueError as error:
+            seen.append(str(error))
+        if not kept:
+            inner.clear()
+
+    outer.addCallback('Button', ACTIVATE, run_inner)
+    patient.plan(click('Button'), click('Button'), lambda user: seen.append(user.window().windowTitle()),
+                 click('Toggle'), close)
+    assert outer.launch() == 'CloseButton_OK'
+    assert seen == ['of the script', 'outer']
+    assert outer.getValue('Toggle') is True
+
+
+def test_what_is_not_caught_between_comes_out_of_every_launch_in_turn(patient):
+    outer, inner, other = (make_dialog(title) for title in ('outer', 'inner', 'other'))
+    exception = ValueError('of the script')
+    inner.addCallback('Button', ACTIVATE, raising(exception))
+    outer.addCallback('Button', ACTIVATE, lambda *_: inner.launch())
+    patient.plan(click('Button'), click('Button'))
+    with pytest.raises(ValueError) as caught:
+        outer.launch()
+    assert caught.value is exception
+    assert functions(exception)[1:] == ['<lambda>', 'callback', 'deep_inside']
+    for dialog in (other, outer, inner):
+        patient.plan(close)
+        assert dialog.launch() == 'CloseButton_OK'
+
+
+def press(name):
+    QTest.mouseClick(QApplication.activeModalWidget().findChild(QPushButton, name), Qt.MouseButton.LeftButton)
+
+
+def press_in_an_event_of_its_own(name, dispatch):
+    QTimer.singleShot(0, lambda: press(name))
+    dispatch()
+
+
+DRIVERS = {
+    'QTest': press,
+    'processEvents': lambda name: press_in_an_event_of_its_own(name, QApplication.processEvents),
+    'qWait': lambda name: press_in_an_event_of_its_own(name, lambda: QTest.qWait(20)),
+    'event loop': lambda name: press_in_an_event_of_its_own(
+        name, lambda: QEventLoop().processEvents(QEventLoop.ProcessEventsFlag.AllEvents)),
+    'click': lambda name: QApplication.activeModalWidget().findChild(QPushButton, name).click(),
+}
+
+
+@pytest.mark.parametrize('drive', DRIVERS.values(), ids=DRIVERS.keys())
+def test_an_exception_passes_a_callback_that_itself_drives_the_toolkit(user, drive):
+    dialog = make_dialog()
+    after = []
+    exception = ValueError('of the script')
+
+    def first(*_):
+        drive('Other')
+        after.append(sys.exc_info())
+
+    dialog.addCallback('Button', ACTIVATE, first)
+    dialog.addCallback('Other', ACTIVATE, raising(exception))
+    user.plan(click('Button'))
+    with pytest.raises(ValueError) as caught:
+        dialog.launch()
+    assert caught.value is exception and functions(exception)[-2:] == ['callback', 'deep_inside']
+    assert after == [(None, None, None)]
+
+
+@pytest.mark.parametrize('drive', DRIVERS.values(), ids=DRIVERS.keys())
+def test_a_second_exception_before_the_first_has_left_is_the_last_of_its_context(user, drive):
+    dialog = make_dialog()
+    first, second, third = ValueError('first'), KeyError('second'), Own('third')
+    first.__context__ = OSError('what the first came from')
+    waiting = [first, second]
+
+    def earlier(*_):
+        raise waiting.pop(0)
+
+    def later(*_):
+        drive('Other')
+        drive('Other')
+        raise third
+
+    dialog.addCallback('Other', ACTIVATE, earlier)
+    dialog.addCallback('Button', ACTIVATE, later)
+    user.plan(click('Button'))
+    with pytest.raises(ValueError) as caught:
+        dialog.launch()
+    assert caught.value is first
+    chain = [first]
+    while chain[-1].__context__:
+        chain.append(chain[-1].__context__)
+    assert [str(error) for error in chain] == ['first', 'what the first came from', "'second'", 'third']
+    assert [functions(error)[-1] for error in (first, second, third)] == ['earlier', 'earlier', 'later']
+
+
+def test_a_second_exception_that_cannot_be_its_context_is_reported(user, monkeypatch):
+    unraisable = listen_to_reports(monkeypatch)
+    dialog = make_dialog()
+    first, second = ValueError('first'), KeyError('second')
+    second.__context__ = first
+
+    def later(*_):
+        press('Other')
+        raise second
+
+    dialog.addCallback('Other', ACTIVATE, raising(first))
+    dialog.addCallback('Button', ACTIVATE, later)
+    user.plan(click('Button'))
+    with pytest.raises(ValueError) as caught:
+        dialog.launch()
+    assert caught.value is first and first.__context__ is None
+    assert unraisable == [second]
+    assert functions(second) == ['later'] and functions(first)[-1] == 'deep_inside'
+
+
+@pytest.mark.parametrize('exception', EXCEPTIONS, ids=lambda exception: type(exception).__name__)
+def test_with_no_dialog_running_an_exception_is_reported_and_the_process_goes_on(user, monkeypatch, exception):
+    unraisable = listen_to_reports(monkeypatch)
+    title = 'left by ' + type(exception).__name__
+    dialog = make_dialog(title)
+    failing = raising(ValueError('leaves the window on the screen'))
+    dialog.addCallback('Button', ACTIVATE, failing)
+    user.plan(click('Button'))
+    with pytest.raises(ValueError):
+        dialog.launch()
+    dialog.removeCallback('Button', ACTIVATE, failing)
+    heard = []
+    dialog.addCallback('Button', ACTIVATE, lambda *_: heard.append('heard'))
+    dialog.addCallback('Button', ACTIVATE, raising(exception))
+    gc.collect()
+    window, = (window for window in QApplication.topLevelWidgets() if window.windowTitle() == title)
+    for drive in (lambda: QTest.mouseClick(window.findChild(QPushButton, 'Button'), Qt.MouseButton.LeftButton),
+                  lambda: window.findChild(QPushButton, 'Button').click()):
+        drive()
+    assert heard == ['heard'] * 2
+    assert unraisable == [exception] * 2
+    assert functions(exception)[-2:] == ['callback', 'deep_inside']
+    exception.__traceback__ = None

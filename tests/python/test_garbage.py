@@ -1,0 +1,236 @@
+"""Dialogs and callables that refer to each other go when the script has let go of them, natively too."""
+
+import gc
+import itertools
+import weakref
+
+import pytest
+
+from callback_tools import make_dialog, no_wait_is_endless, run_script  # noqa: F401
+from quorvane_velmora import ui
+from PyQt6.QtWidgets import QApplication
+
+ACTIVATE, STATE = ui.EventType.ACTIVATE, ui.EventType.STATE
+
+
+class Keeper:
+    """Keeps dialogs, and hears of their events."""
+
+    def __init__(self, *kept):
+        self.kept = list(kept)
+
+    def hear(self, dialog, *_):
+        pass
+
+    def keep_given(self, dialog, *_):
+        self.kept.append(dialog)
+
+
+def closure(dialog):
+    def callback(*_):
+        return dialog
+    dialog.addCallback('Toggle', STATE, callback)
+    return [callback]
+
+
+def bound_method(dialog):
+    keeper = Keeper(dialog)
+    dialog.addCallback('Toggle', STATE, keeper.hear)
+    return [keeper]
+
+
+def stores_given_in_itself(dialog):
+    def callback(given, *_):
+        callback.given = given
+    dialog.addCallback('Toggle', STATE, callback)
+    dialog.setValue('Toggle', True)
+    return [callback]
+
+
+def stores_every_given_in_a_list(dialog):
+    given = []
+    dialog.addCallback('Toggle', STATE, lambda *arguments: given.append(arguments))
+    for _ in range(3):
+        dialog.setValue('Toggle', True)
+    return [given[0][0], given[2][0]]
+
+
+def stores_given_beside_the_own(dialog):
+    keeper = Keeper(dialog)
+    dialog.addCallback('Toggle', STATE, keeper.keep_given)
+    dialog.setValue('Toggle', True)
+    assert keeper.kept[0] is not keeper.kept[1]
+    return [keeper, keeper.kept[1]]
+
+
+def attribute_of_the_dialog(dialog):
+    dialog.callback = lambda *_: dialog
+    dialog.addCallback('Toggle', STATE, dialog.callback)
+    dialog.addCallback('Note', ACTIVATE, dialog.callback)
+    return [dialog.callback]
+
+
+def two_dialogs_crosswise(dialog):
+    other = make_dialog()
+    for one, two in ((dialog, other), (other, dialog)):
+        one.addCallback('Toggle', STATE, Keeper(two).hear)
+    return [other]
+
+
+MADE_BY = [closure, bound_method, stores_given_in_itself, stores_every_given_in_a_list, stores_given_beside_the_own,
+           attribute_of_the_dialog, two_dialogs_crosswise]
+
+
+
+
+@pytest.mark.parametrize('launched', [False, True], ids=['never shown', 'launched'])
+@pytest.mark.parametrize('make', MADE_BY, ids=lambda make: make.__name__)
+def test_a_circle_through_the_callables_goes_in_every_order_of_letting_go(user, make, launched):
+    ui.makeXmlFromWidgetList([('TextField', 'a', 'the application is there')])
+    gc.collect()
+    native = len(QApplication.allWidgets()) if QApplication.instance() else 0
+    for order in itertools.permutations(range(3)):
+        dialog = make_dialog()
+        held = {place: thing for place, thing in enumerate([dialog] + make(dialog))}
+        if launched:
+            user.plan(lambda someone: someone.click('Toggle'), lambda someone: someone.close())
+            dialog.launch()
+            assert len(QApplication.allWidgets()) > native
+        del dialog
+        watched = [weakref.ref(thing) for thing in held.values()]
+        for place in order:
+            gc.collect()
+            assert all(watched[other]() is thing for other, thing in held.items())
+            held.pop(place, None)
+            thing = None
+        gc.collect()
+        assert [one() for one in watched] == [None] * len(watched)
+        assert (len(QApplication.allWidgets()) if QApplication.instance() else 0) == native
+
+
+def test_a_second_object_of_the_dialog_keeps_its_callbacks_alive_and_at_work():
+    dialog = make_dialog()
+    heard, given = [], []
+    dialog.addCallback('Toggle', STATE, lambda one, *_: (given.append(one), heard.append(one.getValue('Toggle'))))
+    dialog.setValue('Toggle', True)
+    gone = weakref.ref(dialog)
+    del dialog
+    gc.collect()
+    assert gone() is None
+    second = given.pop()
+    assert given == []
+    second.setValue('Toggle', False)
+    gc.collect()
+    given.pop().setValue('Toggle', True)
+    assert heard == [True, False, True]
+
+
+def test_an_object_of_the_script_that_refers_to_the_dialog_keeps_it_whole():
+    keeper = Keeper(make_dialog())
+    heard = []
+    keeper.kept[0].addCallback('Toggle', STATE, lambda *_: heard.append(keeper.kept))
+    keeper.kept[0].addCallback('Toggle', STATE, Keeper(keeper).hear)
+    for _ in range(3):
+        gc.collect()
+    keeper.kept[0].setValue('Toggle', True)
+    assert heard == [keeper.kept]
+
+
+def test_a_callable_goes_with_its_removal_and_with_its_dialog():
+    dialog = make_dialog()
+    first, second = Keeper(), Keeper()
+    kept = first.hear
+    dialog.addCallback('Toggle', STATE, kept)
+    dialog.addCallback('Toggle', STATE, second.hear)
+    gone_first, gone_second = weakref.ref(first), weakref.ref(second)
+    del first, second
+    dialog.removeCallback('Toggle', STATE, kept)
+    del kept
+    assert gone_first() is None and gone_second() is not None
+    del dialog
+    assert gone_second() is None
+
+
+def test_the_collector_may_come_in_the_middle_of_an_event(user):
+    dialog = make_dialog()
+    heard = []
+
+    def callback(given, *_):
+        gc.collect()
+        heard.append(given.getValue('Text'))
+
+    callback.circle = (callback, dialog)
+    dialog.addCallback('Button', ACTIVATE, callback)
+    user.plan(lambda someone: someone.click('Button'), lambda someone: someone.click('Button'),
+              lambda someone: someone.close())
+    dialog.launch()
+    assert heard == ['old'] * 2
+
+
+GROWTH = '''
+import gc, itertools
+from callback_tools import make_dialog, ui
+from test_garbage import MADE_BY, Keeper
+
+def resident():
+    with open('/proc/self/statm') as numbers:
+        return int(numbers.read().split()[1]) * 4096
+
+def measure(rounds, one_round):
+    for number in range(rounds):
+        one_round(number)
+        if number + 1 in (1000, rounds // 2, rounds):
+            gc.collect()
+            print(len(gc.get_objects()), resident())
+'''
+
+NEVER_SHOWN = GROWTH + '''
+def one_round(number):
+    dialog = make_dialog()
+    held = [dialog] + MADE_BY[number % len(MADE_BY)](dialog)
+    if number % 2:
+        held.reverse()
+    del dialog
+    while held:
+        held.pop()
+
+measure(20000, one_round)
+'''
+
+LAUNCHED = GROWTH + '''
+from PyQt6.QtCore import QTimer, Qt
+from PyQt6.QtTest import QTest
+from PyQt6.QtWidgets import QApplication, QPushButton
+
+application = QApplication([])
+widgets = len(QApplication.allWidgets())
+clicks = []
+
+def press():
+    for name in ('Button', 'CloseButton_OK'):
+        button = QApplication.activeModalWidget().findChild(QPushButton, name)
+        QTest.mouseClick(button, Qt.MouseButton.LeftButton)
+
+def one_round(number):
+    dialog = ui.createDialog('Round', description, 400, 84)
+    keeper = Keeper(dialog)
+    dialog.addCallback('Button', ui.EventType.ACTIVATE, keeper.keep_given)
+    dialog.addCallback('Button', ui.EventType.ACTIVATE, lambda *_: clicks.append(dialog) or clicks.clear())
+    QTimer.singleShot(0, press)
+    assert dialog.launch() == 'CloseButton_OK'
+    assert len(keeper.kept) == 2
+
+description = ui.makeXmlFromWidgetList([('PushButton', 'Button')])
+measure(10000, one_round)
+assert len(QApplication.allWidgets()) == widgets
+'''
+
+
+@pytest.mark.parametrize('script', [NEVER_SHOWN, LAUNCHED], ids=['never shown', 'launched'])
+def test_many_rounds_leave_no_object_and_no_memory_behind(script):
+    printed = run_script(script).split()
+    objects, memory = ([int(number) for number in printed[start::2]] for start in (0, 1))
+    assert objects[0] >= objects[1] >= objects[2]
+    # What the allocator still spreads is a fraction of a byte a round.
+    assert memory[2] - memory[1] < 512 << 10
+    assert memory[2] - memory[0] < 8 << 20

@@ -1,0 +1,109 @@
+"""Ctrl-C in a terminal while a dialog of a standalone interpreter is open."""
+
+import fcntl
+import os
+import pty
+import subprocess
+import sys
+import termios
+import time
+
+import pytest
+
+PRELUDE = '''
+import gc, time
+from callback_tools import PatientUser, make_dialog, ui
+from PyQt6.QtWidgets import QApplication
+
+def ready(user):
+    print('ready', flush=True)
+
+def visible():
+    return [window.windowTitle() for window in QApplication.topLevelWidgets() if window.isVisible()]
+
+def interrupted(launch):
+    try:
+        launch()
+    except KeyboardInterrupt:
+        print('interrupted', time.monotonic(), flush=True)
+
+user = PatientUser()
+'''
+
+EPILOGUE = '''
+user.stop()
+assert not user.failures, user.failures
+'''
+
+ONE = '''
+dialog = make_dialog('first')
+user.plan(ready)
+interrupted(dialog.launch)
+del dialog
+gc.collect()
+print(visible())
+second = make_dialog('second')
+user.plan(lambda user: user.click('Toggle'), lambda user: print(visible()), lambda user: user.close())
+print(second.launch(), second.getValue('Toggle'))
+print(visible())
+'''
+
+NESTED = '''
+outer, inner = make_dialog('outer'), [make_dialog('inner')]
+def run_inner(*_):
+    interrupted(inner[0].launch)
+    inner.clear()
+    user.plan(lambda user: print(visible()), lambda user: user.close())
+outer.addCallback('Button', ui.EventType.ACTIVATE, run_inner)
+user.plan(lambda user: user.click('Button'), ready)
+print(outer.launch())
+'''
+
+IN_A_CALLBACK = '''
+dialog = make_dialog('busy')
+def busy(*_):
+    ready(user)
+    while True:
+        pass
+dialog.addCallback('Button', ui.EventType.ACTIVATE, busy)
+user.plan(lambda user: user.click('Button'))
+interrupted(dialog.launch)
+dialog.removeCallback('Button', ui.EventType.ACTIVATE, busy)
+user.plan(lambda user: user.close())
+print(dialog.launch())
+'''
+
+
+def press_ctrl_c_in(script):
+    """Runs the script on a terminal of its own, presses Ctrl-C there once it says that it is ready, and gives how long
+    the interrupt took and what the script printed from then on."""
+    ours, theirs = pty.openpty()
+    environment = dict(os.environ, PYTHONPATH=os.pathsep.join(os.path.abspath(path) for path in sys.path))
+    with subprocess.Popen([sys.executable, '-c', PRELUDE + script + EPILOGUE], env=environment, stdin=theirs,
+                          stdout=subprocess.PIPE, stderr=subprocess.PIPE, text=True, start_new_session=True,
+                          preexec_fn=lambda: fcntl.ioctl(0, termios.TIOCSCTTY, 0)) as process:
+        try:
+            assert process.stdout.readline() == 'ready\n', process.stderr.read()
+            time.sleep(0.2)  # the user looks at the dialog
+            pressed = time.monotonic()
+            os.write(ours, b'\x03')
+            printed, errors = process.communicate(timeout=20)
+        finally:
+            process.kill()
+            os.close(ours)
+            os.close(theirs)
+    assert process.returncode == 0, printed + errors
+    lines = printed.splitlines()
+    assert lines[0].startswith('interrupted'), printed
+    return float(lines[0].split()[1]) - pressed, lines[1:]
+
+
+@pytest.mark.parametrize('script, printed', [
+    (ONE, ['[]', "['second']", 'CloseButton_OK True', '[]']),
+    (NESTED, ["['outer']", 'CloseButton_OK']),
+    (IN_A_CALLBACK, ['CloseButton_OK']),
+], ids=['one dialog', 'the inner one of two', 'a callback that never ends'])
+def test_ctrl_c_ends_the_run_with_a_keyboard_interrupt_and_the_next_dialog_works(script, printed):
+    seconds, lines = press_ctrl_c_in(script)
+    assert lines == printed
+    assert seconds < 2

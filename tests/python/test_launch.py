@@ -1,0 +1,337 @@
+"""Dialogs on the screen: where they stand, how they open and close, and what the keyboard does."""
+
+import gc
+import os
+import tempfile
+import threading
+
+import pytest
+
+from descriptions import close_button, container, text, widget
+from quorvane_velmora import ui
+from scripts import run_script
+from PyQt6.QtCore import QPoint, QRect, Qt
+from PyQt6.QtGui import QFontMetrics, QGuiApplication
+from PyQt6.QtTest import QTest
+from PyQt6.QtWidgets import QApplication, QLabel, QScrollBar, QWidget
+
+FORM = [('TextField', 'Show', 'Show'), ('ToggleButton', 'Win', 'Win'), ('Menu', 'Prize', 'Prize', (['a', 'b'], 0)),
+        ('PushButton', 'Vote'), ('Label', 'Hint', '', 'hint')]
+
+
+def make(*close_buttons, widgets=FORM, width=400, height=196):
+    return ui.createDialog('Launched', ui.makeXmlFromWidgetList(widgets, list(close_buttons)), width, height)
+
+
+def windows_on_screen():
+    return [window for window in QApplication.topLevelWidgets() if window.isVisible()]
+
+
+def launch(user, dialog, look):
+    """What `look` gives while the dialog is open; it is then closed."""
+    seen = []
+    user.plan(lambda user: seen.append(look(user)), lambda user: user.window().close())
+    dialog.launch()
+    return seen[0]
+
+
+@pytest.mark.parametrize('size, content', [
+    ({'width': 400, 'height': 300}, (400, 300)), ({'width': 401, 'height': 301}, (401, 301)), ({}, (640, 640)),
+    ({'width': 400}, (400, 640)), ({'width': -1, 'height': 300}, (640, 300)), ({'width': 0, 'height': 0}, (640, 640)),
+    ({'width': 1, 'height': 1}, (1, 1)),
+])
+def test_a_window_is_centred_by_its_content_and_has_24_pixels_more(user, size, content):
+    dialog = ui.createDialog('t', container('c', close_button('OK')), **size)
+    frame = launch(user, dialog, lambda user: user.window().geometry())
+    screen = QGuiApplication.primaryScreen().size()
+    assert (screen.width(), screen.height()) == (800, 800)
+    width, height = content
+    bottom = (800 - height) // 2
+    assert frame == QRect((800 - width) // 2, 800 - bottom - height - 24, width, height + 24)
+
+
+def test_a_window_larger_than_the_screen_is_cut_to_it(user):
+    size = launch(user, make('OK', width=5000, height=4000), lambda user: user.window().size())
+    assert (size.width(), size.height()) == (800, 800)
+
+
+def test_every_native_widget_bears_the_name_of_its_widget(user):
+    def look(user):
+        assert user.window().windowTitle() == user.window().objectName() == 'Launched'
+        assert user.window().windowModality() == Qt.WindowModality.ApplicationModal
+        names = ['panel', 'MainContainer', 'CloseButtonsContainer', 'CloseButton_OK', 'UserDefinedWidgetsContainer',
+                 'Label_Show', 'Show', 'Win', 'Prize', 'Vote', 'Hint']
+        return [(name, user.find(name).accessibleName(), user.find(name).isVisible()) for name in names]
+
+    assert all(name == told and visible for name, told, visible in launch(user, make('OK'), look))
+
+
+@pytest.mark.parametrize('lines, buttons, width, height', [
+    ([], [], 14, 56), ([], ['OK', 'Cancel'], 28, 56), (['a', '', 'c'], [], 14, 140), ([], ['A', 'B', 'C'], 42, 56),
+])
+def test_a_message_box_is_as_large_as_its_buttons_and_lines(user, lines, buttons, width, height):
+    frames = []
+    user.plan(lambda user: frames.append(user.window().size()), lambda user: user.close((buttons or ['OK'])[-1]))
+    assert ui.showMessageBox('Box', lines, buttons) == buttons[-1]
+    assert [(frame.width(), frame.height()) for frame in frames] == [(7 * width, height + 24)]
+
+
+@pytest.mark.parametrize('line', ['W' * 30, 'i' * 61, 'fj' * 20, 'é𝄞ñ' * 9, '\ttab\tbed\t out',
+                                  'two\nlines of which this one is the longer'])
+def test_the_longest_line_of_a_message_box_is_whole(user, line):
+    def look(user):
+        label = next(label for label in user.window().findChildren(QLabel) if label.text() == line)
+        assert label.sizeHint().width() <= label.width()
+        assert QFontMetrics(label.font()).size(Qt.TextFlag.TextExpandTabs, line).width() <= label.width()
+        assert user.window().width() - label.width() <= 14 + 6 + 7
+        assert label.visibleRegion().boundingRect().width() == label.width()
+        user.close()
+
+    user.plan(look)
+    ui.showMessageBox('Box', ['short', line])
+
+
+@pytest.mark.parametrize('tail', [b'', b'\0<what stands here is not read'])
+def test_a_description_is_read_from_a_file_up_to_its_first_nul(user, tmp_path, tail):
+    path = tmp_path / 'façade.xml'
+    path.write_bytes(ui.makeXmlFromWidgetList([('TextField', 'a')]).encode() + tail)
+    user.plan(lambda user: user.close())
+    assert ui.showDialog('t', str(path), 300, 100, {'a': 'x'}) == {'a': 'x', 'CloseButtonClicked': 'CloseButton_OK'}
+
+
+@pytest.mark.parametrize('make_path, failure, words', [
+    (lambda folder: folder / 'missing', ui.UiError, '^Error opening file: {}$'),
+    (lambda folder: folder / 'empty', RuntimeError, 'Null pointer'),
+    (lambda folder: folder, RuntimeError, 'Null pointer|directory'),
+    (lambda folder: folder / 'broken', RuntimeError, 'line 2'),
+    (lambda folder: '', ui.UiError, '^Error opening file: $'),
+], ids=['missing', 'empty', 'directory', 'broken', 'no name'])
+def test_a_bad_file_is_an_error_and_the_next_one_works(user, tmp_path, make_path, failure, words):
+    (tmp_path / 'empty').write_text('')
+    (tmp_path / 'broken').write_text('<Container>\n<')
+    (tmp_path / 'good').write_text(ui.makeXmlFromWidgetList([]))
+    path = str(make_path(tmp_path))
+    with pytest.raises(failure, match=words.format(path)) as caught:
+        ui.showDialog('t', path)
+    assert caught.type is failure and not windows_on_screen()
+    user.plan(lambda user: user.close())
+    assert ui.showDialog('t', str(tmp_path / 'good')) == {'CloseButtonClicked': 'CloseButton_OK'}
+
+
+def test_a_file_that_must_not_be_read_is_an_error_with_its_name():
+    with tempfile.TemporaryDirectory() as folder:
+        path = os.path.join(folder, 'closed.xml')
+        with open(path, 'w') as file:
+            file.write(ui.makeXmlFromWidgetList([]))
+        os.chmod(folder, 0o755)
+        os.chmod(path, 0)
+        assert run_script('''
+import os, sys
+from quorvane_velmora import ui
+if os.getuid() == 0:
+    os.seteuid(65534)
+assert os.path.exists(sys.argv[1])
+try:
+    ui.showDialog('t', sys.argv[1])
+except ui.UiError as error:
+    print(error)
+os.seteuid(os.getuid())
+''', path) == 'Error opening file: %s\n' % path
+
+
+@pytest.mark.parametrize('buttons, pressed', [(['OK', 'Cancel'], 'CloseButton_Cancel'), (['Done'], 'CloseButton_Done'),
+                                              (['Cancel', 'A', 'B'], 'CloseButton_Cancel')])
+def test_escape_and_the_window_manager_press_cancel_or_the_only_button(user, buttons, pressed):
+    dialog = make(*buttons, widgets=FORM[:1])
+    for how in lambda user: user.press(Qt.Key.Key_Escape), lambda user: user.window().close():
+        user.plan(how)
+        assert dialog.launch() == pressed
+
+
+def test_with_nothing_to_press_escape_does_nothing_and_a_close_request_ends_the_dialog(user):
+    dialog = make('Yes', 'No')
+    user.plan(lambda user: user.press(Qt.Key.Key_Escape), lambda user: user.window().close())
+    assert dialog.launch() == '' and dialog.getValues().get('CloseButtonClicked') is None
+    user.plan(lambda user: user.window().close())
+    with pytest.raises(IndexError):
+        ui.showMessageBox('t', ['?'], ['Yes', 'No'])
+    assert not windows_on_screen()
+
+
+def test_enter_in_a_text_field_closes_nothing_and_keeps_the_keyboard_there(user):
+    user.plan(lambda user: (user.type('text'), user.press(Qt.Key.Key_Return), user.press(Qt.Key.Key_Enter)),
+              lambda user: user.type('!'), lambda user: user.close('Cancel'))
+    values = ui.showSimpleDialog('t', FORM, 400, True)
+    assert values['Show'] == 'text!' and values['CloseButtonClicked'] == 'CloseButton_Cancel'
+
+
+@pytest.mark.parametrize('key', [Qt.Key.Key_Space, Qt.Key.Key_Return])
+def test_a_message_box_opens_with_its_first_button_under_the_keyboard(user, key):
+    user.plan(lambda user: user.press(key))
+    assert ui.showMessageBox('t', ['?'], ['Yes', 'No', 'Cancel']) == 'Yes'
+
+
+def test_tab_goes_as_the_eye_does_and_past_what_takes_no_input(user):
+    def walk(key):
+        def step(user):
+            for _ in range(6):
+                stops.append(user.focus())
+                user.press(key)
+        return step
+
+    stops = []
+    dialog = make('OK', 'Cancel')
+    user.plan(walk(Qt.Key.Key_Tab), walk(Qt.Key.Key_Backtab), lambda user: user.close())
+    dialog.launch()
+    order = ['Show', 'Win', 'Prize', 'Vote', 'CloseButton_OK', 'CloseButton_Cancel']
+    assert stops == order + order[:1] + order[:0:-1]
+    dialog.enableWidget('Show', False)
+    dialog.hideWidget('Prize')
+    stops.clear()
+    user.plan(walk(Qt.Key.Key_Tab), lambda user: user.close())
+    dialog.launch()
+    assert stops == ['Win', 'Vote', 'CloseButton_OK', 'CloseButton_Cancel', 'Win', 'Vote']
+
+
+def test_a_disabled_or_hidden_widget_takes_no_input(user):
+    dialog = make('OK', 'Cancel')
+    for name in 'Show', 'Win', 'CloseButton_OK':
+        dialog.enableWidget(name, False)
+    dialog.hideWidget('Prize')
+
+    def try_all(user):
+        assert not user.find('Prize').isVisible()
+        for name in 'Show', 'Win', 'CloseButton_OK', 'Prize':
+            user.click(name)
+            QTest.keyClicks(user.find(name), 'b ')
+
+    user.plan(try_all, lambda user: user.close('Cancel'))
+    assert dialog.launch() == 'CloseButton_Cancel'
+    assert dialog.getValues() == {'Show': '', 'Win': False, 'Prize': 'a', 'CloseButtonClicked': 'CloseButton_Cancel'}
+
+
+def test_a_dialog_can_be_launched_again_with_what_was_left_in_it(user):
+    dialog = make('OK', 'Cancel')
+    user.plan(lambda user: user.type('kept'), lambda user: user.close())
+    assert dialog.launch() == 'CloseButton_OK' and not windows_on_screen()
+    user.plan(lambda user: texts.append(user.find('Show').text()), lambda user: user.close('Cancel'))
+    texts = []
+    assert dialog.launch() == 'CloseButton_Cancel' and texts == ['kept']
+    assert dialog.getValues()['Show'] == 'kept'
+
+
+def test_only_push_buttons_named_for_it_close_a_dialog(user):
+    toggle = widget('ToggleButton', 'CloseButton_X', '0 u l', '8 u b', '4 u w', '4 u h')
+    named = widget('PushButton', 'CloseButton_', content=text('any label'))
+    other = widget('PushButton', 'closeButton_Y', '0 u l', '4 u b', '9 u w', '4 u h')
+    dialog = ui.createDialog('t', container('c', toggle, container('inner', named, other)))
+    user.plan(lambda user: user.click('CloseButton_X'), lambda user: user.click('closeButton_Y'),
+              lambda user: user.close(''))
+    assert dialog.launch() == 'CloseButton_' and dialog.getValue('CloseButton_X') is True
+
+
+def test_a_dialog_without_close_button_is_built_but_not_shown():
+    dialog = ui.createDialog('t', container('c', widget('ToggleButton', 'CloseButton_X'), widget('PushButton', 'b')))
+    for _ in range(2):
+        with pytest.raises(ui.UiError) as caught:
+            dialog.launch()
+        assert str(caught.value) == 'Cannot close dialog: there must be at least one close button'
+        assert not windows_on_screen() and dialog.getValues() == {'CloseButton_X': False}
+
+
+def test_a_dialog_opened_from_a_timer_has_its_own_window_and_those_beneath_take_no_input(user):
+    outer = make('OK', 'Cancel')
+    answers = []
+
+    def open_box(user):
+        beneath = user.window()
+
+        def try_beneath(user):
+            assert user.window() is not beneath and user.window().windowTitle() == 'Nested' and beneath.isVisible()
+            field, button = (beneath.findChild(QWidget, name) for name in ('Show', 'CloseButton_Cancel'))
+            QTest.keyClicks(field, 'unheard')
+            QTest.mouseClick(button, Qt.MouseButton.LeftButton)
+            beneath.close()
+            assert beneath.isVisible()
+
+        with user.meanwhile(try_beneath, lambda user: user.close('No')):
+            answers.append(ui.showMessageBox('Nested', ['?'], ['Yes', 'No']))
+
+    user.plan(open_box, lambda user: user.find('Show').setFocus(), lambda user: user.type('heard'),
+              lambda user: user.close())
+    assert outer.launch() == 'CloseButton_OK' and answers == ['No']
+    assert outer.getValues()['Show'] == 'heard' and not windows_on_screen()
+
+
+def test_a_resized_window_is_laid_out_again(user):
+    def look(user):
+        names = 'Show', 'Prize', 'CloseButton_OK', 'CloseButton_Cancel'
+        before = {name: user.find(name).geometry() for name in names}
+        user.window().resize(user.window().width() + 70, user.window().height() + 35)
+        QApplication.processEvents()
+        return [(name, user.find(name).geometry().getRect(), old.getRect()) for name, old in before.items()]
+
+    moved = {name: tuple(now - then for now, then in zip(new, old))
+             for name, new, old in launch(user, make('OK', 'Cancel'), look)}
+    assert moved == {'Show': (0, 0, 70, 0), 'Prize': (0, 0, 0, 0), 'CloseButton_OK': (0, 0, 0, 0),
+                     'CloseButton_Cancel': (70, 0, 0, 0)}
+
+
+def test_a_form_taller_than_the_screen_can_be_scrolled_to_its_buttons(user):
+    def reach(user):
+        button = user.find('CloseButton_OK')
+        assert user.window().height() <= 800 and button.visibleRegion().isEmpty()
+        bar = next(bar for bar in user.window().findChildren(QScrollBar) if bar.isVisible())
+        QTest.keyClick(bar, Qt.Key.Key_End)
+        spot = button.mapTo(user.window(), button.rect().center())
+        assert user.window().childAt(spot) is button
+
+    def reach_by_key(user):
+        user.find('row 0').setFocus()
+        user.press(Qt.Key.Key_Backtab)
+        assert user.focus() == 'CloseButton_OK' and not user.find('CloseButton_OK').visibleRegion().isEmpty()
+        user.press(Qt.Key.Key_Space)
+
+    user.plan(reach, reach_by_key)
+    values = ui.showSimpleDialog('t', [('TextField', 'row %d' % row, 'row') for row in range(100)], 300)
+    assert values['CloseButtonClicked'] == 'CloseButton_OK' and len(values) == 101
+
+
+def in_another_thread(action):
+    failures = []
+
+    def run():
+        try:
+            action()
+        except BaseException as failure:
+            failures.append(failure)
+
+    thread = threading.Thread(target=run)
+    thread.start()
+    thread.join()
+    return failures
+
+
+@pytest.mark.parametrize('call', [
+    lambda dialog: dialog.launch(), lambda dialog: dialog.getValues(), lambda dialog: dialog.setValue('Show', 'x'),
+    lambda dialog: dialog.hideWidget('Show'), lambda dialog: make('OK').launch(),
+    lambda dialog: ui.showMessageBox('t', ['x']),
+])
+def test_a_call_from_another_thread_is_an_error_and_does_no_harm(user, call):
+    dialog = make('OK')
+    failures = in_another_thread(lambda: call(dialog))
+    assert [type(failure) for failure in failures] == [RuntimeError] and 'thread' in str(failures[0])
+    assert dialog.getValue('Show') == '' and not windows_on_screen()
+    user.plan(lambda user: user.close())
+    assert dialog.launch() == 'CloseButton_OK'
+
+
+def test_dialogs_can_be_dropped_on_another_thread(user):
+    held = [make('OK'), make('OK')]
+    user.plan(lambda user: user.close())
+    held[1].launch()
+    assert in_another_thread(held.clear) == []
+    user.plan(lambda user: user.close())
+    assert make('OK').launch() == 'CloseButton_OK'
+    gc.collect()  # what failures of other tests still hold
+    assert [window.objectName() for window in QApplication.topLevelWidgets()].count('Launched') == 0

@@ -1,0 +1,260 @@
+"""Showing, hiding, enabling and naming the tooltips of widgets by name, before, in and after a run."""
+
+import pathlib
+
+import pytest
+
+from callback_tools import UNKNOWN, listen, make_dialog, no_wait_is_endless  # noqa: F401
+from quorvane_velmora import ui
+from PyQt6.QtCore import QPoint, QRect, Qt
+from PyQt6.QtGui import QCursor
+from PyQt6.QtTest import QTest
+from PyQt6.QtWidgets import QApplication, QComboBox, QToolTip
+
+ENABLE, DISABLE = ui.EventType.ENABLE, ui.EventType.DISABLE
+
+NAMES = ['Text', 'Toggle', 'Menu', 'Button', 'Note', 'Label_Caption', 'CloseButton_Cancel', 'UserDefinedWidgetsContainer']
+
+
+def close(user):
+    user.close()
+
+
+def go_through_every_operation(dialog, someone=None):
+    """Changes and reads each state of each kind of widget; on the screen too, where a user sees it."""
+    for name in NAMES:
+        for change, displayed in ((dialog.hideWidget, False), (dialog.showWidget, True),
+                                  (lambda widget: dialog.displayWidget(widget, False), False),
+                                  (lambda widget: dialog.displayWidget(widget, True), True)):
+            assert change(name) is None
+            assert dialog.isDisplayed(name) is displayed
+            assert someone is None or someone.find(name).isVisible() is displayed
+        for enabled in (False, True):
+            assert dialog.enableWidget(name, enabled) is None
+            assert dialog.isEnabled(name) is enabled
+            assert someone is None or someone.find(name).isEnabled() is enabled
+
+
+def test_every_operation_acts_at_once_before_in_and_after_a_run(user):
+    dialog = make_dialog()
+    go_through_every_operation(dialog)
+    for _ in range(2):
+        user.plan(lambda someone: go_through_every_operation(dialog, someone), close)
+        dialog.launch()
+        go_through_every_operation(dialog)
+
+
+def test_what_was_hidden_or_disabled_between_runs_is_so_in_the_next(user):
+    dialog = make_dialog()
+    dialog.hideWidget('Text')
+    dialog.enableWidget('Toggle', False)
+    seen = []
+
+    def look(someone):
+        seen.append([(someone.find(name).isVisible(), someone.find(name).isEnabled())
+                     for name in ('Text', 'Toggle', 'Menu')])
+
+    user.plan(look, close)
+    dialog.launch()
+    dialog.showWidget('Text')
+    dialog.enableWidget('Toggle', True)
+    dialog.hideWidget('Menu')
+    user.plan(look, close)
+    dialog.launch()
+    assert seen == [[(False, True), (True, False), (True, True)], [(True, True), (True, True), (False, True)]]
+
+
+OPERATIONS = [('isEnabled',), ('enableWidget', True), ('isDisplayed',), ('showWidget',), ('hideWidget',),
+              ('displayWidget', True), ('setWidgetResourceName', 'resource')]
+
+
+@pytest.mark.parametrize('name', ['Nobody', '', 'text', 'titleBar', 'MainContainer\0', 'panel'])
+@pytest.mark.parametrize('operation', OPERATIONS, ids=lambda operation: operation[0])
+def test_an_unknown_name_is_refused_by_every_operation(operation, name):
+    with pytest.raises(ui.UiError) as refused:
+        getattr(make_dialog(), operation[0])(name, *operation[1:])
+    assert str(refused.value) == UNKNOWN
+
+
+TAKE_AWAY = {
+    'hidden': lambda dialog, name: dialog.hideWidget(name),
+    'disabled': lambda dialog, name: dialog.enableWidget(name, False),
+    'in a hidden container': lambda dialog, name: dialog.hideWidget('UserDefinedWidgetsContainer'),
+    'in a disabled container': lambda dialog, name: dialog.enableWidget('UserDefinedWidgetsContainer', False),
+}
+
+
+@pytest.mark.parametrize('in_run', [False, True], ids=['before', 'in the run'])
+@pytest.mark.parametrize('take_away', TAKE_AWAY.values(), ids=TAKE_AWAY.keys())
+@pytest.mark.parametrize('name', ['Text', 'Toggle', 'Menu', 'Button'])
+def test_a_widget_out_of_reach_keeps_its_value_and_takes_no_input(user, name, take_away, in_run):
+    dialog = make_dialog()
+    values = dialog.getValues()
+    heard = listen(dialog, name)
+
+    def take(_=None):
+        take_away(dialog, name)
+        del heard[:]
+
+    def disturb(someone):
+        """What the window system delivers goes to the window, which finds the widget under it."""
+        window, widget = someone.window(), someone.find(name)
+        place = widget.mapTo(window, widget.rect().center())
+        assert window.rect().contains(place)
+        QTest.keyClick(window.windowHandle(), Qt.Key.Key_X)
+        QTest.mouseClick(window.windowHandle(), Qt.MouseButton.LeftButton, pos=place)
+        for _ in range(8):
+            QTest.keyClick(window.windowHandle(), Qt.Key.Key_Tab)
+            assert QApplication.focusWidget() is not widget
+        assert QApplication.activePopupWidget() is None
+
+    user.plan(take if in_run else lambda _: None, disturb, close)
+    in_run or take()
+    dialog.launch()
+    assert heard == []
+    assert dialog.getValue(name) == values.get(name)
+
+
+def test_a_hidden_or_disabled_widget_still_takes_values_from_the_script(user):
+    dialog = make_dialog()
+    dialog.hideWidget('Text')
+    dialog.enableWidget('Menu', False)
+    dialog.setValues({'Text': 'new', 'Toggle': True})
+    dialog.setValue('Menu', (['c', 'd'], 1))
+    shown = []
+    user.plan(lambda _: dialog.showWidget('Text'),
+              lambda someone: shown.extend([someone.find('Text').text(), someone.find('Menu', QComboBox).currentText()]),
+              close)
+    dialog.launch()
+    assert shown == ['new', 'd']
+    assert dialog.getValues() == {'Text': 'new', 'Toggle': True, 'Menu': 'd', 'CloseButtonClicked': 'CloseButton_OK'}
+
+
+def test_a_hidden_widget_is_shown_where_its_constraint_says(user):
+    dialog, other = make_dialog(), make_dialog()
+    names = ['Text', 'Button', 'CloseButton_Cancel', 'UserDefinedWidgetsContainer']
+    for name in names:
+        dialog.hideWidget(name)
+    places = []
+
+    def resize(someone):
+        someone.window().resize(520, 300)
+
+    def look(someone):
+        window = someone.window()
+        places.append([QRect(someone.find(name).mapTo(window, QPoint(0, 0)), someone.find(name).size())
+                       for name in names])
+
+    user.plan(look, resize, look, close)
+    other.launch()
+    user.plan(lambda _: [dialog.showWidget(name) for name in names], look,
+              lambda _: [dialog.hideWidget(name) for name in names], resize,
+              lambda _: [dialog.showWidget(name) for name in names], look, close)
+    dialog.launch()
+    assert places[:2] == places[2:]
+    assert places[0] != places[1]
+
+
+def test_only_a_real_change_of_the_enabled_state_raises_an_event(user):
+    dialog = make_dialog()
+    heard = listen(dialog, 'Toggle', 'Button')
+
+    def change(_=None):
+        for enabled in (True, False, False, True, True):
+            dialog.enableWidget('Toggle', enabled)
+        for enabled in (False, True):
+            dialog.enableWidget('UserDefinedWidgetsContainer', enabled)
+        dialog.hideWidget('Toggle')
+        dialog.showWidget('Toggle')
+
+    change()
+    user.plan(change, close)
+    dialog.launch()
+    assert heard == [('Toggle', DISABLE), ('Toggle', ENABLE)] * 2
+
+
+def test_one_widget_enables_another(user):
+    dialog = make_dialog()
+    dialog.enableWidget('Text', False)
+    dialog.addCallback('Toggle', ui.EventType.STATE,
+                       lambda given, name, _: given.enableWidget('Text', given.getValue(name)))
+
+    def edit(someone):
+        someone.click('Text')
+        someone.press(Qt.Key.Key_End)
+        someone.type('er')
+
+    user.plan(edit, lambda someone: someone.click('Toggle'), edit, lambda someone: someone.click('Toggle'), edit, close)
+    dialog.launch()
+    assert dialog.getValue('Text') == 'older'
+    assert dialog.isEnabled('Text') is False
+
+
+TOOLTIPS = '<Tooltips><Tooltip Widget="Toggle">Tick &lt;b&gt; &amp; go</Tooltip>' \
+           '<Tooltip Widget="Text">The text</Tooltip></Tooltips>'
+
+
+@pytest.fixture
+def resource(tmp_path, monkeypatch):
+    monkeypatch.chdir(tmp_path)
+    (tmp_path / 'votes.xml').write_text(TOOLTIPS)
+    return tmp_path / 'votes'
+
+
+def hover(name):
+    """Lets the pointer rest on a widget until its tooltip stands on the screen, or long enough for one to come."""
+    def step(user):
+        user.tips = getattr(user, 'tips', [])
+        widget = user.find(name)
+        QCursor.setPos(user.window().mapToGlobal(QPoint(1, 1)))
+        for _ in range(100):
+            QTest.qWait(20)
+            if not QToolTip.isVisible():
+                break
+        QTest.mouseMove(widget, widget.rect().center())
+        for _ in range(100 if widget.toolTip() else 30):
+            QTest.qWait(50)
+            if QToolTip.isVisible():
+                break
+        user.tips.append(QToolTip.text() if QToolTip.isVisible() else None)
+    return step
+
+
+@pytest.mark.parametrize('form', [str, lambda path: str(path) + '.xml', lambda path: path.name,
+                                  lambda path: path.name + '.xml', lambda path: './' + path.name],
+                         ids=['path', 'path with extension', 'name', 'name with extension', 'relative path'])
+def test_a_tooltip_resource_is_found_in_every_form_of_its_name(user, resource, form):
+    dialog = make_dialog()
+    for name in ('Text', 'Button', 'Note'):
+        dialog.setWidgetResourceName(name, form(resource))
+    user.plan(hover('Text'), close)
+    dialog.launch()
+    assert user.tips == ['The text']
+
+
+def test_the_tooltip_of_a_widget_is_seen_on_hover_in_its_own_words(user, resource):
+    dialog = make_dialog()
+    user.plan(lambda _: dialog.setWidgetResourceName('Toggle', str(resource)),
+              lambda _: dialog.setWidgetResourceName('Button', str(resource)),
+              lambda _: dialog.setWidgetResourceName('Toggle', 'unknown'),
+              lambda _: dialog.setWidgetResourceName('Toggle', ''), hover('Toggle'), hover('Button'), close)
+    dialog.launch()
+    assert [tip and tip.replace('&lt;', '<').replace('&gt;', '>').replace('&amp;', '&') for tip in user.tips] \
+        == ['<p>Tick <b> & go</p>', None]
+
+
+@pytest.mark.parametrize('text, words', [
+    ('<Tooltips><Tooltip Widget="Text">', ''), ('<Other/>', '"Tooltips"'), ('', '"Tooltips"'),
+    ('<Tooltips>\n<Tip/></Tooltips>', 'line 2'), ('<Tooltips>\n<Tooltip/></Tooltips>', 'line 2'),
+], ids=['broken off', 'another root', 'empty', 'unknown element', 'no widget'])
+def test_a_damaged_tooltip_resource_is_refused_with_words_and_changes_nothing(user, resource, text, words):
+    dialog = make_dialog()
+    dialog.setWidgetResourceName('Text', str(resource))
+    damaged = pathlib.Path('damaged.xml')
+    damaged.write_text(text)
+    with pytest.raises(RuntimeError) as refused:
+        dialog.setWidgetResourceName('Text', 'damaged')
+    assert 'damaged.xml' in str(refused.value) and words in str(refused.value).replace('Line', 'line')
+    user.plan(lambda someone: setattr(someone, 'tips', [someone.find('Text').toolTip()]), close)
+    dialog.launch()
+    assert user.tips == ['The text']
