@@ -3,16 +3,25 @@
 import ctypes
 import os
 import runpy
+import socket
 import sys
 
 HERE = os.path.dirname(os.path.abspath(__file__))
 AWARDS = os.path.join(HERE, 'awards.py')
 
 
+def answers_wayland():
+    name = os.environ.get('WAYLAND_DISPLAY')
+    if not name:
+        return False
+    with socket.socket(socket.AF_UNIX) as wayland:
+        return not wayland.connect_ex(os.path.join(os.environ.get('XDG_RUNTIME_DIR', ''), name))
+
+
 def has_display():
     if os.environ.get('QT_QPA_PLATFORM'):
         return os.environ['QT_QPA_PLATFORM'].split(':')[0] not in ('offscreen', 'minimal')
-    if os.environ.get('WAYLAND_DISPLAY'):
+    if answers_wayland():
         return True
     xcb = ctypes.CDLL('libxcb.so.1')
     xcb.xcb_connect.restype = ctypes.c_void_p

@@ -18,22 +18,28 @@ RCShdPtr<UiTopLevel> UiAppMgr::getTopLevel() const
 
 void UiAppMgr::setTopLevel(RCShdPtr<UiTopLevel> const& window)
 {
-    auto const isGoneOrSame = [&window](std::weak_ptr<UiTopLevel> const& told)
-    {
-        std::shared_ptr<UiTopLevel> const alive = told.lock();
-        return !alive || alive.get() == window.get();
-    };
-    _told.erase(std::remove_if(_told.begin(), _told.end(), isGoneOrSame), _told.end());
+    forgetHidden();
+    std::weak_ptr<UiTopLevel> const told = window->observe();
+    auto const isSame = [&told](std::weak_ptr<UiTopLevel> const& other)
+    { return !other.owner_before(told) && !told.owner_before(other); };
+    _told.erase(std::remove_if(_told.begin(), _told.end(), isSame), _told.end());
     window->setOwner(_told.empty() ? std::weak_ptr<UiTopLevel>() : _told.back());
-    _told.push_back(window->observe());
+    _told.push_back(told);
 }
 
 void UiAppMgr::releaseTopLevel()
 {
-    auto const isGone = [](std::weak_ptr<UiTopLevel> const& told) { return told.expired(); };
-    _told.erase(std::remove_if(_told.begin(), _told.end(), isGone), _told.end());
-    if (!_told.empty())
-        _told.pop_back();
+    forgetHidden();
+}
+
+void UiAppMgr::forgetHidden()
+{
+    auto const isHidden = [](std::weak_ptr<UiTopLevel> const& told)
+    {
+        std::shared_ptr<UiTopLevel> const window = told.lock();
+        return !window || !window->isShown();
+    };
+    _told.erase(std::remove_if(_told.begin(), _told.end(), isHidden), _told.end());
 }
 
 } // namespace Kv

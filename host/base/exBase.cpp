@@ -1,12 +1,36 @@
 #include "base/exBase.h"
 
+#include <utf8.h>
+
+#include <array>
+#include <cstdio>
 #include <utility>
 
 namespace Kv
 {
 
+namespace
+{
+
+std::string makeReadable(std::string text)
+{
+    auto bad = utf8::find_invalid(text.begin(), text.end());
+    while (bad != text.end())
+    {
+        std::array<char, 5> escape{};
+        static_cast<void>(std::snprintf(escape.data(), escape.size(), "\\x%02x", static_cast<unsigned char>(*bad)));
+        auto const offset = bad - text.begin();
+        text.replace(bad, bad + 1, escape.data());
+        bad = utf8::find_invalid(text.begin() + offset, text.end());
+    }
+    return text;
+}
+
+} // namespace
+
 ExBase::ExBase(char const* sourcePath, int line, std::string reason)
-    : _reason(std::move(reason)), _detailedReason(_reason + " (" + sourcePath + ":" + std::to_string(line) + ")")
+    : _reason(makeReadable(std::move(reason))),
+      _detailedReason(_reason + " (" + sourcePath + ":" + std::to_string(line) + ")")
 {
 }
 

@@ -163,12 +163,13 @@ DisplayChoice DisplayProbe::chooseAsked(QString const& asked)
 
 DisplayChoice DisplayProbe::chooseAnswering()
 {
-    std::string refusal;
-    if (!environment("WAYLAND_DISPLAY").isEmpty() && isUsable(QStringLiteral("wayland"), refusal))
+    std::string noWayland;
+    if (!environment("WAYLAND_DISPLAY").isEmpty() && isUsable(QStringLiteral("wayland"), noWayland))
         return {QStringLiteral("wayland"), {}};
-    if (isUsable(QStringLiteral("xcb"), refusal))
+    std::string noX11;
+    if (isUsable(QStringLiteral("xcb"), noX11))
         return {QStringLiteral("xcb"), {}};
-    return {{}, "there is no display: " + refusal + remedy};
+    return {{}, "there is no display: " + (noWayland.empty() ? "" : noWayland + "; ") + noX11 + remedy};
 }
 
 bool DisplayProbe::isUsable(QString const& platform, std::string& refusal)

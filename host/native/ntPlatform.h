@@ -68,12 +68,13 @@ public:
 
     virtual void setCursor(NtCursor cursor) = 0;
 
-    /// Makes a window, not yet shown. `frame` is where its content goes on the screen, in pixels, y growing upward; it
-    /// is moved and made smaller as far as the screen asks for it. `owner`, which can be null, is the window that it
-    /// stays above. Throws an `ExBase` that says why and what to set where windows cannot be shown.
+    /// Makes a window, not yet shown, and its content peer of the name `contentName`. `frame` is where its content goes
+    /// on the screen, in pixels, y growing upward; it is moved and made smaller as far as the screen asks for it.
+    /// `owner`, which can be null, is the window that it stays above. Throws an `ExBase` that says why and what to set
+    /// where windows cannot be shown.
     virtual std::unique_ptr<NtWindow> createWindow(std::string const& name, std::string const& title,
-                                                   GeRectangle<int> const& frame, NtWindow* owner,
-                                                   NtWindowListener& listener) = 0;
+                                                   std::string const& contentName, GeRectangle<int> const& frame,
+                                                   NtWindow* owner, NtWindowListener& listener) = 0;
 
     /// Peers are made displayed and enabled, without a cell. Listeners are borrowed and outlive the peer.
     virtual std::unique_ptr<NtContainer> createContainer(NtContainer& parent, std::string const& name) = 0;

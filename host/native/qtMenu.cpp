@@ -23,7 +23,7 @@ constexpr int maxShown = 20;
 class ComboBox final : public QComboBox
 {
 public:
-    ComboBox(QWidget* parent, QtEar<NtMenuListener> const& ear) : QComboBox(parent), _ear(ear)
+    ComboBox(QWidget* parent, QtListenerHandle<NtMenuListener> const& handle) : QComboBox(parent), _handle(handle)
     {
         // The wheel alone must not take the keyboard.
         setFocusPolicy(Qt::StrongFocus);
@@ -92,28 +92,28 @@ private:
     void tellPicked(int index) const
     {
         if (isVisible())
-            _ear.tell(&NtMenuListener::onPicked, index);
+            _handle.tell(&NtMenuListener::onPicked, index);
     }
 
-    QtEar<NtMenuListener> _ear;
+    QtListenerHandle<NtMenuListener> _handle;
     NtAlign _align = NtAlign::Left;
 };
 
 } // namespace
 
 QtMenu::QtMenu(QWidget* parent, std::string const& name, NtMenuListener& listener)
-    : QtMenu(parent, name, QtEar<NtMenuListener>(listener))
+    : QtMenu(parent, name, QtListenerHandle<NtMenuListener>(listener))
 {
 }
 
-QtMenu::QtMenu(QWidget* parent, std::string const& name, QtEar<NtMenuListener> const& ear)
-    : QtPeer(makeNative<ComboBox>(parent, ear), name, QtNative::rowInset), _ear(ear)
+QtMenu::QtMenu(QWidget* parent, std::string const& name, QtListenerHandle<NtMenuListener> const& handle)
+    : QtPeer(makeNative<ComboBox>(parent, handle), name, QtNative::rowInset), _handle(handle)
 {
 }
 
 QtMenu::~QtMenu()
 {
-    _ear.close();
+    _handle.close();
 }
 
 void QtMenu::removeAll()

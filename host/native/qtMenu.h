@@ -1,7 +1,7 @@
 #pragma once
 
 #include "native/ntPeers.h"
-#include "native/qtEar.h"
+#include "native/qtListenerHandle.h"
 #include "native/qtPeer.h"
 
 #include <QComboBox>
@@ -23,9 +23,9 @@ public:
     void setAlign(NtAlign align) override;
 
 private:
-    QtMenu(QWidget* parent, std::string const& name, QtEar<NtMenuListener> const& ear);
+    QtMenu(QWidget* parent, std::string const& name, QtListenerHandle<NtMenuListener> const& handle);
 
-    QtEar<NtMenuListener> _ear;
+    QtListenerHandle<NtMenuListener> _handle;
 };
 
 } // namespace Kv

@@ -111,11 +111,12 @@ void QtPlatform::setCursor(NtCursor cursor)
 }
 
 std::unique_ptr<NtWindow> QtPlatform::createWindow(std::string const& name, std::string const& title,
-                                                   GeRectangle<int> const& frame, NtWindow* owner,
-                                                   NtWindowListener& listener)
+                                                   std::string const& contentName, GeRectangle<int> const& frame,
+                                                   NtWindow* owner, NtWindowListener& listener)
 {
     _application.requireWindows();
-    return std::make_unique<QtWindow>(name, title, fitToScreen(frame), dynamic_cast<QtWindow*>(owner), listener);
+    return std::make_unique<QtWindow>(name, title, contentName, fitToScreen(frame), dynamic_cast<QtWindow*>(owner),
+                                      listener);
 }
 
 std::unique_ptr<NtContainer> QtPlatform::createContainer(NtContainer& parent, std::string const& name)

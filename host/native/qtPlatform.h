@@ -21,8 +21,8 @@ public:
     void setCursor(NtCursor cursor) override;
 
     std::unique_ptr<NtWindow> createWindow(std::string const& name, std::string const& title,
-                                           GeRectangle<int> const& frame, NtWindow* owner,
-                                           NtWindowListener& listener) override;
+                                           std::string const& contentName, GeRectangle<int> const& frame,
+                                           NtWindow* owner, NtWindowListener& listener) override;
     std::unique_ptr<NtContainer> createContainer(NtContainer& parent, std::string const& name) override;
     std::unique_ptr<NtLabel> createLabel(NtContainer& parent, std::string const& name) override;
     std::unique_ptr<NtTextField> createTextField(NtContainer& parent, std::string const& name,

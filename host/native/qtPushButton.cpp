@@ -13,7 +13,8 @@ namespace
 class PushButton final : public QPushButton
 {
 public:
-    PushButton(QWidget* parent, QtEar<NtPushButtonListener> const& ear) : QPushButton(parent), _ear(ear)
+    PushButton(QWidget* parent, QtListenerHandle<NtPushButtonListener> const& handle)
+        : QPushButton(parent), _handle(handle)
     {
         setFocusPolicy(Qt::StrongFocus);
         setAutoDefault(true);
@@ -34,27 +35,28 @@ private:
     void tellPressed() const
     {
         if (isVisible())
-            _ear.tell(&NtPushButtonListener::onPressed);
+            _handle.tell(&NtPushButtonListener::onPressed);
     }
 
-    QtEar<NtPushButtonListener> _ear;
+    QtListenerHandle<NtPushButtonListener> _handle;
 };
 
 } // namespace
 
 QtPushButton::QtPushButton(QWidget* parent, std::string const& name, NtPushButtonListener& listener)
-    : QtPushButton(parent, name, QtEar<NtPushButtonListener>(listener))
+    : QtPushButton(parent, name, QtListenerHandle<NtPushButtonListener>(listener))
 {
 }
 
-QtPushButton::QtPushButton(QWidget* parent, std::string const& name, QtEar<NtPushButtonListener> const& ear)
-    : QtPeer(makeNative<PushButton>(parent, ear), name, QtNative::rowInset), _ear(ear)
+QtPushButton::QtPushButton(QWidget* parent, std::string const& name,
+                           QtListenerHandle<NtPushButtonListener> const& handle)
+    : QtPeer(makeNative<PushButton>(parent, handle), name, QtNative::rowInset), _handle(handle)
 {
 }
 
 QtPushButton::~QtPushButton()
 {
-    _ear.close();
+    _handle.close();
 }
 
 void QtPushButton::setText(std::string const& text)

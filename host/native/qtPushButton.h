@@ -1,7 +1,7 @@
 #pragma once
 
 #include "native/ntPeers.h"
-#include "native/qtEar.h"
+#include "native/qtListenerHandle.h"
 #include "native/qtPeer.h"
 
 #include <QPushButton>
@@ -20,9 +20,9 @@ public:
     void setText(std::string const& text) override;
 
 private:
-    QtPushButton(QWidget* parent, std::string const& name, QtEar<NtPushButtonListener> const& ear);
+    QtPushButton(QWidget* parent, std::string const& name, QtListenerHandle<NtPushButtonListener> const& handle);
 
-    QtEar<NtPushButtonListener> _ear;
+    QtListenerHandle<NtPushButtonListener> _handle;
 };
 
 } // namespace Kv

@@ -17,7 +17,7 @@ namespace
 class LineEdit final : public QLineEdit
 {
 public:
-    LineEdit(QWidget* parent, QtEar<NtTextFieldListener> const& ear) : QLineEdit(parent), _ear(ear)
+    LineEdit(QWidget* parent, QtListenerHandle<NtTextFieldListener> const& handle) : QLineEdit(parent), _handle(handle)
     {
         setMaxLength(std::numeric_limits<int>::max());
         connect(this, &QLineEdit::textEdited, this, [this] { tellEdited(); });
@@ -44,39 +44,39 @@ private:
     void tellEdited() const
     {
         if (isVisible())
-            _ear.tell(&NtTextFieldListener::onTextEdited, text().toStdString());
+            _handle.tell(&NtTextFieldListener::onTextEdited, text().toStdString());
     }
 
     void tellEnded() const
     {
         if (isVisible())
-            _ear.tell(&NtTextFieldListener::onEditEnded);
+            _handle.tell(&NtTextFieldListener::onEditEnded);
     }
 
     void tellClicked() const
     {
         if (isVisible())
-            _ear.tell(&NtTextFieldListener::onClicked);
+            _handle.tell(&NtTextFieldListener::onClicked);
     }
 
-    QtEar<NtTextFieldListener> _ear;
+    QtListenerHandle<NtTextFieldListener> _handle;
 };
 
 } // namespace
 
 QtTextField::QtTextField(QWidget* parent, std::string const& name, NtTextFieldListener& listener)
-    : QtTextField(parent, name, QtEar<NtTextFieldListener>(listener))
+    : QtTextField(parent, name, QtListenerHandle<NtTextFieldListener>(listener))
 {
 }
 
-QtTextField::QtTextField(QWidget* parent, std::string const& name, QtEar<NtTextFieldListener> const& ear)
-    : QtPeer(makeNative<LineEdit>(parent, ear), name, QtNative::rowInset), _ear(ear)
+QtTextField::QtTextField(QWidget* parent, std::string const& name, QtListenerHandle<NtTextFieldListener> const& handle)
+    : QtPeer(makeNative<LineEdit>(parent, handle), name, QtNative::rowInset), _handle(handle)
 {
 }
 
 QtTextField::~QtTextField()
 {
-    _ear.close();
+    _handle.close();
 }
 
 void QtTextField::setText(std::string const& text, bool cursorAtEnd)

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "native/ntPeers.h"
-#include "native/qtEar.h"
+#include "native/qtListenerHandle.h"
 #include "native/qtPeer.h"
 
 #include <QLineEdit>
@@ -21,9 +21,9 @@ public:
     void setAlign(NtAlign align) override;
 
 private:
-    QtTextField(QWidget* parent, std::string const& name, QtEar<NtTextFieldListener> const& ear);
+    QtTextField(QWidget* parent, std::string const& name, QtListenerHandle<NtTextFieldListener> const& handle);
 
-    QtEar<NtTextFieldListener> _ear;
+    QtListenerHandle<NtTextFieldListener> _handle;
 };
 
 } // namespace Kv

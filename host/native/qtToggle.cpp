@@ -9,7 +9,7 @@ namespace
 class CheckBox final : public QCheckBox
 {
 public:
-    CheckBox(QWidget* parent, QtEar<NtToggleListener> const& ear) : QCheckBox(parent), _ear(ear)
+    CheckBox(QWidget* parent, QtListenerHandle<NtToggleListener> const& handle) : QCheckBox(parent), _handle(handle)
     {
         setFocusPolicy(Qt::StrongFocus);
         connect(this, &QCheckBox::clicked, this, [this](bool state) { tellToggled(state); });
@@ -22,27 +22,27 @@ private:
     void tellToggled(bool state) const
     {
         if (isVisible())
-            _ear.tell(&NtToggleListener::onToggled, state);
+            _handle.tell(&NtToggleListener::onToggled, state);
     }
 
-    QtEar<NtToggleListener> _ear;
+    QtListenerHandle<NtToggleListener> _handle;
 };
 
 } // namespace
 
 QtToggle::QtToggle(QWidget* parent, std::string const& name, NtToggleListener& listener)
-    : QtToggle(parent, name, QtEar<NtToggleListener>(listener))
+    : QtToggle(parent, name, QtListenerHandle<NtToggleListener>(listener))
 {
 }
 
-QtToggle::QtToggle(QWidget* parent, std::string const& name, QtEar<NtToggleListener> const& ear)
-    : QtPeer(makeNative<CheckBox>(parent, ear), name, 0), _ear(ear)
+QtToggle::QtToggle(QWidget* parent, std::string const& name, QtListenerHandle<NtToggleListener> const& handle)
+    : QtPeer(makeNative<CheckBox>(parent, handle), name, 0), _handle(handle)
 {
 }
 
 QtToggle::~QtToggle()
 {
-    _ear.close();
+    _handle.close();
 }
 
 void QtToggle::setState(bool state)

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "native/ntPeers.h"
-#include "native/qtEar.h"
+#include "native/qtListenerHandle.h"
 #include "native/qtPeer.h"
 
 #include <QCheckBox>
@@ -20,9 +20,9 @@ public:
     void setState(bool state) override;
 
 private:
-    QtToggle(QWidget* parent, std::string const& name, QtEar<NtToggleListener> const& ear);
+    QtToggle(QWidget* parent, std::string const& name, QtListenerHandle<NtToggleListener> const& handle);
 
-    QtEar<NtToggleListener> _ear;
+    QtListenerHandle<NtToggleListener> _handle;
 };
 
 } // namespace Kv

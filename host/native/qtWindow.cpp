@@ -33,10 +33,10 @@ void goWithApplication()
 
 } // namespace
 
-QtWindow::QtWindow(std::string const& name, std::string const& title, QRect const& frame, QtWindow const* owner,
-                   NtWindowListener& listener)
-    : _ear(listener), _native(new WindowWidget(_ear), name, 0), _owner(owner ? owner->_native.get() : nullptr),
-      _content(std::make_unique<QtContainer>(getNative(), std::string()))
+QtWindow::QtWindow(std::string const& name, std::string const& title, std::string const& contentName,
+                   QRect const& frame, QtWindow const* owner, NtWindowListener& listener)
+    : _handle(listener), _native(new WindowWidget(_handle), name, 0), _owner(owner ? owner->_native.get() : nullptr),
+      _content(std::make_unique<QtContainer>(getNative(), contentName))
 {
     goWithApplication();
     WindowWidget* const native = getNative();
@@ -47,7 +47,7 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, QRect cons
 
 QtWindow::~QtWindow()
 {
-    _ear.close();
+    _handle.close();
     // Hidden first, as by its owner: another window gets the keyboard. Another thread leaves that to the toolkit.
     if (QWidget const* const native = _native.get(); native && native->thread() == QThread::currentThread())
         hide();

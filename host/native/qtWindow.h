@@ -2,7 +2,7 @@
 
 #include "native/ntPeers.h"
 #include "native/qtContainer.h"
-#include "native/qtEar.h"
+#include "native/qtListenerHandle.h"
 #include "native/qtNative.h"
 
 #include <QRect>
@@ -22,8 +22,8 @@ class QtWindow final : public NtWindow
 public:
     /// `frame` is where the content goes, in device-independent pixels, y growing downward. `owner` can be null. The
     /// listener is borrowed.
-    QtWindow(std::string const& name, std::string const& title, QRect const& frame, QtWindow const* owner,
-             NtWindowListener& listener);
+    QtWindow(std::string const& name, std::string const& title, std::string const& contentName, QRect const& frame,
+             QtWindow const* owner, NtWindowListener& listener);
     ~QtWindow() override;
 
     NtContainer& getContent() override { return *_content; }
@@ -36,7 +36,7 @@ public:
 private:
     WindowWidget* getNative() const;
 
-    QtEar<NtWindowListener> _ear;
+    QtListenerHandle<NtWindowListener> _handle;
     QtNative _native;
     QPointer<QWidget> _owner;
     std::unique_ptr<QtContainer> _content;

@@ -50,8 +50,8 @@ private:
 
 } // namespace
 
-WindowWidget::WindowWidget(QtEar<NtWindowListener> const& ear)
-    : QWidget(nullptr, Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint), _ear(ear),
+WindowWidget::WindowWidget(QtListenerHandle<NtWindowListener> const& handle)
+    : QWidget(nullptr, Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint), _handle(handle),
       _area(new ContentArea(this, [this] { tellRoom(); }))
 {
     setAttribute(Qt::WA_QuitOnClose, false);
@@ -126,7 +126,7 @@ void WindowWidget::resizeEvent(QResizeEvent* event)
 void WindowWidget::closeEvent(QCloseEvent* event)
 {
     event->ignore();
-    _ear.tell(&NtWindowListener::onCloseRequested);
+    _handle.tell(&NtWindowListener::onCloseRequested);
 }
 
 void WindowWidget::keyPressEvent(QKeyEvent* event)
@@ -138,7 +138,7 @@ void WindowWidget::keyPressEvent(QKeyEvent* event)
     }
     event->accept();
     if (!event->isAutoRepeat())
-        _ear.tell(&NtWindowListener::onEscape);
+        _handle.tell(&NtWindowListener::onEscape);
 }
 
 bool WindowWidget::focusNextPrevChild(bool next)
@@ -161,7 +161,7 @@ void WindowWidget::tellRoom()
     for (int round = 0; round < maxRounds && _told != _area->viewport()->size(); ++round)
     {
         _told = _area->viewport()->size();
-        _ear.tell(&NtWindowListener::onResized, _told.width(), _told.height());
+        _handle.tell(&NtWindowListener::onResized, _told.width(), _told.height());
         if (!alive)
             return;
     }

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "native/ntPeers.h"
-#include "native/qtEar.h"
 #include "native/qtInputDrop.h"
+#include "native/qtListenerHandle.h"
 
 #include <QPointer>
 #include <QScrollArea>
@@ -19,7 +19,7 @@ namespace Kv
 class WindowWidget final : public QWidget
 {
 public:
-    explicit WindowWidget(QtEar<NtWindowListener> const& ear);
+    explicit WindowWidget(QtListenerHandle<NtWindowListener> const& handle);
 
     /// All that there are now, shown or not.
     static std::vector<QPointer<WindowWidget>> findAll();
@@ -47,7 +47,7 @@ private:
     void blockOthers();
     void letOthersIn();
 
-    QtEar<NtWindowListener> _ear;
+    QtListenerHandle<NtWindowListener> _handle;
     QScrollArea* _area;
 
     /// The room as it was told last; none is told to a hidden window.

@@ -47,6 +47,14 @@ bool PiWidget::removeCallback(EventType type, CbHandler<EvEvent>* handler)
     return true;
 }
 
+void PiWidget::clear()
+{
+    if (_dispatchDepth == 0)
+        _entries.clear();
+    for (Entry& entry : _entries)
+        entry.handler = nullptr;
+}
+
 void PiWidget::fire(EventType type)
 {
     Dispatch const dispatch(this);

@@ -30,6 +30,9 @@ public:
     /// Takes out the first entry of that type and handler. False if there is none.
     bool removeCallback(EventType type, CbHandler<EvEvent>* handler);
 
+    /// Forgets all handlers. A dispatch under way runs none of them any more.
+    void clear();
+
     /// Runs the handlers of that type, in order of registration. Handlers may add and remove handlers: one that is
     /// added waits for the next event, one that is removed does not run any more. What a handler throws passes through.
     void fire(EventType type);

@@ -141,6 +141,13 @@ void UiContainer::dropPeer()
     UiWidget::dropPeer();
 }
 
+void UiContainer::forgetHandlers()
+{
+    UiWidget::forgetHandlers();
+    for (RCShdPtr<UiWidget> const& child : _children)
+        child->forgetHandlers();
+}
+
 void UiContainer::layOutChildren()
 {
     UiLayout layout(*this);

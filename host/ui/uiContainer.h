@@ -64,6 +64,7 @@ private:
     /// Makes the peers of the widgets in it inside `native`, which is borrowed.
     void attachNative(NtPlatform& platform, NtContainer& native);
     void dropPeer() override;
+    void forgetHandlers() override;
 
     /// Places the widgets in it by their constraints, all the way down.
     void layOutChildren();

@@ -37,6 +37,11 @@ RttiType const& UiDualState::getRttiType() const
     return getClassType();
 }
 
+bool UiDualState::getState() const
+{
+    return _state;
+}
+
 void UiDualState::setState(bool state, bool notify)
 {
     requireUiThread();

@@ -12,6 +12,7 @@ class UiWidgetElement;
 class KVUI_API UiDualState : public UiWidget, private NtToggleListener
 {
 public:
+    /// A toggle at the end of `parent`. There are no resource tables for the built-in kinds: pass null.
     static RCShdPtr<UiDualState> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
 
     /// The `ToggleButton` of a description.
@@ -20,7 +21,7 @@ public:
     static RttiType const& getClassType();
     RttiType const& getRttiType() const override;
 
-    bool getState() const { return _state; }
+    bool getState() const;
 
     /// With `notify` the handlers of `State` run, also when the state stays the same.
     void setState(bool state, bool notify);

@@ -9,14 +9,12 @@
 namespace Kv
 {
 
-UiLabel::UiLabel(std::string name)
-    : UiWidget(std::move(name)), _label(
-                                     [this]
-                                     {
-                                         if (_native)
-                                             _native->setText(_label.getString());
-                                     })
+UiLabel::UiLabel(std::string name) : UiWidget(std::move(name)), _label([this] { showLabel(); }) {}
+
+void UiLabel::showLabel()
 {
+    if (_native)
+        _native->setText(_label.getString());
 }
 
 RCShdPtr<UiLabel> UiLabel::create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*)

@@ -13,6 +13,7 @@ class UiWidgetElement;
 class KVUI_API UiLabel : public UiWidget
 {
 public:
+    /// A label at the end of `parent`. There are no resource tables for the built-in kinds: pass null.
     static RCShdPtr<UiLabel> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
 
     /// The `Label` of a description.
@@ -24,6 +25,7 @@ public:
     /// The text on its face.
     UiString& getLabel() { return _label; }
 
+    /// How the text sits in the widget from left to right.
     void setAlign(NtAlign align);
 
 protected:
@@ -33,6 +35,7 @@ protected:
 
 private:
     void dropPeer() override;
+    void showLabel();
 
     UiString _label;
     NtAlign _align = NtAlign::Left;

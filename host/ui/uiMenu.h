@@ -15,6 +15,7 @@ class UiWidgetElement;
 class KVUI_API UiMenu : public UiWidget, private NtMenuListener
 {
 public:
+    /// A menu at the end of `parent`. There are no resource tables for the built-in kinds: pass null.
     static RCShdPtr<UiMenu> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
 
     /// The `Menu` of a description.
@@ -36,6 +37,7 @@ public:
     /// the handlers of `ValueChanged` run, also when the selection stays the same.
     void setSelection(int index, bool notify);
 
+    /// How the text sits in the widget from left to right.
     void setAlign(NtAlign align);
 
 protected:

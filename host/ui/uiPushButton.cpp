@@ -9,14 +9,12 @@
 namespace Kv
 {
 
-UiPushButton::UiPushButton(std::string name)
-    : UiWidget(std::move(name)), _label(
-                                     [this]
-                                     {
-                                         if (_native)
-                                             _native->setText(_label.getString());
-                                     })
+UiPushButton::UiPushButton(std::string name) : UiWidget(std::move(name)), _label([this] { showLabel(); }) {}
+
+void UiPushButton::showLabel()
 {
+    if (_native)
+        _native->setText(_label.getString());
 }
 
 RCShdPtr<UiPushButton> UiPushButton::create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*)

@@ -13,6 +13,7 @@ class UiWidgetElement;
 class KVUI_API UiPushButton : public UiWidget, private NtPushButtonListener
 {
 public:
+    /// A push button at the end of `parent`. There are no resource tables for the built-in kinds: pass null.
     static RCShdPtr<UiPushButton> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
 
     /// The `PushButton` of a description.
@@ -34,6 +35,7 @@ protected:
 
 private:
     void dropPeer() override;
+    void showLabel();
     void onPressed() override { press(); }
 
     UiString _label;

@@ -5,7 +5,7 @@
 
 #include <dlfcn.h>
 #include <fstream>
-#include <sstream>
+#include <iterator>
 #include <vector>
 
 namespace Kv
@@ -60,16 +60,20 @@ std::optional<fs::path> findFile(std::string const& resourceName)
 
 std::unordered_map<std::string, std::string> readTooltips(fs::path const& file)
 {
-    std::ostringstream text;
-    text << std::ifstream(file, std::ios::binary).rdbuf();
-    RCShdPtr<XmlElement> const root = XmlDocument(text.str()).getRoot();
+    std::ifstream stream(file, std::ios::binary);
+    std::string const text{std::istreambuf_iterator<char>(stream), {}};
+    if (!stream)
+        throw XmlError(__FILE__, __LINE__, 0, "the file cannot be read");
+    RCShdPtr<XmlElement> const root = XmlDocument(text).getRoot();
     if (!root || root->getName() != "Tooltips")
         throw XmlError(__FILE__, __LINE__, root ? root->getLine() : 1, "the root element is not \"Tooltips\"");
     std::unordered_map<std::string, std::string> tooltips;
     for (XmlElement const& element : root->getChildren())
     {
-        if (element.getName() != "Tooltip")
-            throw XmlError(__FILE__, __LINE__, element.getLine(), "unknown element \"" + element.getName() + "\"");
+        if (element.getName() != "Tooltip" || !element.getChildren().empty() ||
+            element.getAttributeNames() != std::vector<std::string>{"Widget"})
+            throw XmlError(__FILE__, __LINE__, element.getLine(),
+                           "\"" + element.getName() + "\" is no \"Tooltip\" with a \"Widget\" and a text");
         tooltips.emplace(element.getAttribute("Widget"), element.getText());
     }
     return tooltips;

@@ -38,6 +38,11 @@ RttiType const& UiTextField::getRttiType() const
     return getClassType();
 }
 
+char const* UiTextField::getString() const
+{
+    return _text ? _text->c_str() : nullptr;
+}
+
 void UiTextField::setString(char const* text, CursorPosition position, bool append, bool notify)
 {
     requireUiThread();
@@ -78,7 +83,7 @@ void UiTextField::onTextEdited(std::string const& text)
 void UiTextField::onEditEnded()
 {
     RCShdPtr<UiTextField> const self(this);
-    if (!takesInput() || _text == _textBeforeEdit)
+    if (!takesInput() || _text.value_or("") == _textBeforeEdit.value_or(""))
         return;
     _textBeforeEdit = _text;
     fire(PiWidget::ValueChanged);

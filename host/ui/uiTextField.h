@@ -20,6 +20,7 @@ public:
         End = 1,
     };
 
+    /// A text field at the end of `parent`. There are no resource tables for the built-in kinds: pass null.
     static RCShdPtr<UiTextField> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
 
     /// The `TextField` of a description.
@@ -29,13 +30,14 @@ public:
     RttiType const& getRttiType() const override;
 
     /// UTF-8, valid until the text changes; null where a null text was the last that was set.
-    char const* getString() const { return _text ? _text->c_str() : nullptr; }
+    char const* getString() const;
 
     /// Replaces the text. A null one leaves the field without a string: empty on the screen and null when read.
     /// With `append` the text goes behind the one that is there. With `notify` the handlers of `ValueChanged` run,
     /// also when the text stays the same. Throws an `ExBase` for a text that is no UTF-8.
     void setString(char const* text, CursorPosition position, bool append, bool notify);
 
+    /// How the text sits in the widget from left to right.
     void setAlign(NtAlign align);
 
 protected:

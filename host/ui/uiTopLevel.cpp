@@ -23,6 +23,13 @@ public:
     RootContainer() : UiContainer("root") {}
 };
 
+/// True if neither the widget nor what holds it is hidden.
+bool isDisplayedThroughout(UiWidget const& widget)
+{
+    RCShdPtr<UiContainer> const parent = widget.getParent();
+    return widget.isDisplayed() && (!parent || isDisplayedThroughout(*parent));
+}
+
 /// By how much the widgets of a container stand out of it, at any depth, in pixels.
 GeVector2<int> measureOverflow(UiContainer const& container)
 {
@@ -59,6 +66,8 @@ UiTopLevel::UiTopLevel(char const* name, char const* title, RCShdPtr<WsWindowSty
 
 UiTopLevel::~UiTopLevel()
 {
+    // Nobody finds the window any more, whatever its end brings about.
+    _self.reset();
     dropNative();
     _root->_window = nullptr;
 }
@@ -113,7 +122,8 @@ void UiTopLevel::makeNative()
     NtPlatform& platform = WsNative::getPlatform();
     std::shared_ptr<UiTopLevel> const owner = _owner.lock();
     NtWindow* const nativeOwner = owner && owner->_osWindow ? &owner->_osWindow->getNative() : nullptr;
-    _osWindow = makeShd<WsWindow>(platform.createWindow(getName(), _title, _style->getFrame(), nativeOwner, *this));
+    _osWindow = makeShd<WsWindow>(
+        platform.createWindow(getName(), _title, _root->getName(), _style->getFrame(), nativeOwner, *this));
     try
     {
         _root->attachNative(platform, _osWindow->getNative().getContent());
@@ -159,7 +169,9 @@ void UiTopLevel::onCloseRequested()
 
 RCShdPtr<UiPushButton> UiTopLevel::findEscapeButton() const
 {
-    Iterator<RCShdPtr<UiWidget>> buttons = _root->findWidgets(UiWidgetPredicate::isType(UiPushButton::getClassType()));
+    PrdPredicate<UiWidget> const isReachable(&isDisplayedThroughout);
+    Iterator<RCShdPtr<UiWidget>> buttons =
+        _root->findWidgets(UiWidgetPredicate::isType(UiPushButton::getClassType()) && isReachable);
     RCShdPtr<UiPushButton> button;
     for (buttons.first(); !buttons.atEnd(); buttons.next())
     {

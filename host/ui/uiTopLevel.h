@@ -13,8 +13,9 @@ namespace Kv
 class UiPushButton;
 
 /// A window of its own on the screen, with the tree of widgets in it. A window manager that asks it to close, and
-/// Escape, press its push button labelled "Cancel", else its only push button. Where there is neither, a request to
-/// close ends the innermost message loop.
+/// Escape, press its push button labelled "Cancel", else its only push button; one that is disabled does nothing then,
+/// and one that is not displayed does not count. Where there is none, a request to close ends the innermost message
+/// loop.
 class KVUI_API UiTopLevel : public UiWidget, public UiWindow, private NtWindowListener
 {
 public:

@@ -29,6 +29,11 @@ RttiType const& UiWidget::getRttiType() const
     return getClassType();
 }
 
+std::string const& UiWidget::getName() const
+{
+    return _name;
+}
+
 RCShdPtr<UiContainer> UiWidget::getParent() const
 {
     return _parent;
@@ -52,6 +57,11 @@ void UiWidget::setRect(GeRectangle<int> const& rect, bool)
     placePeer();
 }
 
+bool UiWidget::isDisplayed() const
+{
+    return _displayed;
+}
+
 void UiWidget::display(bool displayed)
 {
     requireUiThread();
@@ -60,12 +70,22 @@ void UiWidget::display(bool displayed)
         _peer->setDisplayed(displayed);
 }
 
+void UiWidget::show()
+{
+    display(true);
+}
+
 void UiWidget::hide()
 {
     if (WsThread::isCurrent())
         display(false);
     else
         _displayed = false;
+}
+
+bool UiWidget::isEnabled() const
+{
+    return _enabled;
 }
 
 void UiWidget::setEnabled(bool enabled)
@@ -84,6 +104,7 @@ void UiWidget::clearParent()
     if (UiContainer* const parent = std::exchange(_parent, nullptr))
     {
         dropPeer();
+        forgetHandlers();
         parent->removeChild(this);
     }
 }
@@ -117,6 +138,12 @@ void UiWidget::fire(PiWidget::EventType type)
 bool UiWidget::takesInput() const
 {
     return _peer && _displayed && _enabled && _parent && _parent->takesInput();
+}
+
+void UiWidget::forgetHandlers()
+{
+    if (_piWidget)
+        _piWidget->clear();
 }
 
 void UiWidget::realize(NtPlatform& platform, NtContainer& parent)

@@ -31,7 +31,7 @@ public:
     static RttiType const& getClassType();
     virtual RttiType const& getRttiType() const;
 
-    std::string const& getName() const { return _name; }
+    std::string const& getName() const;
 
     /// Null for the root of a window, and for a widget that was taken out of its parent.
     RCShdPtr<UiContainer> getParent() const;
@@ -53,21 +53,22 @@ public:
     void setConstraint(UiConstraint const& constraint) { _constraint = constraint; }
 
     /// Whether the widget itself is to be seen; it is on the screen if all that hold it are so too.
-    bool isDisplayed() const { return _displayed; }
+    bool isDisplayed() const;
     virtual void display(bool displayed);
 
-    virtual void show() { display(true); }
+    virtual void show();
 
     /// May come from any thread: the end of a widget does not choose its own.
     virtual void hide();
 
     /// Whether the widget itself takes input; it does if all that hold it do so too.
-    bool isEnabled() const { return _enabled; }
+    bool isEnabled() const;
 
     /// A change runs the handlers of `Enable` or `Disable`.
     void setEnabled(bool enabled);
 
-    /// Takes the widget out of its parent, which may end its life, and off the screen. May come from any thread.
+    /// Takes the widget out of its parent, which may end its life, and off the screen. Its handlers, and those of the
+    /// widgets in it, are forgotten: their owner may be about to go. May come from any thread.
     void clearParent();
 
     /// The text that is shown while the pointer rests on the widget.
@@ -101,6 +102,7 @@ protected:
 private:
     friend class UiContainer;
 
+    virtual void forgetHandlers();
     void realize(NtPlatform& platform, NtContainer& parent);
     void placePeer();
 

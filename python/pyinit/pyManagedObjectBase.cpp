@@ -3,6 +3,8 @@
 namespace Kv
 {
 
+PyManagedObjectBase::PyManagedObjectBase(Uuid const& interpreterId) : _interpreterId(interpreterId) {}
+
 PyManagedObjectBase::~PyManagedObjectBase() = default;
 
 } // namespace Kv

@@ -17,7 +17,7 @@ public:
     Uuid const& getInterpreterId() const { return _interpreterId; }
 
 protected:
-    explicit PyManagedObjectBase(Uuid const& interpreterId) : _interpreterId(interpreterId) {}
+    explicit PyManagedObjectBase(Uuid const& interpreterId);
 
 private:
     Uuid _interpreterId;

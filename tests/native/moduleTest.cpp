@@ -1,7 +1,7 @@
 #include <boost/python.hpp>
 
 #include "gfx/wsCursorRegistry.h"
-#include "pyui/src/pyDialogHolder.h"
+#include "pyui/src/pyManagedDialog.h"
 #include "pyui/src/pyUiError.h"
 #include "ui/uiCursorGuard.h"
 

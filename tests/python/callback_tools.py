@@ -80,7 +80,7 @@ def no_wait_is_endless():
     signal.signal(signal.SIGALRM, previous)
 
 
-def run_script(text, timeout=300):
+def run_script(text, timeout=120):
     """Runs a script in a process of its own, beside these tools, and gives what it printed."""
     signal.alarm(0)  # the process has an end of its own
     environment = dict(os.environ, PYTHONPATH=os.pathsep.join(os.path.abspath(path) for path in sys.path))

@@ -23,7 +23,8 @@ def user():
 def screen():
     """The name of an X display that nobody else uses, without a window manager."""
     reading, writing = os.pipe()
-    server = subprocess.Popen(['Xvfb', '-displayfd', str(writing), '-screen', '0', '1280x1024x24', '-nolisten', 'tcp'],
+    # Without the last option it starts anew, deaf for a moment, each time that its only client goes.
+    server = subprocess.Popen(['Xvfb', '-displayfd', str(writing), '-screen', '0', '1280x1024x24', '-noreset'],
                               pass_fds=[writing], stderr=subprocess.DEVNULL)
     os.close(writing)
     with os.fdopen(reading) as answer:

@@ -2,7 +2,7 @@
 
 import pytest
 
-from descriptions import close_button, container, text, widget
+from descriptions import close_button, container
 from quorvane_velmora import ui
 from PyQt6.QtCore import QPoint
 

@@ -116,12 +116,6 @@ def test_a_refused_text_or_state_changes_nothing(write, name, value):
     assert dialog.getValues() == START
 
 
-def test_a_menu_entry_that_is_no_text_for_people_is_refused_with_words(write):
-    for entry in 'a\ud800', b'a\xff':
-        with pytest.raises((RuntimeError, UnicodeEncodeError), match='UTF-8|surrogates'):
-            write(make(), 'Prize', ([entry], 0))
-
-
 def test_many_values_are_written_from_top_to_bottom_up_to_the_first_refused():
     dialog = make(widgets=[('TextField', name) for name in 'abc'])
     with pytest.raises(TypeError):

@@ -115,6 +115,14 @@ def test_a_widget_out_of_reach_keeps_its_value_and_takes_no_input(user, name, ta
     assert dialog.getValue(name) == values.get(name)
 
 
+@pytest.mark.parametrize('take_away', [TAKE_AWAY['hidden'], TAKE_AWAY['disabled']], ids=['hidden', 'disabled'])
+def test_escape_does_not_press_a_button_out_of_reach(user, take_away):
+    dialog = make_dialog()
+    take_away(dialog, 'CloseButton_Cancel')
+    user.plan(lambda someone: someone.press(Qt.Key.Key_Escape), lambda someone: someone.window().close(), close)
+    assert dialog.launch() == 'CloseButton_OK'
+
+
 def test_a_hidden_or_disabled_widget_still_takes_values_from_the_script(user):
     dialog = make_dialog()
     dialog.hideWidget('Text')

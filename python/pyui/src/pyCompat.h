@@ -2,6 +2,8 @@
 
 #include <Python.h>
 
+#include <boost/python/module_init.hpp>
+
 namespace Kv::PyextUi::PyCompat
 {
 
@@ -14,6 +16,16 @@ constexpr int importLevel = 0;
 inline PyObject* stringFromStringAndSize(char const* text, Py_ssize_t size)
 {
     return PyUnicode_FromStringAndSize(text, size);
+}
+
+/// Boost.Python gives the module also where its body has failed, which the interpreter takes for a fault of its own.
+inline PyObject* initModule(PyModuleDef& definition, void (*body)())
+{
+    PyObject* const module = boost::python::detail::init_module(definition, body);
+    if (!PyErr_Occurred())
+        return module;
+    Py_XDECREF(module);
+    return nullptr;
 }
 
 /// Borrowed; null without an error for a key that is not there. The plain call drops every error, also that of a
@@ -34,7 +46,7 @@ inline PyObject* stringFromStringAndSize(char const* text, Py_ssize_t size)
 
 inline PyObject* dictGetItem(PyObject* dictionary, PyObject* key)
 {
-    return _PyDict_GetItemWithError(dictionary, key);
+    return PyDict_GetItem(dictionary, key);
 }
 
 #endif

@@ -4,7 +4,7 @@
 #include <boost/python/list.hpp>
 
 #include "base/rcShdPtr.h"
-#include "pyDialogHolder.h"
+#include "pyManagedDialog.h"
 
 #include <string>
 
@@ -15,23 +15,25 @@ namespace Kv::PyextUi
 // written without running callbacks. Failures are those of `Dialog` and of the description.
 
 /// A dialog that has not been launched, from the description `xmlString`.
-RCShdPtr<ManagedDialog> createDialog(std::string const& title, std::string const& xmlString, int width, int height,
-                                     boost::python::dict const& initialValues);
+RCShdPtr<ManagedDialog> createDialog(std::string const& title, std::string const& xmlString, int width = -1,
+                                     int height = -1, boost::python::dict const& initialValues = boost::python::dict());
 
 /// Shows a dialog from the description in the file `xmlFile` and gives its values when it closes. Throws `UiError` for
 /// a file that cannot be opened.
-boost::python::dict showDialog(std::string const& title, std::string const& xmlFile, int width, int height,
-                               boost::python::dict const& initialValues);
+boost::python::dict showDialog(std::string const& title, std::string const& xmlFile, int width = -1, int height = -1,
+                               boost::python::dict const& initialValues = boost::python::dict());
 
 /// Shows a form made from widget entries and gives its values when it closes.
 boost::python::dict showSimpleDialog(std::string const& title, boost::python::list const& widgets, int width,
-                                     bool cancelButton, boost::python::dict const& initialValues);
+                                     bool cancelButton = false,
+                                     boost::python::dict const& initialValues = boost::python::dict());
 
 /// Shows lines of text and gives the label of the button that closed them.
 std::string showMessageBox(std::string const& title, boost::python::list const& messages,
-                           boost::python::list const& closeButtons);
+                           boost::python::list const& closeButtons = boost::python::list());
 
 /// The description of a form made from widget entries.
-std::string makeXmlFromWidgetList(boost::python::list const& widgets, boost::python::list const& closeButtons);
+std::string makeXmlFromWidgetList(boost::python::list const& widgets,
+                                  boost::python::list const& closeButtons = boost::python::list());
 
 } // namespace Kv::PyextUi

@@ -60,6 +60,7 @@ public:
     /// The key under which `getValues` gives the close button.
     static std::string const& getCloseButtonClickedKey() { return _closeButtonClickedKey; }
 
+    /// Takes the dialog's widgets off the screen.
     void hide() const;
 
     /// The next press of a close button, only that, leaves the dialog open.
@@ -72,7 +73,8 @@ public:
     boost::python::dict getValues() const;
 
     /// Writes the first widget of that name that takes a value; without one nothing happens. With `invokeCallback` the
-    /// callbacks of the change run.
+    /// callbacks of the change run. A value of the wrong form is Python's `TypeError` or `IndexError`, which passes as
+    /// `error_already_set`.
     void setValue(std::string const& widgetName, boost::python::object const& value, bool invokeCallback);
     void setValue(std::string const& widgetName, boost::python::object const& value);
 
@@ -80,6 +82,8 @@ public:
     /// that it has.
     void setValues(boost::python::dict const& values, bool invokeCallback);
     void setValues(boost::python::dict const& values);
+
+    // The operations from here on throw `UiError` for a name that no widget has.
 
     /// Calls `cb` for events of that type on the widget from now on. `cb` is kept until it is removed.
     void addCallback(std::string const& widgetName, PiWidget::EventType eventType, PyObject* cb);
@@ -90,10 +94,13 @@ public:
     /// Names the resource in which the widget's tooltip stands.
     void setWidgetResourceName(std::string const& widgetName, std::string const& resName);
 
+    /// Shows or hides a widget; a hidden one keeps its value.
     void displayWidget(std::string const& widgetName, bool display) const;
     void showWidget(std::string const& widgetName) const;
     void hideWidget(std::string const& widgetName) const;
     bool isDisplayed(std::string const& widgetName) const;
+
+    /// Enables or disables a widget; a disabled one keeps its value and takes no input.
     void enableWidget(std::string const& widgetName, bool enable) const;
     bool isEnabled(std::string const& widgetName) const;
 
@@ -137,9 +144,9 @@ private:
     RCShdPtr<WidgetCbs> _widgetCbs;
     CallbackSets _closeCallbacks;
     CallbackSets _callbacks;
-    PyCallables _callables;
     bool _closed;
     bool _disableNextClose = false;
+    PyCallables _callables;
 };
 
 } // namespace Kv::PyextUi

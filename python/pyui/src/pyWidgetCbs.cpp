@@ -4,7 +4,7 @@
 
 #include "pyCompat.h"
 #include "pyDialog.h"
-#include "pyDialogHolder.h"
+#include "pyManagedDialog.h"
 
 namespace bp = boost::python;
 

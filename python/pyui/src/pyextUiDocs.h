@@ -24,10 +24,13 @@ Defaults to -1.
 No callback runs for them. Defaults to {}.
 @type initialValues: C{dict}
 @return: The widgets' values by widget name as they stood when the dialog closed, whichever button closed it, and the
-name of that button under C{CloseButtonClicked}.
+name of that button under C{CloseButtonClicked}, which is not there if the dialog was ended without a button.
 @rtype: C{dict}
 @raise UiError: If the file cannot be opened, or the dialog has no close button.
-@raise RuntimeError: If the description is faulty (the words name the line), or if there is no display to show it on.)";
+@raise TypeError: If an initial value is of the wrong form.
+@raise IndexError: If the tuple of an initial value for a menu is too short.
+@raise RuntimeError: If the file is a directory, if the description is faulty (the words name the line), or if there is
+no display to show it on.)";
 
 constexpr char const* showSimpleDialog =
     R"(Shows a form made from a list of widgets, and blocks until it is closed. Example::
@@ -35,7 +38,7 @@ constexpr char const* showSimpleDialog =
     values = ui.showSimpleDialog( 'Awards', [
         ( 'TextField', 'Show', 'Show', 'Academy Awards' ),
         ( 'ToggleButton', 'Win', 'Do you win ?', True ) ], 400, True )
-    if values[ 'CloseButtonClicked' ] == 'CloseButton_OK':
+    if values.get( 'CloseButtonClicked' ) == 'CloseButton_OK':
         print( values[ 'Show' ], values[ 'Win' ] )
 
 @param title: The title of the dialog.
@@ -50,11 +53,14 @@ constexpr char const* showSimpleDialog =
 No callback runs for them. Defaults to {}.
 @type initialValues: C{dict}
 @return: The widgets' values by widget name as they stood when the dialog closed, whichever button closed it, and the
-name of that button, C{CloseButton_OK} or C{CloseButton_Cancel}, under C{CloseButtonClicked}.
+name of that button, C{CloseButton_OK} or C{CloseButton_Cancel}, under C{CloseButtonClicked}, which is not there if the
+dialog was ended without a button.
 @rtype: C{dict}
 @raise UiError: If an entry of the list has fewer than two elements.
 @raise TypeError: If an entry or a value is of the wrong form.
-@raise RuntimeError: If a widget type is unknown, or if there is no display to show the dialog on.)";
+@raise IndexError: If the tuple for a menu is too short.
+@raise RuntimeError: If a widget type is unknown, if a text holds a character that a description cannot hold, or if there
+is no display to show the dialog on.)";
 
 constexpr char const* showMessageBox =
     R"(Shows lines of text, and blocks until one of the close buttons is pressed. The box is as wide as its longest line.
@@ -67,6 +73,7 @@ constexpr char const* showMessageBox =
 @type closeButtons: C{list} of C{str}
 @return: The label of the button that closed the box.
 @rtype: C{str}
+@raise TypeError: If a line or a label is no C{str}.
 @raise IndexError: If the box was ended without one of its buttons.
 @raise RuntimeError: If there is no display to show the box on.)";
 
@@ -86,7 +93,9 @@ gets the label "OK". Defaults to [].
 @rtype: C{str}
 @raise UiError: If an entry has fewer than two elements.
 @raise TypeError: If an entry or a value is of the wrong form.
-@raise RuntimeError: If a text holds a character that a description cannot hold.)";
+@raise IndexError: If the tuple for a menu is too short.
+@raise RuntimeError: If a text holds a character that a description cannot hold, or a type cannot be the name of an
+element.)";
 
 constexpr char const* createDialog =
     R"(Makes a dialog from a description. It is launched by L{Dialog.launch}.
@@ -106,6 +115,8 @@ No callback runs for them. Defaults to {}.
 @type initialValues: C{dict}
 @return: The dialog.
 @rtype: L{Dialog}
+@raise TypeError: If an initial value is of the wrong form.
+@raise IndexError: If the tuple of an initial value for a menu is too short.
 @raise RuntimeError: If the description is faulty; the words name the line.)";
 
 constexpr char const* dialog =
@@ -137,7 +148,8 @@ constexpr char const* launch =
     R"(Shows the dialog and blocks until one of its close buttons is pressed. It can be launched any number of times; its
 widgets keep their values. What a callback raises in the meantime comes out of it.
 
-@return: The name of the close button.
+@return: The name of the close button. If the dialog was ended without one, the name of the button pressed last before,
+or an empty text.
 @rtype: C{str}
 @raise UiError: If the dialog has no close button.
 @raise RuntimeError: If there is no display to show the dialog on.)";
@@ -171,15 +183,15 @@ entries and the index of the selected one for a menu, whose entries are replaced
 @raise IndexError: If the tuple for a menu is too short.)";
 
 constexpr char const* setValues =
-    R"(Sets the values of the widgets that C{values} names, from the top of the dialog to the bottom. A name that no widget
-has is ignored.
+    R"(Sets the values of the widgets that C{values} names, in the order of the description. A name that no widget has is
+ignored.
 
 @param values: The values by widget name, each in the form of L{setValue}; but the entries of a menu are added to
 those that it has, and the index counts in all of them.
 @type values: C{dict}
 @param invokeCallback: Whether the callbacks of the widgets run for the changes. Defaults to C{True}.
 @type invokeCallback: C{bool}
-@raise TypeError: If a value is of the wrong form. The widgets above keep what they were given.
+@raise TypeError: If a value is of the wrong form. The widgets before it keep what they were given.
 @raise IndexError: If the tuple for a menu is too short.)";
 
 constexpr char const* addCallback =
@@ -190,6 +202,7 @@ constexpr char const* addCallback =
 @param eventType: The event.
 @type eventType: L{EventType}
 @param cb: The callable, called as C{def func( Dialog, widgetName, eventType )}. Its result is ignored.
+@type cb: callable
 @raise UiError: If the widget does not exist.)";
 
 constexpr char const* removeCallback =
@@ -201,6 +214,7 @@ happens.
 @param eventType: The event.
 @type eventType: L{EventType}
 @param cb: The very object that was registered.
+@type cb: callable
 @raise UiError: If the widget does not exist.)";
 
 constexpr char const* setWidgetResourceName =
@@ -210,7 +224,8 @@ constexpr char const* setWidgetResourceName =
 @type widgetName: C{str}
 @param resName: The resource: a full path or a bare file name, with or without the extension.
 @type resName: C{str}
-@raise UiError: If the widget does not exist.)";
+@raise UiError: If the widget does not exist.
+@raise RuntimeError: If the resource is there and is none.)";
 
 constexpr char const* displayWidget =
     R"(Shows or hides a widget. A hidden one keeps its value.

@@ -3,7 +3,7 @@
 #include "appUi/uiAppMgr.h"
 #include "pyCompat.h"
 #include "pyConvenienceFunctions.h"
-#include "pyDialogHolder.h"
+#include "pyManagedDialog.h"
 #include "pyUiError.h"
 #include "pyextUiDocs.h"
 
@@ -25,40 +25,11 @@ bp::arg positional()
     return bp::arg("");
 }
 
-RCShdPtr<ManagedDialog> createDialogDefaults(std::string const& title, std::string const& xmlString, int width = -1,
-                                             int height = -1, bp::dict const& initialValues = bp::dict())
-{
-    return createDialog(title, xmlString, width, height, initialValues);
-}
-
-bp::dict showDialogDefaults(std::string const& title, std::string const& xmlFile, int width = -1, int height = -1,
-                            bp::dict const& initialValues = bp::dict())
-{
-    return showDialog(title, xmlFile, width, height, initialValues);
-}
-
-bp::dict showSimpleDialogDefaults(std::string const& title, bp::list const& widgets, int width,
-                                  bool cancelButton = false, bp::dict const& initialValues = bp::dict())
-{
-    return showSimpleDialog(title, widgets, width, cancelButton, initialValues);
-}
-
-std::string showMessageBoxDefaults(std::string const& title, bp::list const& messages,
-                                   bp::list const& closeButtons = bp::list())
-{
-    return showMessageBox(title, messages, closeButtons);
-}
-
-std::string makeXmlDefaults(bp::list const& widgets, bp::list const& closeButtons = bp::list())
-{
-    return makeXmlFromWidgetList(widgets, closeButtons);
-}
-
-BOOST_PYTHON_FUNCTION_OVERLOADS(createDialogOverloads, createDialogDefaults, 2, 5)
-BOOST_PYTHON_FUNCTION_OVERLOADS(showDialogOverloads, showDialogDefaults, 2, 5)
-BOOST_PYTHON_FUNCTION_OVERLOADS(showSimpleDialogOverloads, showSimpleDialogDefaults, 3, 5)
-BOOST_PYTHON_FUNCTION_OVERLOADS(showMessageBoxOverloads, showMessageBoxDefaults, 2, 3)
-BOOST_PYTHON_FUNCTION_OVERLOADS(makeXmlOverloads, makeXmlDefaults, 1, 2)
+BOOST_PYTHON_FUNCTION_OVERLOADS(createDialogOverloads, createDialog, 2, 5)
+BOOST_PYTHON_FUNCTION_OVERLOADS(showDialogOverloads, showDialog, 2, 5)
+BOOST_PYTHON_FUNCTION_OVERLOADS(showSimpleDialogOverloads, showSimpleDialog, 3, 5)
+BOOST_PYTHON_FUNCTION_OVERLOADS(showMessageBoxOverloads, showMessageBox, 2, 3)
+BOOST_PYTHON_FUNCTION_OVERLOADS(makeXmlOverloads, makeXmlFromWidgetList, 1, 2)
 
 void instantiateAppMgr()
 {
@@ -97,18 +68,18 @@ template <typename T> bool shareClass(char const* name)
 void defineFunctions()
 {
     using bp::arg;
-    bp::def("showDialog", &showDialogDefaults,
+    bp::def("showDialog", &showDialog,
             showDialogOverloads((positional(), positional(), arg("width"), arg("height"), arg("initialValues")),
                                 Docs::showDialog));
     bp::def(
-        "showSimpleDialog", &showSimpleDialogDefaults,
+        "showSimpleDialog", &showSimpleDialog,
         showSimpleDialogOverloads((positional(), positional(), positional(), arg("cancelButton"), arg("initialValues")),
                                   Docs::showSimpleDialog));
-    bp::def("showMessageBox", &showMessageBoxDefaults,
+    bp::def("showMessageBox", &showMessageBox,
             showMessageBoxOverloads((positional(), positional(), arg("closeButtons")), Docs::showMessageBox));
-    bp::def("makeXmlFromWidgetList", &makeXmlDefaults,
+    bp::def("makeXmlFromWidgetList", &makeXmlFromWidgetList,
             makeXmlOverloads((positional(), arg("closeButtons")), Docs::makeXmlFromWidgetList));
-    bp::def("createDialog", &createDialogDefaults,
+    bp::def("createDialog", &createDialog,
             createDialogOverloads((positional(), positional(), arg("width"), arg("height"), arg("initialValues")),
                                   Docs::createDialog));
 }
@@ -176,7 +147,20 @@ void moduleBody()
 
 } // namespace Kv::PyextUi
 
+#if PY_MAJOR_VERSION >= 3
+
+extern "C" KVPYEXTUI_API PyObject* PyInit_libKVpyextUi()
+{
+    static PyModuleDef definition{
+        PyModuleDef_HEAD_INIT, "libKVpyextUi", nullptr, -1, nullptr, nullptr, nullptr, nullptr, nullptr};
+    return Kv::PyextUi::PyCompat::initModule(definition, &Kv::PyextUi::moduleBody);
+}
+
+#else
+
 BOOST_PYTHON_MODULE(libKVpyextUi)
 {
     Kv::PyextUi::moduleBody();
 }
+
+#endif

@@ -10,10 +10,10 @@ namespace Kv
 
 /// Way from a native widget to the listener of its peer. The peer and the widget have a copy each; once the peer has
 /// closed it the widget is heard no more, however long it still lives. The listener is borrowed.
-template <typename Listener> class QtEar
+template <typename Listener> class QtListenerHandle
 {
 public:
-    explicit QtEar(Listener& listener) : _listener(std::make_shared<std::atomic<Listener*>>(&listener)) {}
+    explicit QtListenerHandle(Listener& listener) : _listener(std::make_shared<std::atomic<Listener*>>(&listener)) {}
 
     void close() const { *_listener = nullptr; }
 

@@ -1,7 +1,7 @@
 #include <boost/python.hpp>
 #include <boost/python/object/find_instance.hpp>
 
-#include "pyDialogHolder.h"
+#include "pyManagedDialog.h"
 
 namespace bp = boost::python;
 
@@ -11,16 +11,16 @@ namespace Kv::PyextUi
 namespace
 {
 
-class SharingDialog : public ManagedDialog
+class SharedManagedDialog : public ManagedDialog
 {
 public:
-    explicit SharingDialog(RCShdPtr<Dialog> const& dialog) : ManagedDialog(dialog)
+    explicit SharedManagedDialog(RCShdPtr<Dialog> const& dialog) : ManagedDialog(dialog)
     {
         dialog->getCallables().addShare();
     }
-    SharingDialog(SharingDialog const&) = delete;
-    SharingDialog& operator=(SharingDialog const&) = delete;
-    ~SharingDialog() override { getValue()->getCallables().releaseShare(); }
+    SharedManagedDialog(SharedManagedDialog const&) = delete;
+    SharedManagedDialog& operator=(SharedManagedDialog const&) = delete;
+    ~SharedManagedDialog() override { getValue()->getCallables().releaseShare(); }
 };
 
 /// The callables that a Python object may report as its own: those of a dialog that nobody but such objects holds.
@@ -28,7 +28,7 @@ PyObject* findOwnedCallables(PyObject* self)
 {
     auto const* const managed = static_cast<RCShdPtr<ManagedDialog> const*>(
         bp::objects::find_instance_impl(self, bp::type_id<RCShdPtr<ManagedDialog>>()));
-    if (!managed || !dynamic_cast<SharingDialog const*>(managed->get()) || (*managed)->getReferenceCount() != 1)
+    if (!managed || !dynamic_cast<SharedManagedDialog const*>(managed->get()) || (*managed)->getReferenceCount() != 1)
         return nullptr;
     Dialog& dialog = *(*managed)->getValue();
     return dialog.getReferenceCount() == dialog.getCallables().getShareCount() ? dialog.getCallables().getDictionary()
@@ -58,7 +58,7 @@ int clear(PyObject* self)
 
 RCShdPtr<ManagedDialog> makeManaged(RCShdPtr<Dialog> const& dialog)
 {
-    return RCShdPtr<ManagedDialog>(new SharingDialog(dialog));
+    return RCShdPtr<ManagedDialog>(new SharedManagedDialog(dialog));
 }
 
 void supportGarbageCollection(PyTypeObject* dialogClass)
