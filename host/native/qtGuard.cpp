@@ -1,6 +1,7 @@
 #include "native/qtGuard.h"
 
 #include "native/qtLoop.h"
+#include "native/windowWidget.h"
 
 #include <QCoreApplication>
 #include <QThread>
@@ -66,6 +67,7 @@ void QtGuard::run(std::function<void()> const& call) noexcept
     {
         InterpreterHold const hold(_hook);
         ++_depth;
+        quint64 const outerCall = std::exchange(_currentCall, ++_calls);
         try
         {
             call();
@@ -74,6 +76,7 @@ void QtGuard::run(std::function<void()> const& call) noexcept
         {
             take();
         }
+        _currentCall = outerCall;
         --_depth;
     }
     if (_innermostLoop)
@@ -101,6 +104,11 @@ void QtGuard::addContext(std::exception_ptr const& first, std::exception_ptr con
         print(later);
 }
 
+QtGuard::Moment QtGuard::getMoment() const
+{
+    return {_currentCall, QThread::currentThread()->loopLevel()};
+}
+
 void QtGuard::destroy(QWidget* widget)
 {
     // Without its application a widget can no longer be touched.
@@ -111,7 +119,8 @@ void QtGuard::destroy(QWidget* widget)
         widget->deleteLater();
         return;
     }
-    if (_depth == 0)
+    auto const* const window = dynamic_cast<WindowWidget const*>(widget->window());
+    if (getMoment() == (window ? window->getBirth() : Moment()))
     {
         std::unique_ptr<QWidget> const done(widget);
         return;

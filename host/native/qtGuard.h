@@ -40,6 +40,21 @@ public:
     QtLoop* getInnermostLoop() const { return _innermostLoop; }
     void setInnermostLoop(QtLoop* loop) { _innermostLoop = loop; }
 
+    /// The call from the toolkit and the loop that are under way. What was made and goes at the same moment of these
+    /// cannot be in the middle of one of its events.
+    struct Moment
+    {
+        quint64 call = 0;
+        int loopLevel = 0;
+
+        friend bool operator==(Moment const& a, Moment const& b)
+        {
+            return a.call == b.call && a.loopLevel == b.loopLevel;
+        }
+    };
+
+    Moment getMoment() const;
+
     /// Destroys a widget that its owner has done with, as soon as that can be: at once, or when the call from the
     /// toolkit that is under way has returned, or on the widget's own thread.
     void destroy(QWidget* widget);
@@ -55,6 +70,8 @@ private:
     NtScriptHook* _hook = nullptr;
     QtLoop* _innermostLoop = nullptr;
     int _depth = 0;
+    quint64 _calls = 0;
+    quint64 _currentCall = 0;
     std::vector<QPointer<QWidget>> _waiting;
 };
 

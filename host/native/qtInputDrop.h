@@ -15,6 +15,8 @@ public:
     /// `window` is borrowed and may go first.
     explicit QtInputDrop(QWidget& window);
 
+    bool isFor(QWidget const& window) const { return _window == &window; }
+
     bool eventFilter(QObject* receiver, QEvent* event) override;
 
 private:

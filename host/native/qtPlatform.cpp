@@ -56,6 +56,9 @@ double measure(QString const& text)
     return buttonFont == labelFont ? width : std::max(width, measureIn(buttonFont, text));
 }
 
+/// What is left free of the screen's height for the window manager's frame, which is known only when it is too late.
+constexpr int titleBarRoom = 40;
+
 /// Turns a frame over, makes it fit the free part of the screen and moves it there.
 QRect fitToScreen(GeRectangle<int> const& frame)
 {
@@ -65,11 +68,11 @@ QRect fitToScreen(GeRectangle<int> const& frame)
     QRect const all = screen->geometry();
     QRect const room = screen->availableGeometry();
     int const width = std::clamp(frame.getWidth(), 1, room.width());
-    int const height = std::clamp(frame.getHeight(), 1, room.height());
+    int const height = std::clamp(frame.getHeight(), 1, std::max(1, room.height() - titleBarRoom));
     int const x = all.x() + frame.xMin;
     int const y = all.y() + all.height() - frame.yMax;
     return {std::clamp(x, room.x(), room.x() + room.width() - width),
-            std::clamp(y, room.y(), room.y() + room.height() - height), width, height};
+            std::clamp(y, room.y(), room.y() + room.height() - height - titleBarRoom / 2), width, height};
 }
 
 } // namespace

@@ -14,6 +14,19 @@ namespace Kv
 namespace
 {
 
+/// Closes the menus and lists that are open above a window. They hold the pointer and the keyboard.
+void closePopups(QWidget const& window)
+{
+    for (QWidget* popup = QApplication::activePopupWidget(); popup; popup = QApplication::activePopupWidget())
+    {
+        QWidget const* owner = popup;
+        while (owner && owner != &window)
+            owner = owner->parentWidget();
+        if (!owner || !popup->close())
+            return;
+    }
+}
+
 /// Takes the windows down that are left when the application goes, while they still can be destroyed.
 void destroyLeftWindows()
 {
@@ -40,9 +53,11 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, std::strin
 {
     goWithApplication();
     WindowWidget* const native = getNative();
-    native->setWindowTitle(toQString(title));
+    // No screen shows more, and a window system can end the process for it.
+    constexpr int maxTitle = 4096;
+    native->setWindowTitle(toQString(title).left(maxTitle));
     native->setGeometry(frame);
-    native->getArea().setWidget(_content->getNative());
+    native->setContent(_content->getNative());
 }
 
 QtWindow::~QtWindow()
@@ -76,6 +91,7 @@ void QtWindow::hide()
     QWidget* const native = _native.get();
     if (!native || native->isHidden())
         return;
+    closePopups(*native);
     native->hide();
     // Where no window manager does it, the keyboard has to be given back.
     if (_owner && _owner->isVisible())

@@ -7,6 +7,7 @@
 #include <QKeyEvent>
 #include <QTimer>
 
+#include <algorithm>
 #include <functional>
 #include <utility>
 
@@ -69,13 +70,15 @@ std::vector<QPointer<WindowWidget>> WindowWidget::findAll()
 void WindowWidget::showModal()
 {
     _awaited = true;
-    // A visible window keeps the modality that it was shown with.
-    if (isVisible() && windowModality() != Qt::ApplicationModal)
+    // A visible window keeps its modality, and its place below those that were shown after it.
+    if (QApplication::activeModalWidget() != this)
         hide();
     setWindowModality(Qt::ApplicationModal);
     show();
     if (hasStack())
         raise();
+    else
+        QApplication::setActiveWindow(this);
     activateWindow();
 }
 
@@ -120,7 +123,8 @@ void WindowWidget::hideEvent(QHideEvent* event)
 void WindowWidget::resizeEvent(QResizeEvent* event)
 {
     QWidget::resizeEvent(event);
-    _area->setGeometry(rect());
+    if (_area)
+        _area->setGeometry(rect());
 }
 
 void WindowWidget::closeEvent(QCloseEvent* event)
@@ -154,7 +158,7 @@ bool WindowWidget::focusNextPrevChild(bool next)
 void WindowWidget::tellRoom()
 {
     // Laying out can bring scroll bars, and these change the room again: that is told when the first is done.
-    if (_telling || !isVisible())
+    if (_telling || !isVisible() || !_area)
         return;
     _telling = true;
     QPointer<QWidget> const alive(this);
@@ -164,8 +168,16 @@ void WindowWidget::tellRoom()
         _handle.tell(&NtWindowListener::onResized, _told.width(), _told.height());
         if (!alive)
             return;
+        if (!_area)
+            break;
     }
     _telling = false;
+}
+
+void WindowWidget::unblock(QWidget const& window)
+{
+    auto const isOf = [&window](std::unique_ptr<QtInputDrop> const& drop) { return drop->isFor(window); };
+    _blocked.erase(std::remove_if(_blocked.begin(), _blocked.end(), isOf), _blocked.end());
 }
 
 void WindowWidget::blockOthers()
@@ -174,7 +186,10 @@ void WindowWidget::blockOthers()
     _blocked.clear();
     for (QPointer<WindowWidget> const& window : findAll())
         if (window != this && window->isVisible())
+        {
+            window->unblock(*this);
             _blocked.push_back(std::make_unique<QtInputDrop>(*window));
+        }
 }
 
 } // namespace Kv

@@ -24,6 +24,9 @@ public:
     /// All that there are now, shown or not.
     static std::vector<QPointer<WindowWidget>> findAll();
 
+    /// When it was made.
+    QtGuard::Moment const& getBirth() const { return _birth; }
+
     /// Shows the window, modal to all others, and activates it.
     void showModal();
 
@@ -31,8 +34,8 @@ public:
     /// reach the others again, unless it is shown anew or gone until then.
     void stopWaiting();
 
-    /// What scrolls the content. Natively a child of this.
-    QScrollArea& getArea() { return *_area; }
+    /// Takes the content, which the window scrolls where it is larger.
+    void setContent(QWidget* content) { _area->setWidget(content); }
 
 protected:
     void showEvent(QShowEvent* event) override;
@@ -45,10 +48,15 @@ protected:
 private:
     void tellRoom();
     void blockOthers();
+    /// Lets input through to a window that is shown above this one now.
+    void unblock(QWidget const& window);
     void letOthersIn();
 
     QtListenerHandle<NtWindowListener> _handle;
-    QScrollArea* _area;
+    /// Natively a child, which others can delete.
+    QPointer<QScrollArea> _area;
+
+    QtGuard::Moment _birth = QtGuard::getInstance().getMoment();
 
     /// The room as it was told last; none is told to a hidden window.
     QSize _told;

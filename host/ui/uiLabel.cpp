@@ -1,5 +1,6 @@
 #include "ui/uiLabel.h"
 
+#include "gfx/wsFontRegistry.h"
 #include "native/ntPlatform.h"
 #include "ui/uiContainer.h"
 #include "ui/uiWidgetElement.h"
@@ -41,6 +42,11 @@ RttiType const& UiLabel::getClassType()
 RttiType const& UiLabel::getRttiType() const
 {
     return getClassType();
+}
+
+int UiLabel::getLeastWidth() const
+{
+    return static_cast<int>(WsFontRegistry::getInstance().getDefaultFont()->getStringWidth(_label.getString().c_str()));
 }
 
 void UiLabel::setAlign(NtAlign align)

@@ -22,6 +22,9 @@ public:
     static RttiType const& getClassType();
     RttiType const& getRttiType() const override;
 
+    /// The width of its text.
+    int getLeastWidth() const override;
+
     /// The text on its face.
     UiString& getLabel() { return _label; }
 

@@ -13,9 +13,6 @@ namespace Kv
 namespace
 {
 
-/// A widget whose two sides hang on the container is never squeezed below this, in pixels.
-constexpr int leastStretchedWidth = 56;
-
 /// Container of all widgets of a window.
 class RootContainer : public UiContainer
 {
@@ -49,7 +46,7 @@ GeVector2<int> measureOverflow(UiContainer const& container)
         else if (std::optional<UiConstraint> const& constraint = child->getConstraint();
                  constraint && constraint->getEdge(UiConstraint::X1).target != UiConstraint::OwnOpposite &&
                  constraint->getEdge(UiConstraint::X2).target != UiConstraint::OwnOpposite)
-            most.x = std::max(most.x, leastStretchedWidth - rect.getWidth());
+            most.x = std::max(most.x, child->getLeastWidth() - rect.getWidth());
     }
     return most;
 }

@@ -51,6 +51,11 @@ RCShdPtr<PiWidget> UiWidget::getPiWidget()
     return _piWidget;
 }
 
+int UiWidget::getLeastWidth() const
+{
+    return 56;
+}
+
 void UiWidget::setRect(GeRectangle<int> const& rect, bool)
 {
     _rect = rect;

@@ -42,6 +42,9 @@ public:
     /// The face for event handlers. Never null.
     RCShdPtr<PiWidget> getPiWidget();
 
+    /// How narrow the widget may become where its width follows that of its container, in pixels.
+    virtual int getLeastWidth() const;
+
     /// Where the widget lies in its window, in pixels, y growing upward. The layout says so for a widget with a
     /// constraint, once its window is shown.
     GeRectangle<int> const& getRect() const { return _rect; }

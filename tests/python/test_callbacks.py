@@ -5,7 +5,7 @@ import weakref
 
 import pytest
 
-from callback_tools import EVENTS, UNKNOWN, listen, make_dialog, no_wait_is_endless  # noqa: F401
+from callback_tools import UNKNOWN, listen, make_dialog, no_wait_is_endless  # noqa: F401
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtTest import QTest
@@ -221,13 +221,6 @@ def test_an_unknown_widget_is_refused_and_nothing_kept(operation):
     assert str(refused.value) == UNKNOWN
     del callback, refused
     assert gone() is None
-
-
-def test_only_an_event_type_names_an_event():
-    dialog = make_dialog()
-    with pytest.raises(TypeError):
-        dialog.addCallback('Button', 23, print)
-    assert [int(event) for event in EVENTS] == [1, 2, 22, 23, 24]
 
 
 def test_a_callback_on_a_close_button_can_keep_the_dialog_open(user):

@@ -74,38 +74,6 @@ def test_a_removed_next_one_does_not_run_and_an_added_one_waits_for_the_next_eve
     assert order == ['change', 'last', '|', 'change', 'last', 'added']
 
 
-def test_a_callable_whose_end_removes_another_disturbs_no_removal():
-    dialog = make_dialog()
-    order = []
-
-    class Ender:
-        def __call__(self, *_):
-            order.append('ender')
-
-        def __del__(self):
-            dialog.removeCallback('Toggle', STATE, other)
-
-    def other(*_):
-        order.append('other')
-
-    def last(*_):
-        order.append('last')
-
-    ender = Ender()
-    for callback in (other, ender, last):
-        dialog.addCallback('Toggle', STATE, callback)
-
-    def remove_both(*_):
-        nonlocal ender
-        held, ender = [ender], None
-        dialog.removeCallback('Toggle', STATE, held.pop())
-
-    dialog.addCallback('Button', ACTIVATE, remove_both)
-    remove_both()
-    dialog.setValue('Toggle', True)
-    assert order == ['last']
-
-
 def test_a_callback_that_adds_and_removes_in_a_nested_event_disturbs_neither(user):
     dialog = make_dialog()
     order = []

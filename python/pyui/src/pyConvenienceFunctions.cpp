@@ -29,7 +29,8 @@ constexpr int sideMargin = 2;
 
 int heightFor(int rowCount)
 {
-    return rowHeight * rowCount + heightBase;
+    constexpr int maxRows = 1 << 18;
+    return rowHeight * std::min(rowCount, maxRows) + heightBase;
 }
 
 /// The middle of the application's main panel.
@@ -85,7 +86,7 @@ bp::dict showSimpleDialog(std::string const& title, bp::list const& widgets, int
 std::string showMessageBox(std::string const& title, bp::list const& messages, bp::list const& closeButtons)
 {
     int const lineCount = lengthOf(messages);
-    int const buttonCount = std::max(1, lengthOf(closeButtons));
+    int const buttonCount = std::clamp(lengthOf(closeButtons), 1, 1 << 18);
     int const height = heightFor(lineCount);
     int contentWidth = closeButtonWidth * buttonCount - closeButtonGap;
     bp::list widgets;

@@ -25,8 +25,27 @@ namespace Kv::PyextUi
 namespace
 {
 
+/// Takes the Python error that is set off the interpreter for as long as it lives. Windows that go can make others run
+/// Python code, while an exception is on its way through the one who held the dialog.
+class ErrorAside
+{
+public:
+    ErrorAside() { PyErr_Fetch(&_type, &_value, &_traceback); }
+    ErrorAside(ErrorAside const&) = delete;
+    ErrorAside& operator=(ErrorAside const&) = delete;
+    ~ErrorAside() { PyErr_Restore(_type, _value, _traceback); }
+
+private:
+    PyObject* _type = nullptr;
+    PyObject* _value = nullptr;
+    PyObject* _traceback = nullptr;
+};
+
 /// What the title takes of a window of its own, in pixels.
 constexpr int titleHeight = 24;
+
+/// More than any window, and far from where sums of sizes end.
+constexpr int maxSize = 1 << 23;
 
 int sizeOnScreen(int wanted, int screen)
 {
@@ -56,6 +75,15 @@ bp::object readValue(RCShdPtr<UiWidget> const& widget)
     return bp::object(dynamicCast<UiMenu>(widget)->getStrPtr());
 }
 
+/// A text, or null for None. Boost.Python hides the error of a text that has no UTF-8 behind one about its type.
+char const* readText(bp::object const& value)
+{
+    bp::extract<char const*> text(value);
+    if (!text.check() && PyErr_Occurred())
+        bp::throw_error_already_set();
+    return text();
+}
+
 enum class MenuEntries
 {
     Replace,
@@ -78,7 +106,7 @@ void writeMenu(UiMenu& menu, bp::object const& value, MenuEntries mode, bool inv
 void writeValue(RCShdPtr<UiWidget> const& widget, bp::object const& value, MenuEntries mode, bool invokeCallback)
 {
     if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
-        field->setString(bp::extract<char const*>(value), UiTextField::End, false, invokeCallback);
+        field->setString(readText(value), UiTextField::End, false, invokeCallback);
     else if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
         toggle->setState(bp::extract<bool>(value), invokeCallback);
     else
@@ -99,10 +127,14 @@ Dialog::Dialog(std::string const& title, std::string const& xmlString, int width
 
 Dialog::~Dialog()
 {
+    ErrorAside const aside;
     _container->hide();
     _container->clearParent();
     WidgetCbs::releaseAll(_callbacks);
     WidgetCbs::releaseAll(_closeCallbacks);
+    _widgetCbs.reset();
+    _container.reset();
+    _topLevel.reset();
 }
 
 void Dialog::createUi(Positionner const&)
@@ -113,6 +145,8 @@ void Dialog::createUi(Positionner const&)
         _width = sizeOnScreen(_width, screen.x);
         _height = sizeOnScreen(_height, screen.y);
     }
+    _width = std::min(_width, maxSize);
+    _height = std::min(_height, maxSize);
     if (_topLevel.isNull())
     {
         GeVector2<int> const screen = WsScreen::getInstance().getSize();
@@ -343,8 +377,7 @@ void Dialog::removeCallback(std::string const& widgetName, PiWidget::EventType e
     if (found == _callbacks.end())
         return;
     RCStrongPtr<CallbackSet> const set = *found;
-    // Goes last: the end of a callable can run anything.
-    bp::handle<> const callable = _callables.find(*set);
+    // First, since it alone can fail.
     _callables.remove(*set);
     if (RCShdPtr<PiWidget> const piWidget = findEventFace(widget))
         piWidget->removeCallback(eventType, set->handler.get());
