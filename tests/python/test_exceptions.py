@@ -261,3 +261,44 @@ def test_with_no_dialog_running_an_exception_is_reported_and_the_process_goes_on
     assert unraisable == [exception] * 2
     assert functions(exception)[-2:] == ['callback', 'deep_inside']
     exception.__traceback__ = None
+
+
+@pytest.mark.parametrize('name', ['Button', 'CloseButton_OK'])
+def test_the_last_reference_to_a_dialog_with_a_left_window_goes_while_its_other_callbacks_wait(user, name):
+    held = [make_dialog('left')]
+    exception = ValueError()
+    failing = raising(exception)
+    held[0].addCallback('Button', ACTIVATE, failing)
+    user.plan(click('Button'))
+    with pytest.raises(ValueError):
+        held[0].launch()
+    held[0].removeCallback('Button', ACTIVATE, failing)
+    exception.__traceback__ = None
+    heard = []
+    held[0].addCallback(name, ACTIVATE, lambda *_: (heard.append('first'), held.clear()))
+    held[0].addCallback(name, ACTIVATE, lambda *_: heard.append('second'))
+    gc.collect()
+    window, = (window for window in QApplication.topLevelWidgets() if window.windowTitle() == 'left')
+    QTest.mouseClick(window.findChild(QPushButton, name), Qt.MouseButton.LeftButton)
+    assert heard == ['first'] and not held
+
+
+def test_an_exception_survives_what_others_do_when_the_windows_go(user):
+    exception = ValueError('of the script')
+    changes = []
+    application = QApplication.instance()
+    application.focusChanged.connect(changes.append)
+    callback = raising(exception)
+
+    def launch():
+        dialog = make_dialog()
+        dialog.addCallback('Button', ACTIVATE, callback)
+        user.plan(click('Button'))
+        dialog.launch()
+
+    try:
+        with pytest.raises(ValueError) as caught:
+            launch()
+    finally:
+        application.focusChanged.disconnect(changes.append)
+    assert caught.value is exception and changes

@@ -225,6 +225,21 @@ def test_a_callback_launches_its_own_dialog_again(patient):
     assert dialog.getValue('Toggle') is False
 
 
+def test_a_dialog_that_is_launched_again_from_one_above_it_comes_to_the_front(patient):
+    below, above = make_dialog('below'), make_dialog('above')
+    fronts = []
+    below.addCallback('Button', ACTIVATE, lambda *_: fronts.append(above.launch()))
+    above.addCallback('Button', ACTIVATE, lambda *_: fronts.append(below.launch()))
+
+    def close_front(user):
+        fronts.append(user.window().windowTitle())
+        user.close()
+
+    patient.plan(*[lambda user: user.click('Button')] * 2, close_front, close_front)
+    assert below.launch() == 'CloseButton_OK'
+    assert fronts == ['below', 'CloseButton_OK', 'above', 'CloseButton_OK']
+
+
 @pytest.mark.parametrize('raises', [False, True])
 @pytest.mark.parametrize('act, name, event', [
     (click('Button'), 'Button', ACTIVATE),

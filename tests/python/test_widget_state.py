@@ -115,11 +115,21 @@ def test_a_widget_out_of_reach_keeps_its_value_and_takes_no_input(user, name, ta
     assert dialog.getValue(name) == values.get(name)
 
 
-@pytest.mark.parametrize('take_away', [TAKE_AWAY['hidden'], TAKE_AWAY['disabled']], ids=['hidden', 'disabled'])
-def test_escape_does_not_press_a_button_out_of_reach(user, take_away):
+def test_escape_does_not_press_a_disabled_button(user):
     dialog = make_dialog()
-    take_away(dialog, 'CloseButton_Cancel')
+    dialog.enableWidget('CloseButton_Cancel', False)
     user.plan(lambda someone: someone.press(Qt.Key.Key_Escape), lambda someone: someone.window().close(), close)
+    assert dialog.launch() == 'CloseButton_OK'
+
+
+def test_escape_presses_the_only_button_that_is_left_when_the_others_are_hidden(user):
+    dialog = make_dialog()
+    dialog.hideWidget('CloseButton_Cancel')
+    user.plan(lambda someone: someone.press(Qt.Key.Key_Escape), lambda someone: someone.window().close())
+    assert dialog.launch() == ''
+    dialog.hideWidget('Button')
+    dialog.hideWidget('Other')
+    user.plan(lambda someone: someone.press(Qt.Key.Key_Escape))
     assert dialog.launch() == 'CloseButton_OK'
 
 
