@@ -53,11 +53,6 @@ template <typename Exception> std::string wordsOf(void (*action)())
 
 } // namespace
 
-TEST(RCShdPtr, IsOneWordWide)
-{
-    EXPECT_EQ(sizeof(RCShdPtr<Counted>), sizeof(void*));
-}
-
 TEST(RCShdPtr, RefusesToBeGoneThroughWhileNull)
 {
     RCShdPtr<Counted> const null;
@@ -87,26 +82,6 @@ TEST(RCShdPtr, DestroysTheObjectWithTheLastCopy)
     EXPECT_EQ(alive, 1);
     third.reset();
     EXPECT_EQ(alive, 0);
-}
-
-TEST(RCShdPtr, CountsACopiedObjectAnew)
-{
-    int alive = 0;
-    RCShdPtr<Counted> const first = makeShd<Counted>(&alive);
-    RCShdPtr<Counted> const copy(new Counted(*first));
-    EXPECT_EQ(first->getReferenceCount(), 1);
-    EXPECT_EQ(copy->getReferenceCount(), 1);
-}
-
-TEST(RCShdPtr, CastsDownToWhatTheObjectIs)
-{
-    int alive = 0;
-    RCShdPtr<Counted> const base = makeShd<Counted>(&alive);
-    RCShdPtr<Counted> const derived = makeShd<Derived>(&alive);
-    EXPECT_TRUE(dynamicCast<Derived>(base).isNull());
-    EXPECT_TRUE(dynamicCast<Derived>(RCShdPtr<Counted>()).isNull());
-    EXPECT_TRUE(dynamicCast<Derived>(derived) == RCShdPtr<Derived>(static_cast<Derived*>(derived.get())));
-    EXPECT_EQ(derived->getReferenceCount(), 1);
 }
 
 TEST(RCShdPtr, SurvivesAnObjectThatLetsGoOfItselfByItsOwnEnd)
@@ -153,53 +128,6 @@ TEST(Exceptions, SayWhatWentWrongInPlainWords)
               "Assertion failed: !name.empty()");
     EXPECT_EQ(wordsOf<ExCastFailed>([] { RCExUtil::throwExCastFailed(typeid(int*).name(), "plain text"); }),
               "Cannot cast int* to plain text");
-}
-
-TEST(RttiType, KnowsAClassAndWhatItDerivesFrom)
-{
-    struct Base
-    {
-        static RttiType const& getClassType() { return RttiGenType0<Base>::getInstance(); }
-    };
-    RttiType const& base = Base::getClassType();
-    RttiType const& derived = RttiGenType1<Derived, Base>::getInstance();
-    EXPECT_TRUE(base.isA(base) && derived.isA(derived) && derived.isA(base));
-    EXPECT_FALSE(base.isA(derived));
-    // As another library has it.
-    RttiType const copy(typeid(Base), nullptr);
-    EXPECT_TRUE(derived.isA(copy));
-    EXPECT_FALSE(copy.isA(derived));
-}
-
-TEST(PrdPredicate, AsksTheSecondOnlyWhereTheFirstHolds)
-{
-    int asked = 0;
-    PrdPredicate<int> const even([](int const& number) { return number % 2 == 0; });
-    PrdPredicate<int> const big(
-        [&asked](int const& number)
-        {
-            ++asked;
-            return number > 10;
-        });
-    PrdPredicate<int> const both = even && big;
-    EXPECT_TRUE(both.holds(12));
-    EXPECT_FALSE(both.holds(4));
-    EXPECT_FALSE(both.holds(13));
-    EXPECT_EQ(asked, 2);
-}
-
-TEST(Iterator, WalksOverWhatWasThereWhenItWasMade)
-{
-    std::vector<int> numbers{1, 2, 3};
-    Iterator<int> walk(numbers);
-    numbers.clear();
-    int sum = 0;
-    for (int round = 0; round < 2; ++round)
-        for (walk.first(); !walk.atEnd(); walk.next())
-            sum += walk.item();
-    EXPECT_EQ(sum, 12);
-    EXPECT_EQ(walk.getCardinality(), 3);
-    EXPECT_ANY_THROW(walk.item());
 }
 
 TEST(CbDataMethod, GoesOnWithDataThatIsReleasedWhileItRuns)

@@ -97,23 +97,6 @@ private:
 
 } // namespace
 
-TEST(XmlWriter, LaysADocumentOutByItsIndentation)
-{
-    std::ostringstream stream;
-    XmlWriter writer(stream, 2);
-    writer.openTag("Widget");
-    writer.writeAttrib("Name", "a<b");
-    writer.openTag("X1");
-    writer.writeAttrib("Value", -999);
-    writer.closeTag();
-    writer.writeTag("Text", "abc");
-    writer.writeTag("Int", -1);
-    writer.writeTag("Text", static_cast<char const*>(nullptr));
-    writer.closeTag();
-    EXPECT_EQ(stream.str(), "<Widget Name=\"a&lt;b\">\n  <X1 Value=\"-999\"/>\n  <Text>abc</Text>\n  <Int>-1</Int>\n"
-                            "  <Text/>\n</Widget>\n");
-}
-
 TEST(XmlWriter, IsReadBackExactly)
 {
     std::vector<std::string> const texts = {"",
@@ -387,14 +370,6 @@ TEST(LiStringUtil, NamesAndShowsATextThatIsNoUtf8)
     EXPECT_LT(words.size(), 200U);
 }
 
-TEST(LiString, KeepsItsBytes)
-{
-    EXPECT_TRUE(LiString(static_cast<char const*>(nullptr)).isEmpty());
-    EXPECT_EQ(LiString("a\0b"s).toString(), "a\0b"s);
-    EXPECT_NE(LiString("a\0b"s), LiString("a"));
-    EXPECT_STREQ(LiString("abc"s).getChars(), "abc");
-}
-
 TEST(OsFile, TellsSizesAndNamesWhatHasNone)
 {
     std::string const folder = testing::TempDir();
@@ -405,34 +380,4 @@ TEST(OsFile, TellsSizesAndNamesWhatHasNone)
     expectContains(wordsOf<ExBase>([&] { OsFile(OsFilePath(path)).getSize(); }), path);
     expectContains(wordsOf<ExBase>([&] { OsFile(OsFilePath(folder)).getSize(); }), folder);
     EXPECT_THROW(OsFile(OsFilePath()).getSize(), ExBase);
-}
-
-TEST(OsFile, LetsOneThreadAtATimeHandleDescriptors)
-{
-    int inside = 0;
-    int entries = 0;
-    auto const enterOften = [&]
-    {
-        for (int i = 0; i < 1000; ++i)
-        {
-            OsFile::FileDescriptorManipGuard const guard;
-            OsFile::FileDescriptorManipGuard const again;
-            entries += ++inside == 1 ? 1 : 0;
-            std::this_thread::yield();
-            --inside;
-        }
-    };
-    std::thread other(enterOften);
-    enterOften();
-    other.join();
-    EXPECT_EQ(entries, 2000);
-}
-
-TEST(OsFilePath, KeepsThePathAsGiven)
-{
-    EXPECT_TRUE(OsFilePath().isEmpty());
-    EXPECT_TRUE(OsFilePath(std::string()).isEmpty());
-    EXPECT_STREQ(OsFilePath("a//./b/"s).getChars(), "a//./b/");
-    EXPECT_EQ(OsFilePath("\xff"s).toString(), "\xff");
-    expectContains(wordsOf<ExBase>([] { OsFilePath("a\0b"s); }), "'a\\x00b'");
 }

@@ -80,8 +80,6 @@ def no_wait_is_endless():
 
 
 def run_script(text):
-    """Runs a script beside these tools in a process with an end of its own, and gives what it printed. Where the
-    address sanitizer watches it keeps next to nothing of what was freed, so that the memory tells what was not."""
+    """Runs a script beside these tools in a process with an end of its own, and gives what it printed."""
     signal.alarm(0)
-    sanitizer = os.environ.get('ASAN_OPTIONS', '') + ':quarantine_size_mb=1:thread_local_quarantine_size_kb=64'
-    return scripts.run_script(text, QT_QPA_PLATFORM=os.environ['QT_QPA_PLATFORM'], ASAN_OPTIONS=sanitizer)
+    return scripts.run_script(text, QT_QPA_PLATFORM=os.environ['QT_QPA_PLATFORM'])

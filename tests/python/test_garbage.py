@@ -2,6 +2,7 @@
 
 import gc
 import itertools
+import os
 import weakref
 
 import pytest
@@ -231,6 +232,7 @@ def test_many_rounds_leave_no_object_and_no_memory_behind(script):
     printed = run_script(script).split()
     objects, memory = ([int(number) for number in printed[start::2]] for start in (0, 1))
     assert objects[0] >= objects[1] >= objects[2]
-    # What the allocator still spreads is a fraction of a byte a round.
-    assert memory[2] - memory[1] < 512 << 10
-    assert memory[2] - memory[0] < 8 << 20
+    # The address sanitizer finds what is lost by itself, and its own books grow.
+    if 'libasan' not in os.environ.get('LD_PRELOAD', ''):
+        assert memory[2] - memory[1] < 512 << 10
+        assert memory[2] - memory[0] < 8 << 20

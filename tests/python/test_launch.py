@@ -191,23 +191,6 @@ def test_tab_goes_as_the_eye_does_and_past_what_takes_no_input(user):
     assert stops == ['Win', 'Vote', 'CloseButton_OK', 'CloseButton_Cancel', 'Win', 'Vote']
 
 
-def test_a_disabled_or_hidden_widget_takes_no_input(user):
-    dialog = make('OK', 'Cancel')
-    for name in 'Show', 'Win', 'CloseButton_OK':
-        dialog.enableWidget(name, False)
-    dialog.hideWidget('Prize')
-
-    def try_all(user):
-        assert not user.find('Prize').isVisible()
-        for name in 'Show', 'Win', 'CloseButton_OK', 'Prize':
-            user.click(name)
-            QTest.keyClicks(user.find(name), 'b ')
-
-    user.plan(try_all, lambda user: user.close('Cancel'))
-    assert dialog.launch() == 'CloseButton_Cancel'
-    assert dialog.getValues() == {'Show': '', 'Win': False, 'Prize': 'a', 'CloseButtonClicked': 'CloseButton_Cancel'}
-
-
 def test_a_dialog_can_be_launched_again_with_what_was_left_in_it(user):
     dialog = make('OK', 'Cancel')
     user.plan(lambda user: user.type('kept'), lambda user: user.close())

@@ -152,19 +152,6 @@ def test_methods_take_nothing_by_name(name):
         assert is_refused(getattr(dialog, name), *values[:index], **dict(zip(parameters[index:], values[index:])))
 
 
-@pytest.mark.parametrize('call', [
-    lambda dialog: ui.createDialog('t', XML, '400'), lambda dialog: ui.createDialog('t', XML, 400, '300'),
-    lambda dialog: ui.createDialog('t', XML, 400, 300, [('a', 'x')]),
-    lambda dialog: ui.showSimpleDialog('t', []), lambda dialog: ui.showSimpleDialog('t', [], '400'),
-    lambda dialog: ui.showMessageBox('t', ('a', 'b')), lambda dialog: ui.showMessageBox('t', ['a'], ('OK',)),
-    lambda dialog: dialog.addCallback('a', 23, print), lambda dialog: dialog.getValue(5),
-])
-def test_arguments_of_a_wrong_type_are_refused_before_anything_happens(call):
-    dialog = ui.createDialog('t', XML)
-    assert is_refused(call, dialog)
-    assert dialog.getValues() == {'a': ''}
-
-
 def test_a_dialog_has_no_constructor_for_scripts():
     with pytest.raises(RuntimeError):
         ui.Dialog()

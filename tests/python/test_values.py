@@ -79,12 +79,6 @@ def test_an_index_outside_the_menu_selects_nothing_and_an_empty_list_empties_it_
     assert dialog.getValue('Prize') is None and entries(dialog) == []
 
 
-def test_a_menu_takes_longer_tuples_and_kinds_of_tuple_and_list(write):
-    dialog = make()
-    write(dialog, 'Prize', namedtuple('Value', 'entries index rest')(type('Entries', (list,), {})('xyz'), 2, 'ignored'))
-    assert dialog.getValue('Prize') in 'zx' and entries(dialog)[-3:] == ['x', 'y', 'z']
-
-
 # A value that is refused, and the entries of the menu after setValue and after setValues.
 BAD_MENUS = [
     (['c'], TypeError, 'ab', 'ab'), (0, TypeError, 'ab', 'ab'), ('c', TypeError, 'ab', 'ab'),
@@ -125,14 +119,6 @@ def test_many_values_are_written_from_top_to_bottom_up_to_the_first_refused():
     dialog.setValues({})
     dialog.setValues({'unknown': 5, 'CloseButtonClicked': 5, 'CloseButton_OK': 5, 'A': 5, 'c': 'last'})
     assert dialog.getValues() == {'a': 'new', 'b': '', 'c': 'last'}
-
-
-def test_what_has_no_value_reads_as_none_and_takes_nothing():
-    dialog = make()
-    for name in 'Vote', 'Hint', 'Label_Show', 'CloseButton_OK', 'MainContainer', 'nobody', '', 'show':
-        assert dialog.getValue(name) is None
-        dialog.setValue(name, 5)
-    assert dialog.getValues() == START
 
 
 def test_widgets_of_one_name_are_read_and_written_by_their_order():
