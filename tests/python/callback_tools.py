@@ -14,6 +14,8 @@ from PyQt6.QtCore import QTimer
 EVENTS = (ui.EventType.ENABLE, ui.EventType.DISABLE, ui.EventType.STATE, ui.EventType.ACTIVATE,
           ui.EventType.VALUE_CHANGED)
 
+SAME_SCREEN = {name: os.environ[name] for name in ('DISPLAY', 'QT_QPA_PLATFORM') if name in os.environ}
+
 UNKNOWN = 'Cannot find widget: the specified widget does not exist.'
 
 
@@ -82,4 +84,4 @@ def no_wait_is_endless():
 def run_script(text):
     """Runs a script beside these tools in a process with an end of its own, and gives what it printed."""
     signal.alarm(0)
-    return scripts.run_script(text, QT_QPA_PLATFORM=os.environ['QT_QPA_PLATFORM'])
+    return scripts.run_script(text, **SAME_SCREEN)

@@ -82,8 +82,6 @@ MADE_BY = [closure, bound_method, stores_given_in_itself, stores_every_given_in_
            attribute_of_the_dialog, two_dialogs_crosswise]
 
 
-
-
 @pytest.mark.parametrize('launched', [False, True], ids=['never shown', 'launched'])
 @pytest.mark.parametrize('make', MADE_BY, ids=lambda make: make.__name__)
 def test_a_circle_through_the_callables_goes_in_every_order_of_letting_go(user, make, launched):
@@ -124,17 +122,6 @@ def test_a_second_object_of_the_dialog_keeps_its_callbacks_alive_and_at_work():
     gc.collect()
     given.pop().setValue('Toggle', True)
     assert heard == [True, False, True]
-
-
-def test_an_object_of_the_script_that_refers_to_the_dialog_keeps_it_whole():
-    keeper = Keeper(make_dialog())
-    heard = []
-    keeper.kept[0].addCallback('Toggle', STATE, lambda *_: heard.append(keeper.kept))
-    keeper.kept[0].addCallback('Toggle', STATE, Keeper(keeper).hear)
-    for _ in range(3):
-        gc.collect()
-    keeper.kept[0].setValue('Toggle', True)
-    assert heard == [keeper.kept]
 
 
 def test_a_callable_goes_with_its_removal_and_with_its_dialog():

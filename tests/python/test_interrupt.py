@@ -11,6 +11,7 @@ import time
 import pytest
 
 import scripts
+from callback_tools import SAME_SCREEN
 
 PRELUDE = '''
 import gc, time
@@ -80,7 +81,7 @@ def press_ctrl_c_in(script):
     """Runs the script on a terminal of its own, presses Ctrl-C there once it says that it is ready, and gives how long
     the interrupt took and what the script printed from then on."""
     ours, theirs = pty.openpty()
-    environment = scripts.environment(QT_QPA_PLATFORM=os.environ['QT_QPA_PLATFORM'])
+    environment = scripts.environment(**SAME_SCREEN)
     with subprocess.Popen([sys.executable, '-c', PRELUDE + script + EPILOGUE], env=environment, stdin=theirs,
                           stdout=subprocess.PIPE, stderr=subprocess.PIPE, text=True, start_new_session=True,
                           preexec_fn=lambda: fcntl.ioctl(0, termios.TIOCSCTTY, 0)) as process:

@@ -9,7 +9,7 @@ from quorvane_velmora import ui
 from PyQt6.QtCore import QPoint, QRect, Qt
 from PyQt6.QtGui import QCursor
 from PyQt6.QtTest import QTest
-from PyQt6.QtWidgets import QApplication, QComboBox, QToolTip
+from PyQt6.QtWidgets import QApplication, QToolTip
 
 ENABLE, DISABLE = ui.EventType.ENABLE, ui.EventType.DISABLE
 
@@ -42,26 +42,6 @@ def test_every_operation_acts_at_once_before_in_and_after_a_run(user):
         user.plan(lambda someone: go_through_every_operation(dialog, someone), close)
         dialog.launch()
         go_through_every_operation(dialog)
-
-
-def test_what_was_hidden_or_disabled_between_runs_is_so_in_the_next(user):
-    dialog = make_dialog()
-    dialog.hideWidget('Text')
-    dialog.enableWidget('Toggle', False)
-    seen = []
-
-    def look(someone):
-        seen.append([(someone.find(name).isVisible(), someone.find(name).isEnabled())
-                     for name in ('Text', 'Toggle', 'Menu')])
-
-    user.plan(look, close)
-    dialog.launch()
-    dialog.showWidget('Text')
-    dialog.enableWidget('Toggle', True)
-    dialog.hideWidget('Menu')
-    user.plan(look, close)
-    dialog.launch()
-    assert seen == [[(False, True), (True, False), (True, True)], [(True, True), (True, True), (False, True)]]
 
 
 OPERATIONS = [('isEnabled',), ('enableWidget', True), ('isDisplayed',), ('showWidget',), ('hideWidget',),
@@ -133,21 +113,6 @@ def test_escape_presses_the_only_button_that_is_left_when_the_others_are_hidden(
     assert dialog.launch() == 'CloseButton_OK'
 
 
-def test_a_hidden_or_disabled_widget_still_takes_values_from_the_script(user):
-    dialog = make_dialog()
-    dialog.hideWidget('Text')
-    dialog.enableWidget('Menu', False)
-    dialog.setValues({'Text': 'new', 'Toggle': True})
-    dialog.setValue('Menu', (['c', 'd'], 1))
-    shown = []
-    user.plan(lambda _: dialog.showWidget('Text'),
-              lambda someone: shown.extend([someone.find('Text').text(), someone.find('Menu', QComboBox).currentText()]),
-              close)
-    dialog.launch()
-    assert shown == ['new', 'd']
-    assert dialog.getValues() == {'Text': 'new', 'Toggle': True, 'Menu': 'd', 'CloseButtonClicked': 'CloseButton_OK'}
-
-
 def test_a_hidden_widget_is_shown_where_its_constraint_says(user):
     dialog, other = make_dialog(), make_dialog()
     names = ['Text', 'Button', 'CloseButton_Cancel', 'UserDefinedWidgetsContainer']
@@ -189,23 +154,6 @@ def test_only_a_real_change_of_the_enabled_state_raises_an_event(user):
     user.plan(change, close)
     dialog.launch()
     assert heard == [('Toggle', DISABLE), ('Toggle', ENABLE)] * 2
-
-
-def test_one_widget_enables_another(user):
-    dialog = make_dialog()
-    dialog.enableWidget('Text', False)
-    dialog.addCallback('Toggle', ui.EventType.STATE,
-                       lambda given, name, _: given.enableWidget('Text', given.getValue(name)))
-
-    def edit(someone):
-        someone.click('Text')
-        someone.press(Qt.Key.Key_End)
-        someone.type('er')
-
-    user.plan(edit, lambda someone: someone.click('Toggle'), edit, lambda someone: someone.click('Toggle'), edit, close)
-    dialog.launch()
-    assert dialog.getValue('Text') == 'older'
-    assert dialog.isEnabled('Text') is False
 
 
 TOOLTIPS = '<Tooltips><Tooltip Widget="Toggle">Tick &lt;b&gt; &amp; go</Tooltip>' \
