@@ -1,7 +1,5 @@
 #include "native/qtFocusOrder.h"
 
-#include <QCheckBox>
-#include <QComboBox>
 #include <QLineEdit>
 #include <QPushButton>
 #include <QScrollArea>
@@ -61,10 +59,11 @@ void sortAsTheEyeGoes(std::vector<Stop>& stops)
     }
 }
 
+constexpr char const* valueMark = "kvHoldsValue";
+
 bool holdsValue(QWidget const* widget)
 {
-    return qobject_cast<QLineEdit const*>(widget) || qobject_cast<QCheckBox const*>(widget) ||
-           qobject_cast<QComboBox const*>(widget);
+    return widget->property(valueMark).toBool();
 }
 
 bool isPushButton(QWidget const* widget)
@@ -91,6 +90,11 @@ QWidget* QtFocusOrder::getNext(QWidget const* current) const
 QWidget* QtFocusOrder::getPrevious(QWidget const* current) const
 {
     return step(current, -1);
+}
+
+void QtFocusOrder::markAsValue(QWidget& widget)
+{
+    widget.setProperty(valueMark, true);
 }
 
 QWidget* QtFocusOrder::getFirst() const

@@ -19,6 +19,9 @@ public:
     QWidget* getNext(QWidget const* current) const;
     QWidget* getPrevious(QWidget const* current) const;
 
+    /// Says that a widget holds a value: such a one has the keyboard first.
+    static void markAsValue(QWidget& widget);
+
     /// The first widget that holds a value, else the first push button, else null.
     QWidget* getFirst() const;
 

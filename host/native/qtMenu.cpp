@@ -1,5 +1,6 @@
 #include "native/qtMenu.h"
 
+#include "native/qtFocusOrder.h"
 #include "native/qtLabel.h"
 #include "native/qtText.h"
 
@@ -25,6 +26,7 @@ class ComboBox final : public QComboBox
 public:
     ComboBox(QWidget* parent, QtListenerHandle<NtMenuListener> const& handle) : QComboBox(parent), _handle(handle)
     {
+        QtFocusOrder::markAsValue(*this);
         // The wheel alone must not take the keyboard.
         setFocusPolicy(Qt::StrongFocus);
         setMaxVisibleItems(maxShown);

@@ -1,5 +1,6 @@
 #include "native/qtTextField.h"
 
+#include "native/qtFocusOrder.h"
 #include "native/qtLabel.h"
 #include "native/qtText.h"
 
@@ -19,6 +20,7 @@ class LineEdit final : public QLineEdit
 public:
     LineEdit(QWidget* parent, QtListenerHandle<NtTextFieldListener> const& handle) : QLineEdit(parent), _handle(handle)
     {
+        QtFocusOrder::markAsValue(*this);
         setMaxLength(std::numeric_limits<int>::max());
         connect(this, &QLineEdit::textEdited, this, [this] { tellEdited(); });
         connect(this, &QLineEdit::returnPressed, this, [this] { tellEnded(); });

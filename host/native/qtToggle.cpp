@@ -1,5 +1,7 @@
 #include "native/qtToggle.h"
 
+#include "native/qtFocusOrder.h"
+
 namespace Kv
 {
 
@@ -11,6 +13,7 @@ class CheckBox final : public QCheckBox
 public:
     CheckBox(QWidget* parent, QtListenerHandle<NtToggleListener> const& handle) : QCheckBox(parent), _handle(handle)
     {
+        QtFocusOrder::markAsValue(*this);
         setFocusPolicy(Qt::StrongFocus);
         connect(this, &QCheckBox::clicked, this, [this](bool state) { tellToggled(state); });
     }
