@@ -111,7 +111,7 @@ def test_names_stand_in_the_order_of_their_registration():
         return [name for name in vars(scope) if not name.startswith('_')]
 
     functions = list(FUNCTIONS)
-    assert public(ui) == functions[:5] + ['EventType', 'Dialog'] + functions[5:] + ['UiError']
+    assert public(ui) == functions[:5] + ['EventType', 'Dialog', 'CursorGuard', 'BrowserScheme'] + functions[5:] + ['UiError']
     assert public(ui.Dialog) == list(METHODS)
     assert [(name, int(value)) for name, value in ui.EventType.names.items()] == [
         ('ENABLE', 1), ('DISABLE', 2), ('STATE', 22), ('ACTIVATE', 23), ('VALUE_CHANGED', 24)]

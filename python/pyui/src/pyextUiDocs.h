@@ -280,4 +280,28 @@ constexpr char const* disableNextClose =
     R"(Keeps the dialog open at the next press of a close button, and only at that. Called in an C{ACTIVATE} callback of a
 close button, it holds for the press that the callback runs for.)";
 
+constexpr char const* cursorGuard =
+    R"(Changes the current cursor to an alternate cursor, automatically reverting to previous cursor when going out of scope.
+A cursor is named by a C{str}: C{'normal'}, known as C{Cursor.NORMAL}, or C{'busy'}, known as C{Cursor.BUSY}. Example::
+
+    def render():
+        cg = ui.CursorGuard( 'busy' )
+        for frame in frames:
+            renderFrame( frame )
+
+    def ask():
+        cg = ui.CursorGuard( 'normal' )
+        return ui.showMessageBox( 'Render', [ 'Go on ?' ], [ 'Yes', 'No' ] ))";
+
+constexpr char const* cursorGuardInit =
+    R"(Makes a cursor the current one.
+
+@param cursor: The name of the cursor.
+@type cursor: C{str}
+@raise RuntimeError: If there is no cursor of that name; the words list the names.)";
+
+constexpr char const* browserScheme =
+    R"(The constants of this class define the various browser schemes, that is the types of entity that can be browsed. There
+are no instances of it.)";
+
 } // namespace Kv::PyextUi::Docs

@@ -1,11 +1,13 @@
 #include <boost/python.hpp>
 
 #include "appUi/uiAppMgr.h"
+#include "internalAPI/piBrowserSchemes.h"
 #include "pyCompat.h"
 #include "pyConvenienceFunctions.h"
 #include "pyManagedDialog.h"
 #include "pyUiError.h"
 #include "pyextUiDocs.h"
+#include "ui/uiCursorGuard.h"
 
 #include <string>
 
@@ -125,6 +127,27 @@ void registerDialog()
         .def("disableNextClose", &Dialog::disableNextClose, Docs::disableNextClose);
 }
 
+void registerCursorGuard()
+{
+    if (shareClass<UiCursorGuard>("CursorGuard"))
+        return;
+    bp::class_<UiCursorGuard, boost::noncopyable>("CursorGuard", Docs::cursorGuard,
+                                                  bp::init<std::string>(Docs::cursorGuardInit));
+}
+
+void registerBrowserScheme()
+{
+    if (shareClass<PiBrowserSchemes>("BrowserScheme"))
+        return;
+    bp::class_<PiBrowserSchemes> scheme("BrowserScheme", Docs::browserScheme, bp::no_init);
+    scheme.attr("FILE_SYSTEM") = PiBrowserSchemes::FsScheme.toString();
+    scheme.attr("GANTRY") = PiBrowserSchemes::GantryScheme.toString();
+    scheme.attr("TOOLS") = PiBrowserSchemes::PluginToolScheme.toString();
+    scheme.attr("VIEWS") = PiBrowserSchemes::PluginViewScheme.toString();
+    scheme.attr("PICK_LIST") = PiBrowserSchemes::PicklistScheme.toString();
+    scheme.attr("BOOKMARKS") = PiBrowserSchemes::BookmarkScheme.toString();
+}
+
 void registerExceptions()
 {
     UiError::initialize("ui", "UiError");
@@ -138,6 +161,8 @@ void moduleBody()
     defineFunctions();
     registerEventType();
     registerDialog();
+    registerCursorGuard();
+    registerBrowserScheme();
     bp::def("instantiateAppMgr", &instantiateAppMgr);
     registerExceptions();
     bp::scope().attr("__doc__") = Docs::module;

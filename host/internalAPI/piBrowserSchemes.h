@@ -1,0 +1,21 @@
+#pragma once
+
+#include "internalAPI/kvInternalApiExport.h"
+#include "resmgt/liString.h"
+
+namespace Kv
+{
+
+/// The kinds of entity that a browser can show, by the names that browsers know them by.
+class KVINTERNALAPI_API PiBrowserSchemes
+{
+public:
+    static LiString const FsScheme;
+    static LiString const GantryScheme;
+    static LiString const PluginToolScheme;
+    static LiString const PluginViewScheme;
+    static LiString const PicklistScheme;
+    static LiString const BookmarkScheme;
+};
+
+} // namespace Kv
