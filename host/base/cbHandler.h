@@ -41,12 +41,8 @@ public:
 
     CbDataMethod(Object* object, Method method, Data data) : _object(object), _method(method), _data(std::move(data)) {}
 
-    /// Works on a copy of the data: a call under way goes on with it when `releaseData` comes in between.
-    void call(Event& event) override
-    {
-        Data const data = _data;
-        (_object->*_method)(event, data);
-    }
+    /// The method gets a copy of the data: a call under way goes on with it when `releaseData` comes in between.
+    void call(Event& event) override { (_object->*_method)(event, _data); }
 
     /// Lets the data go, which breaks a cycle of data that owns its handler.
     void releaseData() { _data = Data(); }

@@ -221,13 +221,6 @@ TEST(XmlDocument, DecodesReferencesAndLineEnds)
     EXPECT_EQ(root.getText(), "\n1\n2\r\n\">]] &amp;\n<\xf0\x9f\x98\x80");
 }
 
-TEST(XmlDocument, HasNoRootWhereThereIsNoElement)
-{
-    for (char const* const text : {"", " \r\n", "\xef\xbb\xbf", "<!-- a -->\n", "<?xml version=\"1.0\"?>", "<?a?>"})
-        EXPECT_TRUE(XmlDocument(text).getRoot().isNull()) << text;
-    EXPECT_THROW(XmlDocument("").getRoot()->getName(), ExNullPtr);
-}
-
 TEST(XmlDocument, RefusesWhatIsNotOneWholeElement)
 {
     expectRefused("hello", 1, "text outside of the root element: 'hello");

@@ -69,21 +69,6 @@ std::string nameOf(int number)
 
 } // namespace
 
-TEST_F(Dispatch, RunsTheHandlersOfTheEventInOrderOfRegistration)
-{
-    Handler a(note("a"));
-    Handler b(note("b"));
-    for (Handler* const handler : {&a, &b, &a})
-        widget->addCallback(PiWidget::State, handler);
-    widget->addCallback(PiWidget::Activate, &b);
-    widget->fire(PiWidget::State);
-    EXPECT_EQ(heard, "aba");
-    EXPECT_TRUE(widget->removeCallback(PiWidget::State, &a));
-    EXPECT_FALSE(widget->removeCallback(PiWidget::Enable, &a));
-    widget->fire(PiWidget::State);
-    EXPECT_EQ(heard, "ababa");
-}
-
 TEST_F(Dispatch, IsNotDisturbedByHandlersThatComeAndGo)
 {
     Handler last(note("l"));
@@ -108,24 +93,6 @@ TEST_F(Dispatch, IsNotDisturbedByHandlersThatComeAndGo)
     EXPECT_EQ(heard, "cln|l");
     widget->fire(PiWidget::State);
     EXPECT_EQ(heard, "cln|lln");
-}
-
-TEST_F(Dispatch, LetsExceptionsThroughAndStaysWhole)
-{
-    Handler last(note("l"));
-    Handler failing(
-        [&](EvEvent& event)
-        {
-            widget->removeCallback(event.getType(), &failing);
-            throw std::string("thrown");
-        });
-    widget->addCallback(PiWidget::State, &failing);
-    widget->addCallback(PiWidget::State, &last);
-    EXPECT_THROW(widget->fire(PiWidget::State), std::string);
-    EXPECT_EQ(heard, "");
-    EXPECT_FALSE(widget->removeCallback(PiWidget::State, &failing));
-    widget->fire(PiWidget::State);
-    EXPECT_EQ(heard, "l");
 }
 
 TEST_F(Dispatch, OutlivesTheLastReferenceToTheWidget)

@@ -94,14 +94,6 @@ def test_an_exception_comes_out_of_the_setter_that_raised_the_event(user, except
     assert caught == [(exception, ['callback', 'deep_inside'], True)] * 2
 
 
-def test_an_exception_of_a_disabling_operation_comes_out_of_it():
-    dialog = make_dialog()
-    dialog.addCallback('Toggle', ui.EventType.DISABLE, raising(ValueError('of the script')))
-    with pytest.raises(ValueError, match='of the script'):
-        dialog.enableWidget('Toggle', False)
-    assert dialog.isEnabled('Toggle') is False
-
-
 def test_the_window_of_a_run_that_failed_goes_with_its_dialog(user):
     before = set(QApplication.allWidgets())
     dialog = make_dialog()

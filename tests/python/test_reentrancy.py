@@ -195,24 +195,6 @@ def test_a_callback_launches_a_dialog_from_which_another_is_launched(patient):
     assert open_windows() == []
 
 
-def test_a_window_below_takes_no_input_while_a_callback_has_another_open(patient):
-    outer, inner = make_dialog('outer'), make_dialog('inner')
-    heard = listen(outer, 'Toggle', 'Text', 'CloseButton_OK')
-    outer.addCallback('Button', ACTIVATE, lambda *_: inner.launch())
-
-    def disturb(user):
-        below, = (window for window in QApplication.topLevelWidgets() if window.windowTitle() == 'outer')
-        user.window = lambda: below
-        for name in ('Toggle', 'Text', 'CloseButton_OK'):
-            user.click(name)
-        del user.window
-        below.close()
-
-    patient.plan(click('Button'), disturb, close, lambda user: heard.append(user.window().windowTitle()), close)
-    assert outer.launch() == 'CloseButton_OK'
-    assert heard == ['outer', ('CloseButton_OK', ACTIVATE)]
-
-
 def test_a_callback_launches_its_own_dialog_again(patient):
     dialog = make_dialog()
     order = []
