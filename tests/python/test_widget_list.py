@@ -122,6 +122,12 @@ def test_numbers_that_stand_for_the_column_while_it_is_unknown_become_it_everywh
     assert texts(root, 'm') == ['8'] and texts(root, 'CloseButton_8') == ['8']
 
 
+def test_three_close_buttons_stand_side_by_side():
+    root = make([], 'A', 'B', 'C')
+    assert [places(root, 'CloseButton_' + label)[:3] for label in 'ABC'] == [
+        [x + ' u l', '0 u b', '12 u w'] for x in ('0', '14', '28')]
+
+
 def test_nothing_is_checked_for_being_there_only_once():
     root = make([('TextField', 'a', 'x'), ('TextField', 'a', 'x')], 'A', 'A', '')
     assert [element.get('Name') for element in root.iter('Widget')] == [
