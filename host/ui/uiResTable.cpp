@@ -4,6 +4,7 @@
 #include "resmgt/xmlError.h"
 
 #include <dlfcn.h>
+#include <filesystem>
 #include <fstream>
 #include <iterator>
 #include <vector>
@@ -25,18 +26,11 @@ fs::path installedFolder()
     return fs::path(info.dli_fname).parent_path() / "../resources/tooltips";
 }
 
-std::vector<fs::path>& resourceFolders()
-{
-    static std::vector<fs::path> folders{installedFolder()};
-    return folders;
-}
-
 std::vector<fs::path> candidatesFor(fs::path const& name)
 {
     std::vector<fs::path> bases{name};
     if (!name.has_parent_path())
-        for (fs::path const& folder : resourceFolders())
-            bases.push_back(folder / name);
+        bases.push_back(installedFolder() / name);
     std::vector<fs::path> candidates;
     for (fs::path const& base : bases)
     {
@@ -94,11 +88,6 @@ UiResTable UiResTable::load(std::string const& resourceName)
             throw ExBase(__FILE__, __LINE__, "Tooltip resource " + file->string() + ": " + error.getReason());
         }
     return table;
-}
-
-void UiResTable::addFolder(std::filesystem::path const& folder)
-{
-    resourceFolders().insert(resourceFolders().begin(), folder);
 }
 
 std::optional<std::string> UiResTable::findTooltip(std::string const& widgetName) const

@@ -2,7 +2,6 @@
 
 #include "ui/kvUiExport.h"
 
-#include <filesystem>
 #include <optional>
 #include <string>
 #include <unordered_map>
@@ -15,13 +14,10 @@ namespace Kv
 class KVUI_API UiResTable
 {
 public:
-    /// Reads the resource of that name: a path, or a bare name that is looked for in the application's resource
-    /// folders, each with or without the extension ".xml". One that is not there gives an empty table. Throws an
+    /// Reads the resource of that name: a path, or a bare name that is looked for in the application's folder of
+    /// tooltips, each with or without the extension ".xml". One that is not there gives an empty table. Throws an
     /// `ExBase` with file and line for a file that is no tooltip resource.
     static UiResTable load(std::string const& resourceName);
-
-    /// A further folder to look in, ahead of those there are.
-    static void addFolder(std::filesystem::path const& folder);
 
     std::optional<std::string> findTooltip(std::string const& widgetName) const;
 

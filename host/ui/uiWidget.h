@@ -79,7 +79,7 @@ public:
     void setTooltip(std::string const& text);
 
     /// Loads the tooltips of a resource and gives the widget the one under its name. The resource is a path, or a bare
-    /// name to be found in the application's resource folders, with or without extension. One that is not there, or
+    /// name to be found in the application's folder of tooltips, with or without extension. One that is not there, or
     /// does not name the widget, is no error and changes nothing.
     static void setWidgetResTable(RCShdPtr<UiWidget> const& widget, std::string const& resourceName);
 

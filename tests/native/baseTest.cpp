@@ -1,15 +1,11 @@
 #include "base/assertions.h"
 #include "base/cbHandler.h"
-#include "base/iterator.h"
-#include "base/prdPredicate.h"
 #include "base/rcShdPtr.h"
 #include "base/rcStrongPtr.h"
-#include "base/rttiType.h"
 
 #include <gtest/gtest.h>
 #include <memory>
 #include <string>
-#include <type_traits>
 #include <vector>
 
 using namespace Kv;

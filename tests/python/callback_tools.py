@@ -59,9 +59,7 @@ class PatientUser(User):
 def patient():
     someone = PatientUser()
     yield someone
-    someone.stop()
-    if someone.failures:
-        pytest.fail('\n'.join(someone.failures), pytrace=False)
+    someone.judge()
 
 
 @pytest.fixture(autouse=True)

@@ -14,9 +14,7 @@ from user import User
 def user():
     someone = User()
     yield someone
-    someone.stop()
-    if someone.failures:
-        pytest.fail('\n'.join(someone.failures), pytrace=False)
+    someone.judge()
 
 
 @pytest.fixture

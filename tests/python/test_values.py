@@ -1,7 +1,5 @@
 """The values of widgets, as scripts read and write them."""
 
-from collections import namedtuple
-
 import pytest
 
 from descriptions import close_button, container, text, widget

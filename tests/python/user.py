@@ -3,6 +3,8 @@
 import traceback
 from contextlib import contextmanager
 
+import pytest
+
 from quorvane_velmora import ui
 from PyQt6.QtCore import QTimer, Qt
 from PyQt6.QtTest import QTest
@@ -37,6 +39,12 @@ class User:
         if self._steps:
             self.failures.append('%d steps were never reached' % len(self._steps))
             self._steps.clear()
+
+    def judge(self):
+        """The end of a test: what went wrong fails it."""
+        self.stop()
+        if self.failures:
+            pytest.fail('\n'.join(self.failures), pytrace=False)
 
     @contextmanager
     def meanwhile(self, *steps):
