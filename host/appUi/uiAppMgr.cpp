@@ -13,7 +13,23 @@ UiAppMgr& UiAppMgr::getInstance()
 
 RCShdPtr<UiTopLevel> UiAppMgr::getTopLevel() const
 {
-    return nullptr;
+    return _mainWindow;
+}
+
+RCShdPtr<UiMainWindow> UiAppMgr::getMainWindow() const
+{
+    return _mainWindow;
+}
+
+RCShdPtr<UiPanel> UiAppMgr::getMainPanel() const
+{
+    return _mainPanel;
+}
+
+void UiAppMgr::setApplication(RCShdPtr<UiMainWindow> const& window, RCShdPtr<UiPanel> const& panel)
+{
+    _mainWindow = window;
+    _mainPanel = panel;
 }
 
 void UiAppMgr::setTopLevel(RCShdPtr<UiTopLevel> const& window)

@@ -2,7 +2,8 @@
 
 #include "appUi/kvAppUiExport.h"
 #include "base/rcShdPtr.h"
-#include "ui/uiTopLevel.h"
+#include "ui/uiMainWindow.h"
+#include "ui/uiPanel.h"
 
 #include <memory>
 #include <vector>
@@ -19,6 +20,15 @@ public:
     /// The application's window. Null in a standalone interpreter, also while a window of a script's own is told.
     RCShdPtr<UiTopLevel> getTopLevel() const;
 
+    /// The application's window under its own class; null in a standalone interpreter.
+    RCShdPtr<UiMainWindow> getMainWindow() const;
+
+    /// The panel of the application's window in which dialogs float; null in a standalone interpreter.
+    RCShdPtr<UiPanel> getMainPanel() const;
+
+    /// For the application: from here on it is there, with this window and this panel in it. Null pointers take it away.
+    void setApplication(RCShdPtr<UiMainWindow> const& window, RCShdPtr<UiPanel> const& panel);
+
     /// Tells of a window of its own that is about to be shown. It stays above the one told before it that is still
     /// shown, and is only remembered, not kept.
     void setTopLevel(RCShdPtr<UiTopLevel> const& window);
@@ -28,6 +38,9 @@ public:
 
 private:
     void forgetHidden();
+
+    RCShdPtr<UiMainWindow> _mainWindow;
+    RCShdPtr<UiPanel> _mainPanel;
 
     /// Told and not yet released, the latest last.
     std::vector<std::weak_ptr<UiTopLevel>> _told;
