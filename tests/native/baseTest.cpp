@@ -7,6 +7,7 @@
 
 #include <gtest/gtest.h>
 #include <memory>
+#include <sstream>
 #include <string>
 #include <vector>
 
@@ -95,6 +96,36 @@ TEST(RCShdPtr, SurvivesAnObjectThatLetsGoOfItselfByItsOwnEnd)
     EXPECT_EQ(alive, 1);
     circle->next.reset();
     EXPECT_EQ(alive, 0);
+}
+
+TEST(RCShdPtr, DumpsWhatItPointsAt)
+{
+    struct Before
+    {
+        virtual ~Before() = default;
+    };
+    struct Behind : Before, Counted
+    {
+        using Counted::Counted;
+    };
+    static_assert(sizeof(RCShdPtr<Behind>) == sizeof(void*));
+    auto const dumpOf = [](auto const& pointer)
+    {
+        std::ostringstream stream;
+        pointer.dump(stream);
+        return stream.str();
+    };
+    EXPECT_EQ(dumpOf(RCShdPtr<Counted>()), "Pointee type = null, T type = (anonymous namespace)::Counted, ref: 0, "
+                                           "pointer:0, RCBase pointer: 0");
+    int alive = 0;
+    RCShdPtr<Behind> const object = makeShd<Behind>(&alive);
+    RCShdPtr<Counted> const other = object;
+    std::ostringstream wanted;
+    wanted << ", ref: 2, pointer:" << static_cast<void*>(object.get())
+           << ", RCBase pointer: " << static_cast<RCBase<LkCounter<int>>*>(object.get());
+    EXPECT_NE(static_cast<void*>(object.get()), static_cast<RCBase<LkCounter<int>>*>(object.get()));
+    EXPECT_NE(dumpOf(object).find(wanted.str()), std::string::npos) << dumpOf(object);
+    EXPECT_NE(dumpOf(other).find("Behind, T type = (anonymous namespace)::Counted, ref: 2"), std::string::npos);
 }
 
 template <typename Exception> class Exceptions : public testing::Test
