@@ -1,5 +1,7 @@
 #include "base/assertions.h"
 #include "base/cbHandler.h"
+#include "base/constIterator.h"
+#include "base/iterator.h"
 #include "base/rcShdPtr.h"
 #include "base/rcStrongPtr.h"
 #include "base/rcWeakAccessor.h"
@@ -188,4 +190,87 @@ TEST(CbDataMethod, GoesOnWithDataThatIsReleasedWhileItRuns)
     }
     EXPECT_EQ(owner.heard, (std::vector<std::string>{"kept", "nothing"}));
     EXPECT_EQ(event, 2);
+}
+
+namespace
+{
+
+using Words = std::vector<std::string>;
+
+Words walk(Iterator<std::string> iterator)
+{
+    Words words;
+    for (iterator.first(); !iterator.atEnd(); iterator.next())
+        words.push_back(iterator.item());
+    return words;
+}
+
+} // namespace
+
+TEST(Iterator, WalksInBothDirectionsAndNeverOutOfItsSequence)
+{
+    Iterator<std::string> iterator(Words{"a", "b", "c"});
+    EXPECT_EQ(iterator.getCardinality(), 3);
+    EXPECT_EQ(*iterator++, "a");
+    EXPECT_EQ(*++iterator, "c");
+    EXPECT_EQ(iterator->size(), 1U);
+    iterator.end();
+    EXPECT_THROW(iterator.item(), ExAssertionFailed);
+    EXPECT_EQ((++iterator).getCardinality(), 3);
+    EXPECT_EQ(*--iterator, "c");
+    EXPECT_EQ(*iterator--, "c");
+    EXPECT_FALSE(iterator.atBegin());
+    EXPECT_EQ(*--iterator, "a");
+    EXPECT_TRUE((--iterator).atBegin());
+    iterator.last();
+    EXPECT_EQ(*iterator, "c");
+    Iterator<std::string> none((Words()));
+    none.last();
+    EXPECT_TRUE(none.atBegin() && none.atEnd());
+}
+
+TEST(Iterator, SharesItsSequenceWithCopiesUntilOneOfThemChanges)
+{
+    struct CountingImp : IteratorVectorImp<std::string>
+    {
+        CountingImp(Words items, int* clones) : IteratorVectorImp(std::move(items)), _clones(clones) {}
+        RCShdPtr<IteratorImp<std::string>> clone() const override
+        {
+            ++*_clones;
+            return makeShd<CountingImp>(*this);
+        }
+        int* _clones;
+    };
+    int clones = 0;
+    Iterator<std::string> first(RCShdPtr<IteratorImp<std::string>>(new CountingImp({"a", "b"}, &clones)));
+    first.next();
+    Iterator<std::string> second(first);
+    Iterator<std::string> const third = second;
+    EXPECT_EQ(*third, "b");
+    EXPECT_EQ(clones, 0);
+    second.item() = "changed";
+    second.first();
+    EXPECT_EQ(clones, 1);
+    EXPECT_EQ(third.item(), "b");
+    EXPECT_EQ(walk(first), (Words{"a", "b"}));
+    EXPECT_EQ(walk(second), (Words{"a", "changed"}));
+    EXPECT_EQ(third->size(), 1U);
+}
+
+TEST(Iterator, WithoutAnEngineSaysSo)
+{
+    Iterator<std::string> null;
+    EXPECT_THROW(null.atEnd(), ExNullPtr);
+    EXPECT_THROW(null.first(), ExNullPtr);
+    EXPECT_THROW(null++, ExNullPtr);
+}
+
+TEST(ConstIterator, LeavesItsCopiesWhereTheyAre)
+{
+    ConstIterator<int> iterator(std::vector<int>{1, 2});
+    ConstIterator<int> const start = iterator;
+    EXPECT_EQ(*++iterator, 2);
+    EXPECT_EQ(*start, 1);
+    EXPECT_TRUE((++iterator).atEnd());
+    EXPECT_THROW(*iterator, ExAssertionFailed);
 }
