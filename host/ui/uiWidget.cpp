@@ -172,4 +172,20 @@ void UiWidget::placePeer()
     _peer->setCell(_rect.xMin - parent.xMin, parent.yMax - _rect.yMax, _rect.getWidth(), _rect.getHeight());
 }
 
+RCShdPtr<RCBase<LkCounter<int>>> const* UiWidget::getClientDataListPtr() const
+{
+    return _clientData.data();
+}
+
+int UiWidget::getClientDataListSize() const
+{
+    return static_cast<int>(_clientData.size());
+}
+
+void UiWidget::addClientData(RCShdPtr<RCBase<LkCounter<int>>> const& data)
+{
+    requireUiThread();
+    _clientData.push_back(data);
+}
+
 } // namespace Kv
