@@ -29,8 +29,8 @@ RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::open(OsFile
     OsFilePath const canonical = path.getCanonical();
     if (auto const known = find(canonical); known != _compositions.end())
     {
-        RCStrongPtr<FwComposition> const composition = *known;
-        setCurrent(composition);
+        RCWeakPtr<const PiCompositionGraphInterface> const composition = *known;
+        setCurrent(*known);
         return composition;
     }
     RCStrongPtr<FwComposition> const composition = FwComposition::open(canonical);
@@ -44,10 +44,9 @@ RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::open(OsFile
 
 void UiCompositionWorkspace::close(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
 {
-    auto const place = require(composition);
-    RCStrongPtr<FwComposition> const closing = *place;
+    RCStrongPtr<FwComposition> const closing = require(composition);
     closing->setListener(nullptr);
-    auto const next = _compositions.erase(place);
+    auto const next = _compositions.erase(find(closing->getPath()));
     bool const wasCurrent = closing.get() == _current.get();
     if (wasCurrent && _compositions.empty())
         _current = nullptr;
@@ -62,14 +61,12 @@ void UiCompositionWorkspace::close(RCWeakPtr<const PiCompositionGraphInterface> 
 
 void UiCompositionWorkspace::save(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
 {
-    RCStrongPtr<FwComposition> const saved = *require(composition);
-    saved->save();
+    require(composition)->save();
 }
 
 void UiCompositionWorkspace::makeCurrent(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
 {
-    RCStrongPtr<FwComposition> const current = *require(composition);
-    setCurrent(current);
+    setCurrent(require(composition));
 }
 
 UPtr<UiWidget> UiCompositionWorkspace::getFocus() const
@@ -137,16 +134,13 @@ UiCompositionWorkspace::Compositions::const_iterator UiCompositionWorkspace::fin
                         { return composition->getPath() == path; });
 }
 
-/// Never the end of the list.
-UiCompositionWorkspace::Compositions::const_iterator
+RCStrongPtr<FwComposition>
 UiCompositionWorkspace::require(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const
 {
-    auto const place = std::find_if(_compositions.begin(), _compositions.end(),
-                                    [&composition](RCStrongPtr<FwComposition> const& open)
-                                    { return RCWeakPtr<const PiCompositionGraphInterface>(open) == composition; });
-    if (place == _compositions.end())
-        throw ExBase(__FILE__, __LINE__, "The composition is not open: it has been closed");
-    return place;
+    for (RCStrongPtr<FwComposition> const& open : _compositions)
+        if (RCWeakPtr<const PiCompositionGraphInterface>(open) == composition)
+            return open;
+    throw ExBase(__FILE__, __LINE__, "The composition is not open: it has been closed");
 }
 
 void UiCompositionWorkspace::setCurrent(RCStrongPtr<FwComposition> const& composition)

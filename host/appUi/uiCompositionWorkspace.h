@@ -66,7 +66,7 @@ private:
     void compositionSaved(FwComposition const& composition) override;
 
     Compositions::const_iterator find(OsFilePath const& path) const;
-    Compositions::const_iterator require(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const;
+    RCStrongPtr<FwComposition> require(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const;
     void setCurrent(RCStrongPtr<FwComposition> const& composition);
 
     FocusFinder _findFocus;

@@ -54,8 +54,6 @@ protected:
         folder = fs::canonical(mkdtemp(name.data()));
         fs::current_path(folder);
     }
-    Compositions(Compositions const&) = delete;
-    Compositions& operator=(Compositions const&) = delete;
     ~Compositions() override
     {
         fs::current_path("/");
@@ -241,7 +239,7 @@ TEST_F(Compositions, AreAsTheyWereOnADiskThatIsFull)
     setrlimit(RLIMIT_FSIZE, &little);
     std::string const words = wordsOf([&] { composition->save(); });
     setrlimit(RLIMIT_FSIZE, &old);
-    std::signal(SIGXFSZ, oldHandler);
+    static_cast<void>(std::signal(SIGXFSZ, oldHandler));
     expectContains(words, "shot.vmcomposition': File too large");
     EXPECT_EQ(read("shot.vmcomposition"), grade);
     EXPECT_EQ(listFiles(), std::vector<std::string>{"shot.vmcomposition"});
