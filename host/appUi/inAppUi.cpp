@@ -3,7 +3,10 @@
 #include "base/inBase.h"
 #include "base/inBuildInfoUtil.h"
 #include "base/inLibraryBuildInfo.h"
+#include "framework/inFramework.h"
 #include "gfx/inGfx.h"
+#include "internalAPI/inInternalApi.h"
+#include "pluginAPI/inPluginApi.h"
 #include "resmgt/inResmgt.h"
 #include "ui/inUi.h"
 
@@ -20,6 +23,9 @@ template <> std::type_info const* InInit<KvInit::appUi>::getType()
 template <> InInit<KvInit::appUi>::InInit() : InPackageInit("appUi")
 {
     registerPackage();
+    addDependency(InInit<KvInit::framework>::getType());
+    addDependency(InInit<KvInit::internalAPI>::getType());
+    addDependency(InInit<KvInit::pluginAPI>::getType());
     addDependency(InInit<KvInit::ui>::getType());
     addDependency(InInit<KvInit::gfx>::getType());
     addDependency(InInit<KvInit::resmgt>::getType());

@@ -3,6 +3,7 @@
 #include "base/inBase.h"
 #include "base/inBuildInfoUtil.h"
 #include "base/inLibraryBuildInfo.h"
+#include "pluginAPI/inPluginApi.h"
 #include "resmgt/inResmgt.h"
 
 #include <memory>
@@ -18,6 +19,7 @@ template <> std::type_info const* InInit<KvInit::internalAPI>::getType()
 template <> InInit<KvInit::internalAPI>::InInit() : InPackageInit("internalAPI")
 {
     registerPackage();
+    addDependency(InInit<KvInit::pluginAPI>::getType());
     addDependency(InInit<KvInit::resmgt>::getType());
     addDependency(InInit<KvInit::base>::getType());
 }

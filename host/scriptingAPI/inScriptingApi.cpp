@@ -4,6 +4,7 @@
 #include "base/inBuildInfoUtil.h"
 #include "base/inLibraryBuildInfo.h"
 #include "gfx/inGfx.h"
+#include "resmgt/inResmgt.h"
 
 #include <memory>
 
@@ -19,6 +20,7 @@ template <> InInit<KvInit::scriptingAPI>::InInit() : InPackageInit("scriptingAPI
 {
     registerPackage();
     addDependency(InInit<KvInit::gfx>::getType());
+    addDependency(InInit<KvInit::resmgt>::getType());
     addDependency(InInit<KvInit::base>::getType());
 }
 

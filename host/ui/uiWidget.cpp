@@ -260,4 +260,20 @@ UiPointerCallbacks& UiWidget::getPointerCallbacks()
     return *_pointerCallbacks;
 }
 
+RCShdPtr<RCBase<LkCounter<int>>> const* UiWidget::getClientDataListPtr() const
+{
+    return _clientData.data();
+}
+
+int UiWidget::getClientDataListSize() const
+{
+    return static_cast<int>(_clientData.size());
+}
+
+void UiWidget::addClientData(RCShdPtr<RCBase<LkCounter<int>>> const& data)
+{
+    requireUiThread();
+    _clientData.push_back(data);
+}
+
 } // namespace Kv

@@ -14,6 +14,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace Kv
 {
@@ -124,6 +125,14 @@ public:
     /// does not name the widget, is no error and changes nothing.
     static void setWidgetResTable(RCShdPtr<UiWidget> const& widget, std::string const& resourceName);
 
+    /// What others have attached to the widget, in the order in which it came. An array, borrowed, valid until more is
+    /// attached.
+    RCShdPtr<RCBase<LkCounter<int>>> const* getClientDataListPtr() const;
+    int getClientDataListSize() const;
+
+    /// Keeps `data` with the widget for as long as it lives.
+    void addClientData(RCShdPtr<RCBase<LkCounter<int>>> const& data);
+
 protected:
     /// `name` is UTF-8.
     explicit UiWidget(std::string name);
@@ -178,6 +187,7 @@ private:
     /// Outlives the peer, which knows it.
     std::unique_ptr<UiPointerCallbacks> _pointerCallbacks;
     std::unique_ptr<NtPeer> _peer;
+    std::vector<RCShdPtr<RCBase<LkCounter<int>>>> _clientData;
 };
 
 } // namespace Kv

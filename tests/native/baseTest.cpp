@@ -7,6 +7,9 @@
 #include "base/iterator.h"
 #include "base/rcShdPtr.h"
 #include "base/rcStrongPtr.h"
+#include "base/rcWeakAccessor.h"
+#include "base/rcWeakPtr.h"
+#include "base/uPtr.h"
 
 #include <algorithm>
 #include <cstdio>
@@ -102,6 +105,37 @@ TEST(RCShdPtr, SurvivesAnObjectThatLetsGoOfItselfByItsOwnEnd)
     EXPECT_EQ(alive, 1);
     circle->next.reset();
     EXPECT_EQ(alive, 0);
+}
+
+TEST(RCWeakPtr, LeadsToAVirtualBaseAndBackForAsLongAsTheObjectIsThere)
+{
+    struct Base
+    {
+        virtual ~Base() = default;
+        int number = 17;
+    };
+    struct Whole : virtual Base
+    {
+    };
+    struct Other : virtual Base
+    {
+    };
+    RCStrongPtr<Whole> strong = makeStrong<Whole>();
+    RCWeakPtr<const Whole> const weak(strong);
+    RCWeakPtr<const Base> const base(weak);
+    {
+        RCWeakAccessor<const Base> const accessor(base);
+        strong = nullptr;
+        EXPECT_FALSE(weak.isExpired()) << "the accessor holds it";
+        EXPECT_EQ(accessor->number, 17);
+        EXPECT_TRUE(accessor.castTo<const Whole>() == weak);
+        EXPECT_THROW(accessor.castTo<const Other>(), ExCastFailed);
+    }
+    EXPECT_TRUE(weak.isExpired() && base.isExpired());
+    EXPECT_TRUE(RCWeakPtr<const Base>(weak).isExpired()) << "converted when it is too late";
+    EXPECT_THROW(RCWeakAccessor<const Base>(base)->number, ExNullPtr);
+    EXPECT_THROW(RCWeakAccessor<const Base>(base).castTo<const Whole>(), ExNullPtr);
+    EXPECT_THROW(*UPtr<Base>(), ExNullPtr);
 }
 
 TEST(RCShdPtr, DumpsWhatItPointsAt)

@@ -3,6 +3,7 @@
 #include "gfx/wsCursorRegistry.h"
 #include "pyui/src/pyManagedDialog.h"
 #include "pyui/src/pyUiError.h"
+#include "resmgt/osFilePath.h"
 #include "ui/uiCursorGuard.h"
 
 #include <gtest/gtest.h>
@@ -93,6 +94,24 @@ TEST_F(Script, GetsNoExceptionTypeWithoutNames)
     PyErr_Clear();
     EXPECT_EQ(std::string(bp::extract<std::string>(bp::str(bp::object(type)))), "<class 'test.TestError'>");
     EXPECT_EQ(PyextInit::Error::newException("test", "TestError"), type.get());
+}
+
+TEST_F(Script, PassesPathsBothWaysByteForByteAndNothingElse)
+{
+    names["echo"] = bp::make_function(+[](OsFilePath const& path) { return path; });
+    names["size"] = bp::make_function(+[](OsFilePath const& path) { return path.toString().size(); });
+    run("import pathlib\n"
+        "def fails(value):\n"
+        "    try:\n        return echo(value)\n"
+        "    except Exception as error:\n        return type(error).__name__\n");
+    EXPECT_EQ(evaluate("[echo(''), echo('/a/b c'), echo(b'/b'), echo(pathlib.Path('/p'))]"),
+              "['', '/a/b c', '/b', '/p']");
+    EXPECT_EQ(evaluate("echo('/caf\\u00e9') == '/caf\\u00e9', size('/caf\\u00e9')"), "(True, 6)");
+    EXPECT_EQ(evaluate("echo(b'/\\xff') == '/\\udcff' == echo('/\\udcff'), size('/\\udcff')"), "(True, 2)");
+    EXPECT_EQ(evaluate("[fails(v) for v in ('a\\0b', b'a\\0', '\\ud800')]"),
+              "['ValueError', 'ValueError', 'UnicodeEncodeError']");
+    EXPECT_EQ(evaluate("[fails(v) for v in (None, 5, 1.5, ['/a'])]"), "['ArgumentError', 'ArgumentError', "
+                                                                      "'ArgumentError', 'ArgumentError']");
 }
 
 TEST_F(Script, GetsNoDialogFromPointersToNone)

@@ -1,0 +1,53 @@
+#pragma once
+
+#include "appUi/kvAppUiExport.h"
+#include "base/prdPredicate.h"
+#include "base/rcBase.h"
+#include "base/rcShdPtr.h"
+#include "internalAPI/snItem.h"
+#include "internalAPI/snItemConvert.h"
+#include "resmgt/liString.h"
+
+namespace Kv
+{
+
+/// What a browser shows an entry for: a file or a directory. It need not exist any more.
+class KVAPPUI_API BrBrowsable : public RCBase<LkCounter<int>>
+{
+public:
+    explicit BrBrowsable(LiString path);
+    ~BrBrowsable() override;
+
+    /// What the browser's scheme calls its place; of a file the absolute path, in the bytes of the file system.
+    virtual LiString getPath() const;
+
+private:
+    LiString _path;
+};
+
+/// A browsable as part of a selection.
+class KVAPPUI_API BrBrowsableItem : public SnItem
+{
+public:
+    /// `browsable` is not null.
+    explicit BrBrowsableItem(RCShdPtr<BrBrowsable> browsable);
+    ~BrBrowsableItem() override;
+
+    RCShdPtr<BrBrowsable> const& getBrowsable() const { return _browsable; }
+
+private:
+    RCShdPtr<BrBrowsable> _browsable;
+};
+
+/// The browsables in a selection.
+template <> class KVAPPUI_API SnItemConvert<RCShdPtr<BrBrowsable>>
+{
+public:
+    /// Holds for items that stand for a browsable.
+    static PrdPredicate<RCShdPtr<const SnItem>> getPredicate();
+
+    /// The browsable of an item; null if it stands for something else.
+    static RCShdPtr<BrBrowsable> get(RCShdPtr<const SnItem> const& item);
+};
+
+} // namespace Kv

@@ -1,0 +1,8 @@
+#include "appUi/uiView.h"
+
+namespace Kv
+{
+
+UiView::~UiView() = default;
+
+} // namespace Kv

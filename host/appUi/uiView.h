@@ -1,0 +1,21 @@
+#pragma once
+
+#include "appUi/kvAppUiExport.h"
+#include "base/rcBase.h"
+#include "base/rcShdPtr.h"
+#include "internalAPI/snSelection.h"
+
+namespace Kv
+{
+
+/// What a widget that shows a collection lets others know of it. It is found among the widget's client data.
+class KVAPPUI_API UiView : public RCBase<LkCounter<int>>
+{
+public:
+    ~UiView() override;
+
+    /// What is selected in it now; null where it has no selection at all, as when its widget is gone.
+    virtual RCShdPtr<SnSelection> getSelection() = 0;
+};
+
+} // namespace Kv

@@ -1,0 +1,8 @@
+#include "internalAPI/snItem.h"
+
+namespace Kv
+{
+
+SnItem::~SnItem() = default;
+
+} // namespace Kv
