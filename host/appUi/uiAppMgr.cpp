@@ -26,8 +26,15 @@ RCShdPtr<UiPanel> UiAppMgr::getMainPanel() const
     return _mainPanel;
 }
 
-void UiAppMgr::setApplication(RCShdPtr<UiMainWindow> const& window, RCShdPtr<UiPanel> const& panel)
+RCShdPtr<SnSelection> UiAppMgr::getSelection() const
 {
+    return _view ? _view->getSelection() : nullptr;
+}
+
+void UiAppMgr::setApplication(RCShdPtr<UiMainWindow> const& window, RCShdPtr<UiPanel> const& panel,
+                              RCShdPtr<UiView> const& view)
+{
+    _view = view;
     _mainWindow = window;
     _mainPanel = panel;
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "appUi/kvAppUiExport.h"
+#include "appUi/uiView.h"
 #include "base/rcShdPtr.h"
 #include "ui/uiMainWindow.h"
 #include "ui/uiPanel.h"
@@ -26,8 +27,13 @@ public:
     /// The panel of the application's window in which dialogs float; null in a standalone interpreter.
     RCShdPtr<UiPanel> getMainPanel() const;
 
-    /// For the application: from here on it is there, with this window and this panel in it. Null pointers take it away.
-    void setApplication(RCShdPtr<UiMainWindow> const& window, RCShdPtr<UiPanel> const& panel);
+    /// What is selected in the application; null where nothing is, and in a standalone interpreter.
+    RCShdPtr<SnSelection> getSelection() const;
+
+    /// For the application: from here on it is there, with this window, this panel in it, and what is selected in this
+    /// view. Null pointers take it away.
+    void setApplication(RCShdPtr<UiMainWindow> const& window, RCShdPtr<UiPanel> const& panel,
+                        RCShdPtr<UiView> const& view);
 
     /// Tells of a window of its own that is about to be shown. It stays above the one told before it that is still
     /// shown, and is only remembered, not kept.
@@ -41,6 +47,7 @@ private:
 
     RCShdPtr<UiMainWindow> _mainWindow;
     RCShdPtr<UiPanel> _mainPanel;
+    RCShdPtr<UiView> _view;
 
     /// Told and not yet released, the latest last.
     std::vector<std::weak_ptr<UiTopLevel>> _told;
