@@ -7,6 +7,7 @@
 #include "pyManagedDialog.h"
 #include "pyUiError.h"
 #include "pyextUiDocs.h"
+#include "pyinit/pySharedClass.h"
 #include "ui/uiCursorGuard.h"
 
 #include <string>
@@ -56,17 +57,6 @@ bp::handle<> importGraphModule()
     return bp::handle<>(module);
 }
 
-/// The package and the bare name are two modules of one process, and the body runs for each. They share one class for
-/// each type, so that what a script has from the one is good for the other. True if the class is there already.
-template <typename T> bool shareClass(char const* name)
-{
-    bp::converter::registration const* const known = bp::converter::registry::query(bp::type_id<T>());
-    if (!known || !known->m_class_object)
-        return false;
-    bp::scope().attr(name) = bp::object(bp::handle<>(bp::borrowed(known->m_class_object)));
-    return true;
-}
-
 void defineFunctions()
 {
     using bp::arg;
@@ -88,7 +78,7 @@ void defineFunctions()
 
 void registerEventType()
 {
-    if (shareClass<PiWidget::EventType>("EventType"))
+    if (PyextInit::shareClass<PiWidget::EventType>("EventType"))
         return;
     bp::enum_<PiWidget::EventType>("EventType")
         .value("ENABLE", PiWidget::Enable)
@@ -104,7 +94,7 @@ void registerDialog()
     using SetValueNotifying = void (Dialog::*)(std::string const&, bp::object const&, bool);
     using SetValues = void (Dialog::*)(bp::dict const&);
     using SetValuesNotifying = void (Dialog::*)(bp::dict const&, bool);
-    if (shareClass<Dialog>("Dialog"))
+    if (PyextInit::shareClass<Dialog>("Dialog"))
         return;
     bp::class_<Dialog, RCShdPtr<ManagedDialog>, boost::noncopyable> dialog("Dialog", Docs::dialog, bp::no_init);
     supportGarbageCollection(reinterpret_cast<PyTypeObject*>(dialog.ptr()));
@@ -129,7 +119,7 @@ void registerDialog()
 
 void registerCursorGuard()
 {
-    if (shareClass<UiCursorGuard>("CursorGuard"))
+    if (PyextInit::shareClass<UiCursorGuard>("CursorGuard"))
         return;
     bp::class_<UiCursorGuard, boost::noncopyable>("CursorGuard", Docs::cursorGuard,
                                                   bp::init<std::string>(Docs::cursorGuardInit));
@@ -137,7 +127,7 @@ void registerCursorGuard()
 
 void registerBrowserScheme()
 {
-    if (shareClass<PiBrowserSchemes>("BrowserScheme"))
+    if (PyextInit::shareClass<PiBrowserSchemes>("BrowserScheme"))
         return;
     bp::class_<PiBrowserSchemes> scheme("BrowserScheme", Docs::browserScheme, bp::no_init);
     scheme.attr("FILE_SYSTEM") = PiBrowserSchemes::FsScheme.toString();
