@@ -6,6 +6,7 @@
 #include "pyConvenienceFunctions.h"
 #include "pyManagedDialog.h"
 #include "pyUiError.h"
+#include "pyWorkspace.h"
 #include "pyextUiDocs.h"
 #include "pyinit/pySharedClass.h"
 #include "ui/uiCursorGuard.h"
@@ -138,6 +139,25 @@ void registerBrowserScheme()
     scheme.attr("BOOKMARKS") = PiBrowserSchemes::BookmarkScheme.toString();
 }
 
+void registerWorkspace()
+{
+    if (PyextInit::shareClass<Workspace>("Workspace"))
+        return;
+    bp::class_<Workspace, boost::noncopyable>("Workspace", Docs::workspace, bp::init<>())
+        .def("getCurrentComposition", &Workspace::getCurrentComposition, Docs::getCurrentComposition)
+        .staticmethod("getCurrentComposition")
+        .def("getCompositions", &Workspace::getCompositions, Docs::getCompositions)
+        .staticmethod("getCompositions")
+        .def("getNbCompositions", &Workspace::getNbCompositions, Docs::getNbCompositions)
+        .staticmethod("getNbCompositions")
+        .def("openComposition", &Workspace::openComposition, Docs::openComposition)
+        .staticmethod("openComposition")
+        .def("isCompositionOpened", &Workspace::isCompositionOpened, Docs::isCompositionOpened)
+        .staticmethod("isCompositionOpened")
+        .def("getBrowserSelection", &Workspace::getBrowserSelection, Docs::getBrowserSelection)
+        .staticmethod("getBrowserSelection");
+}
+
 void registerExceptions()
 {
     UiError::initialize("ui", "UiError");
@@ -153,6 +173,7 @@ void moduleBody()
     registerDialog();
     registerCursorGuard();
     registerBrowserScheme();
+    registerWorkspace();
     bp::def("instantiateAppMgr", &instantiateAppMgr);
     registerExceptions();
     bp::scope().attr("__doc__") = Docs::module;
