@@ -8,9 +8,9 @@ namespace Kv::PyextGraph::Docs
 constexpr char const* module = "Quorvane Velmora internal graph extension module.";
 
 constexpr char const* graph =
-    R"(The graph of a composition that is open in Velmora: nodes, each with a name of its own, a type, values, and inputs
-that refer to other nodes. There is no public constructor: the workspace of the C{ui} module hands out the graphs of its
-compositions.
+    R"(The graph of a composition that is open in Velmora: nodes, each with a name of its own, a type, values, and
+inputs that refer to other nodes. There is no public constructor: the workspace of the C{ui} module hands out the graphs
+of its compositions.
 
 A C{Graph} does not keep its composition open. Once that is closed, every method raises L{GraphError}; the object can
 still be compared, and printed. Two of them are equal if they stand for the same composition. Example::
@@ -36,8 +36,8 @@ constexpr char const* getPath =
 @raise GraphError: If the composition has been closed.)";
 
 constexpr char const* isWritable =
-    R"(Tells whether the composition can be changed by this object. Its file is looked at for each call: one that cannot be
-written cannot be changed.
+    R"(Tells whether the composition can be changed by this object. Its file is looked at for each call: one that cannot
+be written cannot be changed.
 
 @return: C{True} if it can.
 @rtype: C{bool}
@@ -92,7 +92,7 @@ read-only, or if it has been closed. Nothing has changed then.)";
 constexpr char const* save =
     R"(Writes the composition's file, as a whole or not at all.
 
-@raise GraphError: If the file cannot be written, which leaves it as it was, if the composition is read-only, or if it has
-been closed.)";
+@raise GraphError: If the file cannot be written, which leaves it as it was, if the composition is read-only, or if it
+has been closed.)";
 
 } // namespace Kv::PyextGraph::Docs

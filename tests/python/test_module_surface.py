@@ -200,7 +200,8 @@ def test_the_workspace_says_what_it_is_and_gives():
     def told(name):
         return getattr(ui.Workspace, name).__doc__.replace('\n', ' ')
 
-    assert 'only makes sense when scripts are executed in the embedded interpreter' in ui.Workspace.__doc__.replace('\n', ' ')
+    assert 'only makes sense when scripts are executed in the embedded interpreter' in ' '.join(
+        ui.Workspace.__doc__.split())
     assert ui.Workspace.__init__.__doc__ is None
     for name, words in (
             ('getCurrentComposition', 'Composition that is currently opened in the Velmora UI workspace.'),
@@ -208,8 +209,8 @@ def test_the_workspace_says_what_it_is_and_gives():
             ('getCompositions', 'The list of compositions that are opened in the Velmora UI workspace.'),
             ('getNbCompositions', 'The number of compositions that are opened in the Velmora UI workspace.'),
             ('openComposition', 'Opens the given composition in the Velmora UI workspace.'),
-            ('isCompositionOpened', 'Indicates whether the composition at the specified path is currently opened in the '
-                                    'Velmora UI workspace.'),
+            ('isCompositionOpened', 'Indicates whether the composition at the specified path is currently opened in '
+                                    'the Velmora UI workspace.'),
             ('getBrowserSelection', 'Gets the paths of elements selected in the Velmora browser in focus.'),
             ('getBrowserSelection', "is empty if there's no selection or if there's no browser in focus.")):
         assert words in told(name)
