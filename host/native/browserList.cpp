@@ -1,0 +1,142 @@
+#include "native/browserList.h"
+
+#include "native/dirModel.h"
+#include "native/qtFocusOrder.h"
+
+#include <QHeaderView>
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QPainter>
+#include <QStyledItemDelegate>
+
+#include <utility>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// Gives the rows air.
+class RowDelegate final : public QStyledItemDelegate
+{
+public:
+    using QStyledItemDelegate::QStyledItemDelegate;
+
+    QSize sizeHint(QStyleOptionViewItem const& option, QModelIndex const& index) const override
+    {
+        constexpr int air = 6;
+        return QStyledItemDelegate::sizeHint(option, index) + QSize(0, air);
+    }
+
+protected:
+    void initStyleOption(QStyleOptionViewItem* option, QModelIndex const& index) const override
+    {
+        QStyledItemDelegate::initStyleOption(option, index);
+        if (index.column() == DirModel::NameColumn)
+            return;
+        // The name is what is read; the rest steps back.
+        QColor text = option->palette.color(QPalette::Text);
+        text.setAlphaF(0.65F);
+        option->palette.setColor(QPalette::Text, text);
+    }
+};
+
+} // namespace
+
+BrowserList::BrowserList(QWidget* parent, Wishes wishes) : QTreeView(parent), _wishes(std::move(wishes))
+{
+    QtFocusOrder::markAsValue(*this);
+    setItemDelegate(new RowDelegate(this));
+    setRootIsDecorated(false);
+    setItemsExpandable(false);
+    setUniformRowHeights(true);
+    setAllColumnsShowFocus(true);
+    setEditTriggers(NoEditTriggers);
+    setTabKeyNavigation(false);
+    setTextElideMode(Qt::ElideMiddle);
+    setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    setVerticalScrollMode(ScrollPerPixel);
+    header()->setStretchLastSection(false);
+    header()->setSectionsMovable(false);
+    header()->setHighlightSections(false);
+    header()->setSortIndicator(DirModel::NameColumn, Qt::AscendingOrder);
+}
+
+void BrowserList::setPlaceholder(QString const& text)
+{
+    _placeholder = text;
+    viewport()->update();
+}
+
+void BrowserList::keyPressEvent(QKeyEvent* event)
+{
+    bool const isEnter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    bool const isUp = event->key() == Qt::Key_Backspace;
+    // With Alt the arrows are not for the rows.
+    if (event->modifiers() & Qt::AltModifier)
+        event->ignore();
+    else if (isEnter && !event->isAutoRepeat())
+        _wishes.activate();
+    else if (isUp)
+        _wishes.goUp();
+    else if (!isEnter)
+        QTreeView::keyPressEvent(event);
+}
+
+void BrowserList::mousePressEvent(QMouseEvent* event)
+{
+    if (!indexAt(event->position().toPoint()).isValid())
+        setCurrentIndex(QModelIndex());
+    QTreeView::mousePressEvent(event);
+}
+
+void BrowserList::mouseDoubleClickEvent(QMouseEvent* event)
+{
+    QTreeView::mouseDoubleClickEvent(event);
+    bool const isLeft = event->button() == Qt::LeftButton;
+    if (isLeft && currentIndex().isValid() && indexAt(event->position().toPoint()).row() == currentIndex().row())
+        _wishes.activate();
+}
+
+void BrowserList::resizeEvent(QResizeEvent* event)
+{
+    QTreeView::resizeEvent(event);
+    fitColumns();
+}
+
+void BrowserList::paintEvent(QPaintEvent* event)
+{
+    QTreeView::paintEvent(event);
+    if (_placeholder.isEmpty() || model()->rowCount() > 0)
+        return;
+    QPainter painter(viewport());
+    painter.setPen(palette().color(QPalette::PlaceholderText));
+    painter.drawText(viewport()->rect(), Qt::AlignCenter | Qt::TextWordWrap, _placeholder);
+}
+
+void BrowserList::changeEvent(QEvent* event)
+{
+    QTreeView::changeEvent(event);
+    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange)
+        fitColumns();
+}
+
+void BrowserList::fitColumns()
+{
+    if (!model())
+        return;
+    QFontMetrics const metrics = fontMetrics();
+    int const air = 4 * metrics.horizontalAdvance(QLatin1Char(' ')) + 8;
+    int const sizeWidth = metrics.horizontalAdvance(QStringLiteral("1023.9 KiB")) + air;
+    int const timeWidth = metrics.horizontalAdvance(QStringLiteral("2000-00-00 00:00")) + air;
+    int const leastName = metrics.averageCharWidth() * 24;
+    int const room = viewport()->width() - leastName;
+    header()->setSectionResizeMode(DirModel::NameColumn, QHeaderView::Stretch);
+    header()->resizeSection(DirModel::SizeColumn, sizeWidth);
+    header()->resizeSection(DirModel::ModifiedColumn, timeWidth);
+    setColumnHidden(DirModel::SizeColumn, room < sizeWidth);
+    setColumnHidden(DirModel::ModifiedColumn, room < sizeWidth + timeWidth);
+}
+
+} // namespace Kv
