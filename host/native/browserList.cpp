@@ -80,7 +80,7 @@ void BrowserList::keyPressEvent(QKeyEvent* event)
         _wishes.activate();
     else if (isUp)
         _wishes.goUp();
-    else if (!isEnter)
+    else if (!isEnter && !selectFirst(*event))
         QTreeView::keyPressEvent(event);
 }
 
@@ -122,21 +122,33 @@ void BrowserList::changeEvent(QEvent* event)
         fitColumns();
 }
 
+bool BrowserList::selectFirst(QKeyEvent const& event)
+{
+    bool const isArrow = event.key() == Qt::Key_Down || event.key() == Qt::Key_Up;
+    if (!isArrow || !currentIndex().isValid() || selectionModel()->hasSelection())
+        return false;
+    setCurrentIndex(currentIndex());
+    return true;
+}
+
 void BrowserList::fitColumns()
 {
     if (!model())
         return;
     QFontMetrics const metrics = fontMetrics();
-    int const air = 4 * metrics.horizontalAdvance(QLatin1Char(' ')) + 8;
+    int const air = 3 * metrics.averageCharWidth();
     int const sizeWidth = metrics.horizontalAdvance(QStringLiteral("1023.9 KiB")) + air;
-    int const timeWidth = metrics.horizontalAdvance(QStringLiteral("2000-00-00 00:00")) + air;
-    int const leastName = metrics.averageCharWidth() * 24;
-    int const room = viewport()->width() - leastName;
+    int const timeWidth = metrics.horizontalAdvance(QStringLiteral("2000-00-00 00:00")) + 2 * air;
+    // In characters: what the name keeps before it gives room to the others.
+    constexpr int leastBesideSize = 22;
+    constexpr int leastBesideAll = 34;
+    int const room = viewport()->width();
     header()->setSectionResizeMode(DirModel::NameColumn, QHeaderView::Stretch);
     header()->resizeSection(DirModel::SizeColumn, sizeWidth);
     header()->resizeSection(DirModel::ModifiedColumn, timeWidth);
-    setColumnHidden(DirModel::SizeColumn, room < sizeWidth);
-    setColumnHidden(DirModel::ModifiedColumn, room < sizeWidth + timeWidth);
+    int const nameUnit = metrics.averageCharWidth();
+    setColumnHidden(DirModel::SizeColumn, room < leastBesideSize * nameUnit + sizeWidth);
+    setColumnHidden(DirModel::ModifiedColumn, room < leastBesideAll * nameUnit + sizeWidth + timeWidth);
 }
 
 } // namespace Kv

@@ -34,6 +34,8 @@ protected:
     void changeEvent(QEvent* event) override;
 
 private:
+    /// True if the key has selected the row that the keyboard is on, where nothing was selected.
+    bool selectFirst(QKeyEvent const& event);
     void fitColumns();
 
     Wishes _wishes;

@@ -4,6 +4,7 @@
 #include "native/browserList.h"
 #include "native/dirModel.h"
 #include "native/pathField.h"
+#include "native/qtFocusOrder.h"
 #include "native/qtText.h"
 #include "resmgt/liStringUtil.h"
 #include "resmgt/osPlace.h"
@@ -178,6 +179,8 @@ void BrowserPane::keyPressEvent(QKeyEvent* event)
         _model->reread();
     else if (event->key() == Qt::Key_H && event->modifiers() & Qt::ControlModifier)
         toggleHidden();
+    else if (event->key() == Qt::Key_L && event->modifiers() & Qt::ControlModifier)
+        QtFocusOrder::give(*_path, Qt::ShortcutFocusReason);
     else
         QWidget::keyPressEvent(event);
 }

@@ -29,6 +29,14 @@ std::string foldCase(std::string const& text)
     return toQString(text).toCaseFolded().toStdString();
 }
 
+Qt::Alignment getAlignment(int column)
+{
+    if (column == DirModel::NameColumn)
+        return Qt::AlignLeft | Qt::AlignVCenter;
+    // Times are all as long; in the middle they keep away from the sizes.
+    return column == DirModel::SizeColumn ? Qt::AlignRight | Qt::AlignVCenter : Qt::AlignCenter;
+}
+
 bool isSame(OsDirEntry const& a, OsDirEntry const& b)
 {
     return a.name == b.name && a.title == b.title && a.isDirectory == b.isDirectory && a.size == b.size &&
@@ -83,7 +91,10 @@ OsDirEntry const& DirModel::getEntry(int row) const
 
 std::vector<int> DirModel::findRows(std::vector<std::string> const& names) const
 {
-    std::unordered_set<std::string> const wanted(names.begin(), names.end());
+    std::unordered_set<std::string> wanted(names.begin(), names.end());
+    wanted.erase("");
+    if (wanted.empty())
+        return {};
     std::unordered_set<std::string> sequences;
     for (std::string const& name : names)
         if (std::optional<OsNumberedName> const numbered = OsNumberedName::parse(name))
@@ -116,8 +127,8 @@ QVariant DirModel::data(QModelIndex const& index, int role) const
         return entry.isDirectory ? _directoryIcon : _fileIcon;
     if (role == Qt::ToolTipRole && isName)
         return toShownPath(entry.title).toHtmlEscaped();
-    if (role == Qt::TextAlignmentRole && index.column() == SizeColumn)
-        return QVariant(Qt::AlignRight | Qt::AlignVCenter);
+    if (role == Qt::TextAlignmentRole)
+        return QVariant(getAlignment(index.column()));
     return {};
 }
 
@@ -126,7 +137,7 @@ QVariant DirModel::headerData(int section, Qt::Orientation orientation, int role
     if (orientation != Qt::Horizontal)
         return {};
     if (role == Qt::TextAlignmentRole)
-        return QVariant((section == SizeColumn ? Qt::AlignRight : Qt::AlignLeft) | Qt::AlignVCenter);
+        return QVariant(getAlignment(section));
     if (role != Qt::DisplayRole)
         return {};
     return section == NameColumn ? QStringLiteral("Name")
