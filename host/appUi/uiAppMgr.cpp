@@ -13,7 +13,30 @@ UiAppMgr& UiAppMgr::getInstance()
 
 RCShdPtr<UiTopLevel> UiAppMgr::getTopLevel() const
 {
-    return nullptr;
+    return _mainWindow;
+}
+
+RCShdPtr<UiMainWindow> UiAppMgr::getMainWindow() const
+{
+    return _mainWindow;
+}
+
+RCShdPtr<UiPanel> UiAppMgr::getMainPanel() const
+{
+    return _mainPanel;
+}
+
+RCShdPtr<SnSelection> UiAppMgr::getSelection() const
+{
+    return _view ? _view->getSelection() : nullptr;
+}
+
+void UiAppMgr::setApplication(RCShdPtr<UiMainWindow> const& window, RCShdPtr<UiPanel> const& panel,
+                              RCShdPtr<UiView> const& view)
+{
+    _view = view;
+    _mainWindow = window;
+    _mainPanel = panel;
 }
 
 void UiAppMgr::setTopLevel(RCShdPtr<UiTopLevel> const& window)

@@ -1,8 +1,10 @@
 #pragma once
 
 #include "appUi/kvAppUiExport.h"
+#include "appUi/uiView.h"
 #include "base/rcShdPtr.h"
-#include "ui/uiTopLevel.h"
+#include "ui/uiMainWindow.h"
+#include "ui/uiPanel.h"
 
 #include <memory>
 #include <vector>
@@ -19,6 +21,20 @@ public:
     /// The application's window. Null in a standalone interpreter, also while a window of a script's own is told.
     RCShdPtr<UiTopLevel> getTopLevel() const;
 
+    /// The application's window under its own class; null in a standalone interpreter.
+    RCShdPtr<UiMainWindow> getMainWindow() const;
+
+    /// The panel of the application's window in which dialogs float; null in a standalone interpreter.
+    RCShdPtr<UiPanel> getMainPanel() const;
+
+    /// What is selected in the application; null where nothing is, and in a standalone interpreter.
+    RCShdPtr<SnSelection> getSelection() const;
+
+    /// For the application: from here on it is there, with this window, this panel in it, and what is selected in this
+    /// view. Null pointers take it away.
+    void setApplication(RCShdPtr<UiMainWindow> const& window, RCShdPtr<UiPanel> const& panel,
+                        RCShdPtr<UiView> const& view);
+
     /// Tells of a window of its own that is about to be shown. It stays above the one told before it that is still
     /// shown, and is only remembered, not kept.
     void setTopLevel(RCShdPtr<UiTopLevel> const& window);
@@ -28,6 +44,10 @@ public:
 
 private:
     void forgetHidden();
+
+    RCShdPtr<UiMainWindow> _mainWindow;
+    RCShdPtr<UiPanel> _mainPanel;
+    RCShdPtr<UiView> _view;
 
     /// Told and not yet released, the latest last.
     std::vector<std::weak_ptr<UiTopLevel>> _told;

@@ -7,19 +7,6 @@
 namespace Kv
 {
 
-namespace
-{
-
-std::string readableTypeName(char const* typeName)
-{
-    int status = 0;
-    std::unique_ptr<char, decltype(&std::free)> const plain(abi::__cxa_demangle(typeName, nullptr, nullptr, &status),
-                                                            &std::free);
-    return status == 0 ? plain.get() : typeName;
-}
-
-} // namespace
-
 ExBase* ExNullPtr::clone() const
 {
     return new ExNullPtr(*this);
@@ -42,13 +29,21 @@ void ExCastFailed::raise() const
 
 void RCExUtil::throwExNullPtr(char const* typeName)
 {
-    throw ExNullPtr(__FILE__, __LINE__, "Null pointer of type " + readableTypeName(typeName));
+    throw ExNullPtr(__FILE__, __LINE__, "Null pointer of type " + getReadableTypeName(typeName));
 }
 
 void RCExUtil::throwExCastFailed(char const* fromType, char const* toType)
 {
     throw ExCastFailed(__FILE__, __LINE__,
-                       "Cannot cast " + readableTypeName(fromType) + " to " + readableTypeName(toType));
+                       "Cannot cast " + getReadableTypeName(fromType) + " to " + getReadableTypeName(toType));
+}
+
+std::string RCExUtil::getReadableTypeName(char const* typeName)
+{
+    int status = 0;
+    std::unique_ptr<char, decltype(&std::free)> const plain(abi::__cxa_demangle(typeName, nullptr, nullptr, &status),
+                                                            &std::free);
+    return status == 0 ? plain.get() : typeName;
 }
 
 } // namespace Kv

@@ -2,6 +2,8 @@
 
 #include "base/exBase.h"
 
+#include <string>
+
 namespace Kv
 {
 
@@ -32,6 +34,9 @@ public:
 
     /// Throws `ExCastFailed` for two type names, mangled or plain.
     [[noreturn]] static void throwExCastFailed(char const* fromType, char const* toType);
+
+    /// The plain form of a type name, mangled or plain.
+    static std::string getReadableTypeName(char const* typeName);
 };
 
 } // namespace Kv

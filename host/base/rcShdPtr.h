@@ -1,11 +1,9 @@
 #pragma once
 
-#include "base/rcBase.h"
-#include "base/rcExUtil.h"
+#include "base/rcBasePtr.h"
 
 #include <cstddef>
 #include <type_traits>
-#include <typeinfo>
 #include <utility>
 
 namespace Kv
@@ -13,18 +11,16 @@ namespace Kv
 
 /// Strong pointer, one word wide, to an object that derives from `RCBase`. Can be null; going through a null one
 /// throws `ExNullPtr`.
-template <typename T> class RCShdPtr
+template <typename T> class RCShdPtr : public RCBasePtr<T>
 {
 public:
-    using element_type = T;
-
     RCShdPtr() = default;
     RCShdPtr(std::nullptr_t) {}
-    RCShdPtr(T* object) : _object(object) { acquire(); }
-    RCShdPtr(RCShdPtr const& other) : _object(other._object) { acquire(); }
-    RCShdPtr(RCShdPtr&& other) noexcept : _object(std::exchange(other._object, nullptr)) {}
+    RCShdPtr(T* object) : RCBasePtr<T>(object) { acquire(); }
+    RCShdPtr(RCShdPtr const& other) : RCBasePtr<T>(other) { acquire(); }
+    RCShdPtr(RCShdPtr&& other) noexcept : RCBasePtr<T>(other.detach()) {}
     template <typename U, typename = std::enable_if_t<std::is_convertible_v<U*, T*>>>
-    RCShdPtr(RCShdPtr<U> const& other) : _object(other.get())
+    RCShdPtr(RCShdPtr<U> const& other) : RCBasePtr<T>(other.get())
     {
         acquire();
     }
@@ -32,44 +28,26 @@ public:
 
     RCShdPtr& operator=(RCShdPtr other) noexcept
     {
-        std::swap(_object, other._object);
+        this->swap(other);
         return *this;
     }
 
     /// Lets the object go; the pointer is null before a destructor runs.
     void reset()
     {
-        if (T* const object = std::exchange(_object, nullptr))
+        if (T* const object = this->detach())
             object->releaseReference();
     }
 
-    /// Borrowed; null for a null pointer.
-    T* get() const { return _object; }
-
-    bool isNull() const { return !_object; }
-    explicit operator bool() const { return _object; }
-
-    T* operator->() const { return checked(); }
-    T& operator*() const { return *checked(); }
-
-    friend bool operator==(RCShdPtr const& a, RCShdPtr const& b) { return a._object == b._object; }
-    friend bool operator!=(RCShdPtr const& a, RCShdPtr const& b) { return a._object != b._object; }
+    friend bool operator==(RCShdPtr const& a, RCShdPtr const& b) { return a.get() == b.get(); }
+    friend bool operator!=(RCShdPtr const& a, RCShdPtr const& b) { return a.get() != b.get(); }
 
 private:
     void acquire() const
     {
-        if (_object)
-            _object->addReference();
+        if (T* const object = this->get())
+            object->addReference();
     }
-
-    T* checked() const
-    {
-        if (!_object)
-            RCExUtil::throwExNullPtr(typeid(T*).name());
-        return _object;
-    }
-
-    T* _object = nullptr;
 };
 
 /// A new counted object and the first pointer to it.

@@ -2,6 +2,7 @@
 
 #include "base/rcExUtil.h"
 
+#include <cstddef>
 #include <memory>
 #include <type_traits>
 #include <typeinfo>
@@ -16,6 +17,7 @@ template <typename T> class RCStrongPtr
 {
 public:
     RCStrongPtr() = default;
+    RCStrongPtr(std::nullptr_t) {}
     template <typename U> RCStrongPtr(std::shared_ptr<U> object) : _object(std::move(object)) {}
     template <typename U, typename = std::enable_if_t<std::is_convertible_v<U*, T*>>>
     RCStrongPtr(RCStrongPtr<U> const& other) : _object(other.getShared())

@@ -17,6 +17,32 @@ enum class NtAlign
     Center,
 };
 
+/// Colour on the screen, each part from 0 to 1.
+struct NtColor
+{
+    float red = 0;
+    float green = 0;
+    float blue = 0;
+};
+
+/// A widget that the application has made with the toolkit itself: a `QWidget`. Borrowed; it may go before the peer that
+/// adopts it.
+struct NtForeignWidget
+{
+    void* widget = nullptr;
+};
+
+/// What a widget hears of the pointer: its moves and the left button, also outside of the widget for as long as the
+/// button that was pressed on it is down. In pixels of the window, y growing downward.
+class NtPointerListener
+{
+public:
+    virtual ~NtPointerListener() = default;
+    virtual void onPointerMoved(int x, int y) = 0;
+    virtual void onPointerDown(int x, int y) = 0;
+    virtual void onPointerUp(int x, int y) = 0;
+};
+
 /// Native side of one widget: what stands on the screen. Owned by the widget, which tells it what to show and hears of
 /// the user through a listener. What the widget tells it never comes back as if the user had done it, and a peer that
 /// is hidden or goes away tells nothing.
@@ -39,6 +65,22 @@ public:
 
     /// Puts the peer above its siblings.
     virtual void raise() = 0;
+
+    /// Fills the ground behind the widget; its text is black or white then, whichever is easier to read.
+    virtual void setBackground(NtColor const& color) = 0;
+
+    /// Draws a line along the bottom edge.
+    virtual void setLineBelow(bool drawn) = 0;
+
+    /// Tells of the pointer from now on; the listener is borrowed and outlives the peer. In a floating container the
+    /// widget becomes a grip, which stays in place when the content scrolls.
+    virtual void setPointerListener(NtPointerListener& listener) = 0;
+
+    /// Gives the widget itself the keyboard.
+    virtual void takeKeyboard() = 0;
+
+    /// True if the widget, or one in it, has the keyboard whenever its window has it.
+    virtual bool hasKeyboard() const = 0;
 };
 
 /// Holds other peers.
@@ -48,6 +90,39 @@ public:
     /// Gives the keyboard to the first displayed and enabled widget in it that holds a value, as the eye goes; without
     /// one, to its first push button.
     virtual void focusFirst() = 0;
+};
+
+/// What a floating container hears.
+class NtFloatListener
+{
+public:
+    virtual ~NtFloatListener() = default;
+    /// The container has this much room for its content now, in pixels.
+    virtual void onResized(int width, int height) = 0;
+    /// Escape was pressed in it and no widget wanted it.
+    virtual void onEscape() = 0;
+    /// It should move by so many pixels, y growing downward, to bring the widget into view that has the keyboard.
+    virtual void onMoveWanted(int x, int y) = 0;
+    /// The loop has come around for the first time since the peer was made.
+    virtual void onFirstTurn() = 0;
+};
+
+/// Floats above its siblings and keeps Tab within itself. The keyboard goes back to where it was when it is hidden.
+/// Where the content is larger, the user can scroll it.
+class NtFloat : public NtContainer
+{
+public:
+    /// Size of the content in pixels.
+    virtual void setContentSize(int width, int height) = 0;
+};
+
+/// What a container hears whose place the application's own window decides.
+class NtPlaceListener
+{
+public:
+    virtual ~NtPlaceListener() = default;
+    /// Its place in the window, in pixels, y growing upward from the window's bottom edge.
+    virtual void onPlaced(GeRectangle<int> const& place) = 0;
 };
 
 class NtLabel : public virtual NtPeer
@@ -193,6 +268,16 @@ public:
 
     /// Drops the input that is still queued for the window.
     virtual void flushInput() = 0;
+};
+
+/// The window of the application, which made it with the toolkit itself.
+class NtMainWindow : public NtWindow
+{
+public:
+    /// Keeps input from what is the application's own in the window, but not from what the host has in it, until
+    /// `admitInput`, which also gives the keyboard back to the widget that had it.
+    virtual void refuseInput() = 0;
+    virtual void admitInput() = 0;
 };
 
 } // namespace Kv

@@ -6,6 +6,7 @@
 #include "native/ntPeers.h"
 
 #include <exception>
+#include <functional>
 #include <memory>
 #include <string>
 
@@ -76,8 +77,19 @@ public:
                                                    std::string const& contentName, GeRectangle<int> const& frame,
                                                    NtWindow* owner, NtWindowListener& listener) = 0;
 
+    /// Takes the application's window as one of the host's: the whole of it is the content. `enableOwn` enables and
+    /// disables what is the application's own in it. Of the listener only `onResized` is called. Throws as
+    /// `createWindow` does.
+    virtual std::unique_ptr<NtMainWindow> adoptWindow(NtForeignWidget window, std::function<void(bool)> enableOwn,
+                                                      NtWindowListener& listener) = 0;
+
+    /// Takes a widget of the application's window as a container, which stays where the application has it.
+    virtual std::unique_ptr<NtContainer> adoptContainer(NtForeignWidget widget, NtPlaceListener& listener) = 0;
+
     /// Peers are made displayed and enabled, without a cell. Listeners are borrowed and outlive the peer.
     virtual std::unique_ptr<NtContainer> createContainer(NtContainer& parent, std::string const& name) = 0;
+    virtual std::unique_ptr<NtFloat> createFloat(NtContainer& parent, std::string const& name,
+                                                 NtFloatListener& listener) = 0;
     virtual std::unique_ptr<NtLabel> createLabel(NtContainer& parent, std::string const& name) = 0;
     virtual std::unique_ptr<NtTextField> createTextField(NtContainer& parent, std::string const& name,
                                                          NtTextFieldListener& listener) = 0;
@@ -97,6 +109,9 @@ public:
 
     /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.
     virtual void endLoop() = 0;
+
+    /// The application closes: ends all loops, each by setting its `*end`. One that begins later throws an `ExBase`.
+    virtual void closeLoops() = 0;
 };
 
 /// Name of the function that libKVnative exports; gives the process's one platform, which lives as long as the process.

@@ -1,5 +1,7 @@
 #include "native/qtFocusOrder.h"
 
+#include "native/floatWidget.h"
+
 #include <QLineEdit>
 #include <QPushButton>
 #include <QScrollArea>
@@ -73,7 +75,7 @@ bool isPushButton(QWidget const* widget)
 
 } // namespace
 
-QtFocusOrder::QtFocusOrder(QWidget const& root)
+QtFocusOrder::QtFocusOrder(QWidget const& root) : _root(&root)
 {
     std::vector<Stop> stops = findStops(root);
     sortAsTheEyeGoes(stops);
@@ -82,14 +84,13 @@ QtFocusOrder::QtFocusOrder(QWidget const& root)
                    [](Stop const& stop) { return stop.widget; });
 }
 
-QWidget* QtFocusOrder::getNext(QWidget const* current) const
+bool QtFocusOrder::step(bool next) const
 {
-    return step(current, 1);
-}
-
-QWidget* QtFocusOrder::getPrevious(QWidget const* current) const
-{
-    return step(current, -1);
+    QWidget* const target = find(_root->window()->focusWidget(), next ? 1 : -1);
+    if (!target)
+        return false;
+    give(*target, next ? Qt::TabFocusReason : Qt::BacktabFocusReason);
+    return true;
 }
 
 void QtFocusOrder::markAsValue(QWidget& widget)
@@ -116,9 +117,11 @@ void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
     for (QWidget* parent = widget.parentWidget(); parent; parent = parent->parentWidget())
         if (auto* const area = qobject_cast<QScrollArea*>(parent))
             area->ensureWidgetVisible(&widget);
+    if (FloatWidget const* const floating = FloatWidget::findAround(widget))
+        floating->askIntoView(widget);
 }
 
-QWidget* QtFocusOrder::step(QWidget const* current, int direction) const
+QWidget* QtFocusOrder::find(QWidget const* current, int direction) const
 {
     auto const count = static_cast<int>(_stops.size());
     if (count == 0)

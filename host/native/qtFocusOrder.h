@@ -14,10 +14,9 @@ public:
     /// The order in a widget as it is laid out now.
     explicit QtFocusOrder(QWidget const& root);
 
-    /// The one after `current` or before it, around the ends. `current` need not take the keyboard any more. Null where
-    /// nothing else does.
-    QWidget* getNext(QWidget const* current) const;
-    QWidget* getPrevious(QWidget const* current) const;
+    /// Gives the keyboard to the next widget or the one before, around the ends. The one that has it need not take the
+    /// keyboard any more. False where nothing else does.
+    bool step(bool next) const;
 
     /// Says that a widget holds a value: such a one has the keyboard first.
     static void markAsValue(QWidget& widget);
@@ -29,8 +28,9 @@ public:
     static void give(QWidget& widget, Qt::FocusReason reason);
 
 private:
-    QWidget* step(QWidget const* current, int direction) const;
+    QWidget* find(QWidget const* current, int direction) const;
 
+    QWidget const* _root;
     std::vector<QWidget*> _stops;
 };
 

@@ -1,7 +1,7 @@
 #include "native/qtGuard.h"
 
 #include "native/qtLoop.h"
-#include "native/windowWidget.h"
+#include "native/qtStage.h"
 
 #include <QCoreApplication>
 #include <QThread>
@@ -119,8 +119,7 @@ void QtGuard::destroy(QWidget* widget)
         widget->deleteLater();
         return;
     }
-    auto const* const window = dynamic_cast<WindowWidget const*>(widget->window());
-    if (getMoment() == (window ? window->getBirth() : Moment()))
+    if (getMoment() == QtStage::findBirth(*widget))
     {
         std::unique_ptr<QWidget> const done(widget);
         return;

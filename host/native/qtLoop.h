@@ -24,6 +24,9 @@ public:
     /// Dispatches events until the flag is true or an error came; gives that error, or null.
     std::exception_ptr run();
 
+    /// The loop that this one runs in; null for the outermost.
+    QtLoop* getOuter() const { return _outer; }
+
     /// Sets the end flag, which ends the loop.
     void end();
 

@@ -1,6 +1,10 @@
 #include "native/qtNative.h"
 
+#include "native/bottomLine.h"
+#include "native/floatWidget.h"
 #include "native/qtGuard.h"
+#include "native/qtPeer.h"
+#include "native/qtPointerWatch.h"
 #include "native/qtText.h"
 
 #include <QCoreApplication>
@@ -10,6 +14,18 @@
 
 namespace Kv
 {
+
+namespace
+{
+
+QColor getReadableOn(QColor const& ground)
+{
+    // Weighed as the eye sees them; the middle between black and white text lies well below the middle of the greys.
+    double const light = 0.2126 * ground.redF() + 0.7152 * ground.greenF() + 0.0722 * ground.blueF();
+    return light > 0.46 ? Qt::black : Qt::white;
+}
+
+} // namespace
 
 QtNative::QtNative(QWidget* widget, std::string const& name, int inset) : _widget(widget), _inset(inset)
 {
@@ -24,9 +40,12 @@ QtNative::QtNative(QWidget* widget, std::string const& name, int inset) : _widge
     _widget->show();
 }
 
+QtNative::QtNative(NtForeignWidget widget) : _widget(static_cast<QWidget*>(widget.widget)), _foreign(true) {}
+
 QtNative::~QtNative()
 {
-    QtGuard::getInstance().destroy(_widget);
+    if (!_foreign)
+        QtGuard::getInstance().destroy(_widget);
 }
 
 QWidget* QtNative::get() const
@@ -37,7 +56,7 @@ QWidget* QtNative::get() const
 void QtNative::setCell(int x, int y, int width, int height) const
 {
     QWidget* const widget = get();
-    if (!widget)
+    if (!widget || _foreign)
         return;
     int const inset = widget->sizeHint().height() > height - 2 * _inset ? 0 : _inset;
     widget->setGeometry(x, y + inset, std::max(width, 0), std::max(height - 2 * inset, 0));
@@ -68,6 +87,57 @@ void QtNative::raise() const
 {
     if (QWidget* const widget = get())
         widget->raise();
+}
+
+void QtNative::setBackground(NtColor const& color) const
+{
+    QWidget* const widget = get();
+    if (!widget)
+        return;
+    QColor const ground = QColor::fromRgbF(color.red, color.green, color.blue);
+    QPalette palette = widget->palette();
+    palette.setColor(widget->backgroundRole(), ground);
+    palette.setColor(widget->foregroundRole(), getReadableOn(ground));
+    widget->setPalette(palette);
+    widget->setAutoFillBackground(true);
+}
+
+void QtNative::setLineBelow(bool drawn) const
+{
+    QWidget* const widget = get();
+    if (!widget)
+        return;
+    auto* const line = widget->findChild<BottomLine*>(QString(), Qt::FindDirectChildrenOnly);
+    if (drawn && !line)
+        makeNative<BottomLine>(widget);
+    else if (!drawn)
+        QtGuard::getInstance().destroy(line);
+}
+
+void QtNative::setPointerListener(NtPointerListener& listener)
+{
+    QWidget* const widget = get();
+    if (!widget)
+        return;
+    _pointerWatch = std::make_unique<QtPointerWatch>(*widget, listener);
+    QWidget* const around = widget->parentWidget();
+    if (FloatWidget* const floating = around ? FloatWidget::findAround(*around) : nullptr)
+        floating->pin(*widget);
+}
+
+void QtNative::takeKeyboard() const
+{
+    if (QWidget* const widget = get())
+        widget->setFocus(Qt::OtherFocusReason);
+}
+
+bool QtNative::hasKeyboard() const
+{
+    QWidget const* const widget = get();
+    if (!widget)
+        return false;
+    QWidget const* const holder = widget->window()->focusWidget();
+    return holder && (holder == widget || widget->isAncestorOf(holder));
 }
 
 } // namespace Kv

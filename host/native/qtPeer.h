@@ -16,12 +16,18 @@ public:
     void setEnabled(bool enabled) override { _native.setEnabled(enabled); }
     void setTooltip(std::string const& text) override { _native.setTooltip(text); }
     void raise() override { _native.raise(); }
+    void setBackground(NtColor const& color) override { _native.setBackground(color); }
+    void setLineBelow(bool drawn) override { _native.setLineBelow(drawn); }
+    void setPointerListener(NtPointerListener& listener) override { _native.setPointerListener(listener); }
+    void takeKeyboard() override { _native.takeKeyboard(); }
+    bool hasKeyboard() const override { return _native.hasKeyboard(); }
 
     /// Borrowed; null when the widget is gone.
     Widget* getNative() const { return static_cast<Widget*>(_native.get()); }
 
 protected:
     QtPeer(Widget* widget, std::string const& name, int inset) : _native(widget, name, inset) {}
+    explicit QtPeer(NtForeignWidget widget) : _native(widget) {}
 
 private:
     QtNative _native;

@@ -1,10 +1,13 @@
 #include "native/qtPlatform.h"
 
+#include "native/qtAdoptedContainer.h"
 #include "native/qtBrowser.h"
 #include "native/qtContainer.h"
+#include "native/qtFloat.h"
 #include "native/qtGuard.h"
 #include "native/qtLabel.h"
 #include "native/qtLoop.h"
+#include "native/qtMainWindow.h"
 #include "native/qtMenu.h"
 #include "native/qtPushButton.h"
 #include "native/qtText.h"
@@ -20,6 +23,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <utility>
 
 namespace Kv
 {
@@ -32,7 +36,7 @@ constexpr GeVector2<int> assumedScreen{1920, 1080};
 
 QWidget* nativeOf(NtContainer& container)
 {
-    return dynamic_cast<QtContainer&>(container).getNative();
+    return dynamic_cast<QtHolder&>(container).getContent();
 }
 
 /// The widest line as it is drawn, with what its first and last glyph let stick out.
@@ -123,9 +127,27 @@ std::unique_ptr<NtWindow> QtPlatform::createWindow(std::string const& name, std:
                                       listener);
 }
 
+std::unique_ptr<NtMainWindow> QtPlatform::adoptWindow(NtForeignWidget window, std::function<void(bool)> enableOwn,
+                                                      NtWindowListener& listener)
+{
+    _application.requireWindows();
+    return std::make_unique<QtMainWindow>(window, std::move(enableOwn), listener);
+}
+
+std::unique_ptr<NtContainer> QtPlatform::adoptContainer(NtForeignWidget widget, NtPlaceListener& listener)
+{
+    return std::make_unique<QtAdoptedContainer>(widget, listener);
+}
+
 std::unique_ptr<NtContainer> QtPlatform::createContainer(NtContainer& parent, std::string const& name)
 {
     return std::make_unique<QtContainer>(nativeOf(parent), name);
+}
+
+std::unique_ptr<NtFloat> QtPlatform::createFloat(NtContainer& parent, std::string const& name,
+                                                 NtFloatListener& listener)
+{
+    return std::make_unique<QtFloat>(nativeOf(parent), name, listener);
 }
 
 std::unique_ptr<NtLabel> QtPlatform::createLabel(NtContainer& parent, std::string const& name)
@@ -167,6 +189,8 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     if (*until)
         return;
     _application.requireLoop();
+    if (_closed)
+        throw ExBase(__FILE__, __LINE__, "The application is closing: no dialog can be run any more");
     QPointer<QWidget> const window = QApplication::activeModalWidget();
     std::exception_ptr const error = QtLoop(until, end).run();
     QtGuard::getInstance().destroyWaiting();
@@ -180,6 +204,13 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
 void QtPlatform::endLoop()
 {
     if (QtLoop* const loop = QtGuard::getInstance().getInnermostLoop())
+        loop->end();
+}
+
+void QtPlatform::closeLoops()
+{
+    _closed = true;
+    for (QtLoop* loop = QtGuard::getInstance().getInnermostLoop(); loop; loop = loop->getOuter())
         loop->end();
 }
 

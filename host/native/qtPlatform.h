@@ -23,7 +23,12 @@ public:
     std::unique_ptr<NtWindow> createWindow(std::string const& name, std::string const& title,
                                            std::string const& contentName, GeRectangle<int> const& frame,
                                            NtWindow* owner, NtWindowListener& listener) override;
+    std::unique_ptr<NtMainWindow> adoptWindow(NtForeignWidget window, std::function<void(bool)> enableOwn,
+                                              NtWindowListener& listener) override;
+    std::unique_ptr<NtContainer> adoptContainer(NtForeignWidget widget, NtPlaceListener& listener) override;
     std::unique_ptr<NtContainer> createContainer(NtContainer& parent, std::string const& name) override;
+    std::unique_ptr<NtFloat> createFloat(NtContainer& parent, std::string const& name,
+                                         NtFloatListener& listener) override;
     std::unique_ptr<NtLabel> createLabel(NtContainer& parent, std::string const& name) override;
     std::unique_ptr<NtTextField> createTextField(NtContainer& parent, std::string const& name,
                                                  NtTextFieldListener& listener) override;
@@ -37,12 +42,14 @@ public:
 
     void runLoop(bool const volatile* until, bool volatile* end) override;
     void endLoop() override;
+    void closeLoops() override;
 
 private:
     QtApplication _application;
 
     /// The application that has our busy cursor, if one has.
     QPointer<QCoreApplication> _busyApplication;
+    bool _closed = false;
 };
 
 } // namespace Kv

@@ -8,7 +8,6 @@
 #include <QTimer>
 
 #include <algorithm>
-#include <functional>
 #include <utility>
 
 namespace Kv
@@ -17,9 +16,6 @@ namespace Kv
 namespace
 {
 
-/// How often a layout may make scroll bars come and go before it is left as it is.
-constexpr int maxRounds = 4;
-
 /// False where windows never cover each other, and the toolkit complains when they are asked to.
 bool hasStack()
 {
@@ -27,33 +23,12 @@ bool hasStack()
     return name != QLatin1String("offscreen") && name != QLatin1String("minimal");
 }
 
-/// Says when the room that it has for its content changes.
-class ContentArea final : public QScrollArea
-{
-public:
-    ContentArea(QWidget* parent, std::function<void()> onRoom) : QScrollArea(parent), _onRoom(std::move(onRoom))
-    {
-        setFrameShape(QFrame::NoFrame);
-        // Tab stops at widgets only.
-        setFocusPolicy(Qt::NoFocus);
-    }
-
-protected:
-    void resizeEvent(QResizeEvent* event) override
-    {
-        QScrollArea::resizeEvent(event);
-        _onRoom();
-    }
-
-private:
-    std::function<void()> _onRoom;
-};
-
 } // namespace
 
 WindowWidget::WindowWidget(QtListenerHandle<NtWindowListener> const& handle)
     : QWidget(nullptr, Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint), _handle(handle),
-      _area(new ContentArea(this, [this] { tellRoom(); }))
+      _area(new ContentArea(this, [handle](int width, int height)
+                            { handle.tell(&NtWindowListener::onResized, width, height); }))
 {
     setAttribute(Qt::WA_QuitOnClose, false);
 }
@@ -107,7 +82,8 @@ void WindowWidget::showEvent(QShowEvent* event)
     if (!event->spontaneous() && isModal())
         blockOthers();
     // Not on the screen yet, but with its final size: the first picture is laid out.
-    tellRoom();
+    if (_area)
+        _area->tellRoom();
 }
 
 void WindowWidget::hideEvent(QHideEvent* event)
@@ -117,7 +93,8 @@ void WindowWidget::hideEvent(QHideEvent* event)
     if (event->spontaneous())
         return;
     _blocked.clear();
-    _told = QSize();
+    if (_area)
+        _area->forgetRoom();
 }
 
 void WindowWidget::resizeEvent(QResizeEvent* event)
@@ -147,31 +124,7 @@ void WindowWidget::keyPressEvent(QKeyEvent* event)
 
 bool WindowWidget::focusNextPrevChild(bool next)
 {
-    QtFocusOrder const order(*this);
-    QWidget* const target = next ? order.getNext(focusWidget()) : order.getPrevious(focusWidget());
-    if (!target)
-        return false;
-    QtFocusOrder::give(*target, next ? Qt::TabFocusReason : Qt::BacktabFocusReason);
-    return true;
-}
-
-void WindowWidget::tellRoom()
-{
-    // Laying out can bring scroll bars, and these change the room again: that is told when the first is done.
-    if (_telling || !isVisible() || !_area)
-        return;
-    _telling = true;
-    QPointer<QWidget> const alive(this);
-    for (int round = 0; round < maxRounds && _told != _area->viewport()->size(); ++round)
-    {
-        _told = _area->viewport()->size();
-        _handle.tell(&NtWindowListener::onResized, _told.width(), _told.height());
-        if (!alive)
-            return;
-        if (!_area)
-            break;
-    }
-    _telling = false;
+    return QtFocusOrder(*this).step(next);
 }
 
 void WindowWidget::unblock(QWidget const& window)

@@ -1,11 +1,12 @@
 #pragma once
 
+#include "native/contentArea.h"
 #include "native/ntPeers.h"
 #include "native/qtInputDrop.h"
 #include "native/qtListenerHandle.h"
+#include "native/qtStage.h"
 
 #include <QPointer>
-#include <QScrollArea>
 #include <QWidget>
 
 #include <memory>
@@ -16,16 +17,13 @@ namespace Kv
 
 /// The toolkit's side of a window: says how much room the content has, walks the keyboard through the widgets, and
 /// passes on Escape and what the window manager asks for.
-class WindowWidget final : public QWidget
+class WindowWidget final : public QWidget, public QtStage
 {
 public:
     explicit WindowWidget(QtListenerHandle<NtWindowListener> const& handle);
 
     /// All that there are now, shown or not.
     static std::vector<QPointer<WindowWidget>> findAll();
-
-    /// When it was made.
-    QtGuard::Moment const& getBirth() const { return _birth; }
 
     /// Shows the window, modal to all others, and activates it.
     void showModal();
@@ -46,7 +44,6 @@ protected:
     bool focusNextPrevChild(bool next) override;
 
 private:
-    void tellRoom();
     void blockOthers();
     /// Lets input through to a window that is shown above this one now.
     void unblock(QWidget const& window);
@@ -54,13 +51,8 @@ private:
 
     QtListenerHandle<NtWindowListener> _handle;
     /// Natively a child, which others can delete.
-    QPointer<QScrollArea> _area;
+    QPointer<ContentArea> _area;
 
-    QtGuard::Moment _birth = QtGuard::getInstance().getMoment();
-
-    /// The room as it was told last; none is told to a hidden window.
-    QSize _told;
-    bool _telling = false;
     bool _awaited = false;
 
     /// Keep input from the windows that were open when this one was shown, while it is.

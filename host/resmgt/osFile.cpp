@@ -2,8 +2,16 @@
 
 #include "base/exBase.h"
 #include "resmgt/liStringUtil.h"
+#include "resmgt/osFileDescriptor.h"
+#include "resmgt/osTemporaryFile.h"
 
+#include <array>
+#include <cerrno>
+#include <fcntl.h>
+#include <optional>
+#include <sys/stat.h>
 #include <system_error>
+#include <unistd.h>
 #include <utility>
 
 namespace Kv
@@ -16,6 +24,54 @@ std::recursive_mutex& getDescriptorMutex()
 {
     static std::recursive_mutex mutex;
     return mutex;
+}
+
+[[noreturn]] void fail(char const* action, OsFilePath const& path, std::string const& words)
+{
+    throw ExBase(__FILE__, __LINE__,
+                 std::string("Cannot ") + action + " " + LiStringUtil::getPrintable(path.toString()) + ": " + words);
+}
+
+std::string getSystemWords()
+{
+    return std::generic_category().message(errno);
+}
+
+/// Nothing where the path leads to nothing.
+std::optional<struct stat> findStatus(OsFilePath const& path)
+{
+    struct stat status = {};
+    if (stat(path.getChars(), &status) == 0)
+        return status;
+    return std::nullopt;
+}
+
+bool canBeWritten(OsFilePath const& path, struct stat const& status)
+{
+    constexpr mode_t anyWriteBit = S_IWUSR | S_IWGRP | S_IWOTH;
+    return (status.st_mode & anyWriteBit) != 0 && faccessat(AT_FDCWD, path.getChars(), W_OK, AT_EACCESS) == 0;
+}
+
+char const* getNoFileWords(struct stat const& status)
+{
+    return S_ISDIR(status.st_mode) ? "it is a folder" : "it is no regular file";
+}
+
+/// What is in the way of writing a file, in words; nothing where nothing is. `status` is that of the file, if there is
+/// one.
+std::optional<std::string> findObstacle(OsFilePath const& path, std::optional<struct stat> const& status)
+{
+    OsFilePath const folder = path.getFolder();
+    auto const folderStatus = findStatus(folder);
+    if (!folderStatus)
+        return "its folder cannot be found: " + getSystemWords();
+    if (!canBeWritten(folder, *folderStatus))
+        return "its folder cannot be written";
+    if (status && !S_ISREG(status->st_mode))
+        return getNoFileWords(*status);
+    if (status && !canBeWritten(path, *status))
+        return "its permissions do not allow it";
+    return std::nullopt;
 }
 
 } // namespace
@@ -35,6 +91,55 @@ std::uint64_t OsFile::getSize() const
                      "Cannot tell the size of " + LiStringUtil::getPrintable(_path.toString()) + ": " +
                          error.message());
     return size;
+}
+
+std::string OsFile::read() const
+{
+    // A pipe that nobody writes to would never be open otherwise.
+    OsFileDescriptor const file(open(_path.getChars(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+    struct stat status = {};
+    if (!file.isOpen() || fstat(file.get(), &status) != 0)
+        fail("read", _path, getSystemWords());
+    if (!S_ISREG(status.st_mode))
+        fail("read", _path, getNoFileWords(status));
+    std::string content;
+    std::array<char, 1 << 16> buffer{};
+    for (;;)
+    {
+        ssize_t const count = ::read(file.get(), buffer.data(), buffer.size());
+        if (count == 0)
+            return content;
+        if (count > 0)
+            content.append(buffer.data(), static_cast<std::size_t>(count));
+        else if (errno != EINTR)
+            fail("read", _path, getSystemWords());
+    }
+}
+
+bool OsFile::isWritable() const
+{
+    OsFilePath const target = _path.getCanonical();
+    return !findObstacle(target, findStatus(target));
+}
+
+void OsFile::replace(std::string const& content) const
+{
+    OsFilePath const target = _path.getCanonical();
+    auto const old = findStatus(target);
+    if (auto const obstacle = findObstacle(target, old))
+        fail("write", target, *obstacle);
+    try
+    {
+        OsTemporaryFile file(target.getFolder());
+        file.write(content);
+        if (old)
+            file.takeOwnerAndPermissions(*old);
+        file.moveTo(target);
+    }
+    catch (std::system_error const& error)
+    {
+        fail("write", target, error.code().message());
+    }
 }
 
 } // namespace Kv

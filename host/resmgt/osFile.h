@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <mutex>
+#include <string>
 
 namespace Kv
 {
@@ -32,6 +33,19 @@ public:
     /// Size in bytes, asked of the system at each call. Throws `ExBase`, naming the path, where there is no file, or
     /// what is there is a directory or something else without a size.
     std::uint64_t getSize() const;
+
+    /// The whole content. Throws `ExBase`, naming the path, where there is no regular file that can be read.
+    std::string read() const;
+
+    /// Whether `replace` would find what it needs: a regular file that can be written, or none, in a folder that can be
+    /// written. A file that nobody may write, by its permissions, cannot be written by the superuser either.
+    bool isWritable() const;
+
+    /// Makes `content` the whole content of the file, at once or not at all: another process sees the old file or the
+    /// new one, and so does whoever comes after a failure. Symbolic links are followed, and a file that is there keeps
+    /// its permissions and, where the system allows it, its owner. Throws `ExBase`, naming the path, where it cannot be
+    /// done.
+    void replace(std::string const& content) const;
 
 private:
     OsFilePath _path;

@@ -25,6 +25,20 @@ public:
     /// True for a path without components.
     bool isEmpty() const;
 
+    /// The absolute path of what the system finds under this one: symbolic links are followed, and "." and ".." taken
+    /// out. What comes behind the last component that exists stays as it is. Throws `ExBase` where a relative path
+    /// stands in a folder that is no longer there.
+    OsFilePath getCanonical() const;
+
+    /// The folder that holds what the path names; that of "name" alone is ".".
+    OsFilePath getFolder() const;
+
+    /// The last component.
+    std::string getFileName() const;
+
+    friend bool operator==(OsFilePath const& a, OsFilePath const& b) { return a._path == b._path; }
+    friend bool operator!=(OsFilePath const& a, OsFilePath const& b) { return !(a == b); }
+
 private:
     std::filesystem::path _path;
 };

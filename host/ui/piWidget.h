@@ -19,6 +19,9 @@ public:
     {
         Enable = 1,
         Disable = 2,
+        PointerMove = 11,
+        PointerDown = 12,
+        PointerUp = 13,
         State = 22,
         Activate = 23,
         ValueChanged = 24,
@@ -55,6 +58,9 @@ class EvEvent
 {
 public:
     explicit EvEvent(PiWidget::EventType type) : _type(type) {}
+    EvEvent(EvEvent const&) = delete;
+    EvEvent& operator=(EvEvent const&) = delete;
+    virtual ~EvEvent() = default;
 
     PiWidget::EventType getType() const { return _type; }
 

@@ -91,11 +91,19 @@ Iterator<RCShdPtr<UiWidget>> UiContainer::findWidgets(PrdPredicate<UiWidget> con
     return Iterator<RCShdPtr<UiWidget>>(std::move(found));
 }
 
-void UiContainer::front(RCShdPtr<UiWidget> const& child)
+void UiContainer::front(RCShdPtr<UiWidget> const& descendant)
 {
     requireUiThread();
-    if (child->_peer)
-        child->_peer->raise();
+    if (descendant->_peer)
+        descendant->_peer->raise();
+    descendant->cameToFront();
+}
+
+void UiContainer::setFocusWidget(RCShdPtr<UiWidget> const& descendant)
+{
+    requireUiThread();
+    if (descendant->_peer && descendant->isKeyboardFocusable())
+        descendant->_peer->takeKeyboard();
 }
 
 void UiContainer::focusFirst()

@@ -29,6 +29,10 @@ public:
     RttiType const& getRttiType() const override;
 
     UiWindow* getWindow() const override;
+
+    /// What the widgets in it are laid out in, in pixels of the window.
+    virtual GeRectangle<int> getFrame() const { return getRect(); }
+
     void setRect(GeRectangle<int> const& rect, bool layOut) override;
     void show() override;
 
@@ -41,8 +45,11 @@ public:
     /// All descendants that satisfy the predicate, from front to back and depth first.
     Iterator<RCShdPtr<UiWidget>> findWidgets(PrdPredicate<UiWidget> const& predicate) const;
 
-    /// Puts the child above its siblings on the screen.
-    void front(RCShdPtr<UiWidget> const& child);
+    /// Puts a descendant above its siblings on the screen.
+    void front(RCShdPtr<UiWidget> const& descendant);
+
+    /// Gives a descendant the keyboard, if it can have it.
+    void setFocusWidget(RCShdPtr<UiWidget> const& descendant);
 
     /// Gives the keyboard to the first widget in it that holds a value, without one to the first push button.
     void focusFirst();
@@ -54,21 +61,21 @@ protected:
     explicit UiContainer(std::string name);
 
     std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
+    void dropPeer() override;
 
     bool takesInput() const override;
+
+    /// Makes the peers of the widgets in it inside `native`, which is borrowed.
+    void attachNative(NtPlatform& platform, NtContainer& native);
+
+    /// Places the widgets in it by their constraints, all the way down.
+    virtual void layOutChildren();
 
 private:
     friend class UiWidget;
     friend class UiTopLevel;
 
-    /// Makes the peers of the widgets in it inside `native`, which is borrowed.
-    void attachNative(NtPlatform& platform, NtContainer& native);
-    void dropPeer() override;
     void forgetHandlers() override;
-
-    /// Places the widgets in it by their constraints, all the way down.
-    void layOutChildren();
-
     void removeChild(UiWidget* child);
     void forgetNames();
     void collect(PrdPredicate<UiWidget> const& predicate, std::vector<RCShdPtr<UiWidget>>& found) const;

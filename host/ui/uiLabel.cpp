@@ -46,6 +46,9 @@ RttiType const& UiLabel::getRttiType() const
 
 int UiLabel::getLeastWidth() const
 {
+    // A title gives way: it is as wide as what it stands on, and what is too long of it is left out.
+    if (isGrip())
+        return 0;
     return static_cast<int>(WsFontRegistry::getInstance().getDefaultFont()->getStringWidth(_label.getString().c_str()));
 }
 

@@ -40,8 +40,31 @@ char const* wordFor(UiConstraint::EdgeName edge)
 
 } // namespace
 
+GeVector2<int> UiLayout::measureOverflow(UiContainer const& container)
+{
+    GeRectangle<int> const frame = container.getFrame();
+    GeVector2<int> most;
+    for (RCShdPtr<UiWidget> const& child : container.getChildren())
+    {
+        GeRectangle<int> const& rect = child->getRect();
+        most.x = std::max({most.x, rect.xMax - frame.xMax, frame.xMin - rect.xMin});
+        most.y = std::max({most.y, rect.yMax - frame.yMax, frame.yMin - rect.yMin});
+        if (auto const* const inner = dynamic_cast<UiContainer const*>(child.get()))
+        {
+            GeVector2<int> const within = measureOverflow(*inner);
+            most.x = std::max(most.x, within.x);
+            most.y = std::max(most.y, within.y);
+        }
+        else if (std::optional<UiConstraint> const& constraint = child->getConstraint();
+                 constraint && constraint->getEdge(UiConstraint::X1).target != UiConstraint::OwnOpposite &&
+                 constraint->getEdge(UiConstraint::X2).target != UiConstraint::OwnOpposite)
+            most.x = std::max(most.x, child->getLeastWidth() - rect.getWidth());
+    }
+    return most;
+}
+
 UiLayout::UiLayout(UiContainer const& container)
-    : _frame(container.getRect()), _children(container.getChildren()), _positions(_children.size() * edgeCount),
+    : _frame(container.getFrame()), _children(container.getChildren()), _positions(_children.size() * edgeCount),
       _progress(_positions.size(), Progress::Untouched)
 {
     for (std::size_t child = 0; child < _children.size(); ++child)

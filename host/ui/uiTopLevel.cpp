@@ -2,10 +2,8 @@
 
 #include "gfx/wsNative.h"
 #include "resmgt/liStringUtil.h"
-#include "ui/uiPushButton.h"
-#include "ui/uiWidgetPredicate.h"
-
-#include <algorithm>
+#include "ui/uiEscapeButton.h"
+#include "ui/uiLayout.h"
 
 namespace Kv
 {
@@ -19,37 +17,6 @@ class RootContainer : public UiContainer
 public:
     RootContainer() : UiContainer("root") {}
 };
-
-/// True if neither the widget nor what holds it is hidden.
-bool isDisplayedThroughout(UiWidget const& widget)
-{
-    RCShdPtr<UiContainer> const parent = widget.getParent();
-    return widget.isDisplayed() && (!parent || isDisplayedThroughout(*parent));
-}
-
-/// By how much the widgets of a container stand out of it, at any depth, in pixels.
-GeVector2<int> measureOverflow(UiContainer const& container)
-{
-    GeRectangle<int> const& frame = container.getRect();
-    GeVector2<int> most;
-    for (RCShdPtr<UiWidget> const& child : container.getChildren())
-    {
-        GeRectangle<int> const& rect = child->getRect();
-        most.x = std::max({most.x, rect.xMax - frame.xMax, frame.xMin - rect.xMin});
-        most.y = std::max({most.y, rect.yMax - frame.yMax, frame.yMin - rect.yMin});
-        if (auto const* const inner = dynamic_cast<UiContainer const*>(child.get()))
-        {
-            GeVector2<int> const within = measureOverflow(*inner);
-            most.x = std::max(most.x, within.x);
-            most.y = std::max(most.y, within.y);
-        }
-        else if (std::optional<UiConstraint> const& constraint = child->getConstraint();
-                 constraint && constraint->getEdge(UiConstraint::X1).target != UiConstraint::OwnOpposite &&
-                 constraint->getEdge(UiConstraint::X2).target != UiConstraint::OwnOpposite)
-            most.x = std::max(most.x, child->getLeastWidth() - rect.getWidth());
-    }
-    return most;
-}
 
 } // namespace
 
@@ -114,13 +81,17 @@ std::unique_ptr<NtPeer> UiTopLevel::createPeer(NtPlatform&, NtContainer&)
     return nullptr;
 }
 
+std::unique_ptr<NtWindow> UiTopLevel::createNative(NtPlatform& platform)
+{
+    std::shared_ptr<UiTopLevel> const owner = _owner.lock();
+    NtWindow* const nativeOwner = owner && owner->_osWindow ? &owner->_osWindow->getNative() : nullptr;
+    return platform.createWindow(getName(), _title, _root->getName(), _style->getFrame(), nativeOwner, *this);
+}
+
 void UiTopLevel::makeNative()
 {
     NtPlatform& platform = WsNative::getPlatform();
-    std::shared_ptr<UiTopLevel> const owner = _owner.lock();
-    NtWindow* const nativeOwner = owner && owner->_osWindow ? &owner->_osWindow->getNative() : nullptr;
-    _osWindow = makeShd<WsWindow>(
-        platform.createWindow(getName(), _title, _root->getName(), _style->getFrame(), nativeOwner, *this));
+    _osWindow = makeShd<WsWindow>(createNative(platform));
     try
     {
         _root->attachNative(platform, _osWindow->getNative().getContent());
@@ -142,7 +113,7 @@ void UiTopLevel::onResized(int width, int height)
 {
     RCShdPtr<UiTopLevel> const self(this);
     _root->setRect({0, width, 0, height}, true);
-    GeVector2<int> const overflow = measureOverflow(*_root);
+    GeVector2<int> const overflow = UiLayout::measureOverflow(*_root);
     if (overflow.x > 0 || overflow.y > 0)
         _root->setRect({0, width + overflow.x, 0, height + overflow.y}, true);
     _osWindow->getNative().setContentSize(_root->getRect().getWidth(), _root->getRect().getHeight());
@@ -151,32 +122,17 @@ void UiTopLevel::onResized(int width, int height)
 void UiTopLevel::onEscape()
 {
     RCShdPtr<UiTopLevel> const self(this);
-    if (RCShdPtr<UiPushButton> const button = findEscapeButton())
+    if (RCShdPtr<UiPushButton> const button = findEscapeButton(*_root))
         button->press();
 }
 
 void UiTopLevel::onCloseRequested()
 {
     RCShdPtr<UiTopLevel> const self(this);
-    if (RCShdPtr<UiPushButton> const button = findEscapeButton())
+    if (RCShdPtr<UiPushButton> const button = findEscapeButton(*_root))
         button->press();
     else
         WsNative::getPlatform().endLoop();
-}
-
-RCShdPtr<UiPushButton> UiTopLevel::findEscapeButton() const
-{
-    PrdPredicate<UiWidget> const isReachable(&isDisplayedThroughout);
-    Iterator<RCShdPtr<UiWidget>> buttons =
-        _root->findWidgets(UiWidgetPredicate::isType(UiPushButton::getClassType()) && isReachable);
-    RCShdPtr<UiPushButton> button;
-    for (buttons.first(); !buttons.atEnd(); buttons.next())
-    {
-        button = dynamicCast<UiPushButton>(buttons.item());
-        if (button->getLabel().getString() == "Cancel")
-            return button;
-    }
-    return buttons.getCardinality() == 1 ? button : nullptr;
 }
 
 } // namespace Kv

@@ -10,13 +10,11 @@
 namespace Kv
 {
 
-class UiPushButton;
-
 /// A window of its own on the screen, with the tree of widgets in it. A window manager that asks it to close, and
 /// Escape, press its push button labelled "Cancel", else its only push button; one that is disabled does nothing then,
 /// and one that is not displayed does not count. Where there is none, a request to close ends the innermost message
 /// loop.
-class KVUI_API UiTopLevel : public UiWidget, public UiWindow, private NtWindowListener
+class KVUI_API UiTopLevel : public UiWidget, public UiWindow, protected NtWindowListener
 {
 public:
     /// A window that is not yet shown. Makes no native window, which comes with the first show.
@@ -49,13 +47,17 @@ protected:
 
     std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
 
-private:
+    /// The native window, not yet shown.
+    virtual std::unique_ptr<NtWindow> createNative(NtPlatform& platform);
+
+    /// Makes the native window, and the peers of all that stands in it.
     void makeNative();
-    void dropNative();
-    /// The button that Escape presses; null if there is none.
-    RCShdPtr<UiPushButton> findEscapeButton() const;
 
     void onResized(int width, int height) override;
+
+private:
+    void dropNative();
+
     void onEscape() override;
     void onCloseRequested() override;
 

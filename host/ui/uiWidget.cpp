@@ -4,12 +4,17 @@
 #include "native/ntPlatform.h"
 #include "resmgt/liStringUtil.h"
 #include "ui/uiContainer.h"
+#include "ui/uiPointerCallbacks.h"
 #include "ui/uiResTable.h"
+#include "ui/uiWindow.h"
 
 #include <utility>
 
 namespace Kv
 {
+
+LiString const UiWidget::DefaultFrame("default");
+char const* const UiWidget::BackgroundColor = "background";
 
 UiWidget::UiWidget(std::string name) : _name(std::move(name))
 {
@@ -99,9 +104,53 @@ void UiWidget::setEnabled(bool enabled)
     if (enabled == _enabled)
         return;
     _enabled = enabled;
-    if (_peer)
-        _peer->setEnabled(enabled);
+    enablePeer();
     fire(enabled ? PiWidget::Enable : PiWidget::Disable);
+}
+
+void UiWidget::setBlocked(bool blocked)
+{
+    requireUiThread();
+    _blocked = blocked;
+    enablePeer();
+}
+
+bool UiWidget::hasKeyboard() const
+{
+    return _peer && _peer->hasKeyboard();
+}
+
+void UiWidget::setFrame(RCShdPtr<UiFrame> const& frame, LiString const& name)
+{
+    requireUiThread();
+    if (name != DefaultFrame)
+        throw ExBase(__FILE__, __LINE__, "A widget has no frame \"" + name.toString() + "\"");
+    _frame = frame;
+    showLook();
+}
+
+void UiWidget::setColor(char const* name, CoRgbColorTyped<float> const& color)
+{
+    requireUiThread();
+    if (LiString(name) != LiString(BackgroundColor))
+        throw ExBase(__FILE__, __LINE__, std::string("A widget has no colour \"") + name + "\"");
+    _background = color;
+    showLook();
+}
+
+void UiWidget::setPointerMoveCb(CbHandler<EvEvent>* handler)
+{
+    getPointerCallbacks().setMoveCb(handler);
+}
+
+void UiWidget::setPointerDownCb(CbHandler<EvEvent>* handler)
+{
+    getPointerCallbacks().setDownCb(handler);
+}
+
+void UiWidget::setPointerUpCb(CbHandler<EvEvent>* handler)
+{
+    getPointerCallbacks().setUpCb(handler);
 }
 
 void UiWidget::clearParent()
@@ -142,20 +191,32 @@ void UiWidget::fire(PiWidget::EventType type)
 
 bool UiWidget::takesInput() const
 {
-    return _peer && _displayed && _enabled && _parent && _parent->takesInput();
+    return _peer && _displayed && _enabled && !_blocked && _parent && _parent->takesInput();
 }
 
 void UiWidget::forgetHandlers()
 {
     if (_piWidget)
         _piWidget->clear();
+    if (_pointerCallbacks)
+        _pointerCallbacks->clear();
+}
+
+GeVector2<int> UiWidget::turnOver(int x, int y) const
+{
+    UiWindow const* const window = getWindow();
+    return {x, window ? window->getRootContainer()->getRect().yMax - y : -y};
 }
 
 void UiWidget::realize(NtPlatform& platform, NtContainer& parent)
 {
     _peer = createPeer(platform, parent);
-    _peer->setEnabled(_enabled);
+    enablePeer();
     _peer->setTooltip(_tooltip);
+    if (_frame || _background)
+        showLook();
+    if (_pointerCallbacks)
+        _peer->setPointerListener(*_pointerCallbacks);
     _peer->setDisplayed(_displayed);
 }
 
@@ -168,8 +229,35 @@ void UiWidget::placePeer()
 {
     if (!_peer || !_parent)
         return;
-    GeRectangle<int> const& parent = _parent->getRect();
+    GeRectangle<int> const parent = _parent->getFrame();
     _peer->setCell(_rect.xMin - parent.xMin, parent.yMax - _rect.yMax, _rect.getWidth(), _rect.getHeight());
+}
+
+void UiWidget::enablePeer()
+{
+    if (_peer)
+        _peer->setEnabled(_enabled && !_blocked);
+}
+
+void UiWidget::showLook()
+{
+    if (!_peer)
+        return;
+    _peer->setLineBelow(_frame && _frame->hasBottomLine());
+    if (_background)
+        _peer->setBackground({_background->red, _background->green, _background->blue});
+}
+
+UiPointerCallbacks& UiWidget::getPointerCallbacks()
+{
+    requireUiThread();
+    if (!_pointerCallbacks)
+    {
+        _pointerCallbacks = std::make_unique<UiPointerCallbacks>(this);
+        if (_peer)
+            _peer->setPointerListener(*_pointerCallbacks);
+    }
+    return *_pointerCallbacks;
 }
 
 RCShdPtr<RCBase<LkCounter<int>>> const* UiWidget::getClientDataListPtr() const

@@ -1,11 +1,15 @@
 #pragma once
 
 #include "base/geRectangle.h"
+#include "base/geVector2.h"
 #include "base/rcShdPtr.h"
 #include "base/rttiType.h"
+#include "gfx/coRgbColor.h"
+#include "resmgt/liString.h"
 #include "ui/kvUiExport.h"
 #include "ui/piWidget.h"
 #include "ui/uiConstraint.h"
+#include "ui/uiFrame.h"
 
 #include <memory>
 #include <optional>
@@ -18,7 +22,11 @@ namespace Kv
 class NtContainer;
 class NtPeer;
 class NtPlatform;
+class EvPointerButtonDownEvent;
+class EvPointerButtonUpEvent;
+class EvPointerMoveEvent;
 class UiContainer;
+class UiPointerCallbacks;
 class UiResTable;
 class UiWindow;
 
@@ -27,6 +35,11 @@ class UiWindow;
 class KVUI_API UiWidget : public RCBase<LkCounter<int>>
 {
 public:
+    /// The name of the frame that a widget has in every state.
+    static LiString const DefaultFrame;
+    /// The name of the colour of a widget's ground.
+    static char const* const BackgroundColor;
+
     ~UiWidget() override;
 
     static RttiType const& getClassType();
@@ -71,6 +84,34 @@ public:
     /// A change runs the handlers of `Enable` or `Disable`.
     void setEnabled(bool enabled);
 
+    /// Whether something above the widget keeps input from it for a while; its own enabled state stays as it is.
+    void setBlocked(bool blocked);
+
+    /// Whether the widget itself can be given the keyboard.
+    bool isKeyboardFocusable() const { return _keyboardFocusable; }
+    void setKeyboardFocusable(bool focusable) { _keyboardFocusable = focusable; }
+
+    /// True if the widget, or one in it, has the keyboard whenever its window has it.
+    bool hasKeyboard() const;
+
+    /// Sets the frame of that name; null takes it away. `DefaultFrame` is the one that there is, another name throws an
+    /// `ExBase`.
+    void setFrame(RCShdPtr<UiFrame> const& frame, LiString const& name);
+
+    /// Sets the colour of that name. `BackgroundColor` is the one that there is, another name throws an `ExBase`.
+    void setColor(char const* name, CoRgbColorTyped<float> const& color);
+
+    /// Sets the handler that runs when the pointer moves on the widget, or the left button goes down or up there. The
+    /// handlers are borrowed; null takes one away.
+    void setPointerMoveCb(CbHandler<EvEvent>* handler);
+    void setPointerDownCb(CbHandler<EvEvent>* handler);
+    void setPointerUpCb(CbHandler<EvEvent>* handler);
+
+    /// Begins, goes on with and ends a drag of the widget, for those kinds that can be dragged.
+    virtual void arm(EvPointerButtonDownEvent const&) {}
+    virtual void mmove(EvPointerMoveEvent const&) {}
+    virtual void disarm(EvPointerButtonUpEvent const&) {}
+
     /// Takes the widget out of its parent, which may end its life, and off the screen. Its handlers, and those of the
     /// widgets in it, are forgotten: their owner may be about to go. May come from any thread.
     void clearParent();
@@ -111,12 +152,25 @@ protected:
     /// Lets the native peer go. A widget that points to it forgets it first.
     virtual void dropPeer();
 
+    /// The widget has been put above its siblings.
+    virtual void cameToFront() {}
+
+    /// True if the pointer moves something by the widget.
+    bool isGrip() const { return _pointerCallbacks.operator bool(); }
+
+    /// A point of the window, in pixels, with y growing downward, as one with y growing upward.
+    GeVector2<int> turnOver(int x, int y) const;
+
 private:
     friend class UiContainer;
+    friend class UiPointerCallbacks;
 
     virtual void forgetHandlers();
     void realize(NtPlatform& platform, NtContainer& parent);
     void placePeer();
+    void enablePeer();
+    void showLook();
+    UiPointerCallbacks& getPointerCallbacks();
 
     std::string _name;
     std::string _tooltip;
@@ -126,6 +180,12 @@ private:
     GeRectangle<int> _rect;
     bool _displayed = true;
     bool _enabled = true;
+    bool _blocked = false;
+    bool _keyboardFocusable = false;
+    RCShdPtr<UiFrame> _frame;
+    std::optional<CoRgbColorTyped<float>> _background;
+    /// Outlives the peer, which knows it.
+    std::unique_ptr<UiPointerCallbacks> _pointerCallbacks;
     std::unique_ptr<NtPeer> _peer;
     std::vector<RCShdPtr<RCBase<LkCounter<int>>>> _clientData;
 };

@@ -23,6 +23,9 @@ public:
 
     virtual bool isShown() const = 0;
 
+    /// How many times input is refused in the window just now.
+    virtual int getInputLevel() const { return 0; }
+
     /// Paints the window anew. True if it stands on the screen.
     virtual bool redraw() = 0;
 };

@@ -2,20 +2,26 @@
 
 #include "pyDialog.h"
 
+#include "appUi/uiAppDisabler.h"
 #include "gfx/wsCursorRegistry.h"
 #include "gfx/wsScreen.h"
 #include "pyUiError.h"
 #include "resmgt/xmlDocument.h"
+#include "ui/evPointerEvent.h"
 #include "ui/uiApplication.h"
+#include "ui/uiColorRegistry.h"
 #include "ui/uiCursorGuard.h"
 #include "ui/uiDualState.h"
+#include "ui/uiLabel.h"
 #include "ui/uiMenu.h"
+#include "ui/uiMoveContainer.h"
 #include "ui/uiPushButton.h"
 #include "ui/uiTextField.h"
 #include "ui/uiWidgetFactory.h"
 #include "ui/uiWidgetPredicate.h"
 
 #include <algorithm>
+#include <memory>
 
 namespace bp = boost::python;
 
@@ -41,8 +47,9 @@ private:
     PyObject* _traceback = nullptr;
 };
 
-/// What the title takes of a window of its own, in pixels.
+// In pixels: what the title takes of a window of its own, and of a floating container.
 constexpr int titleHeight = 24;
+constexpr int floatingTitleHeight = 25;
 
 /// More than any window, and far from where sums of sizes end.
 constexpr int maxSize = 1 << 23;
@@ -120,7 +127,8 @@ std::string const Dialog::_closeButtonClickedKey = "CloseButtonClicked";
 Dialog::Dialog(std::string const& title, std::string const& xmlString, int width, int height,
                Positionner const& position)
     : _xml(xmlString), _title(title), _width(width), _height(height), _topLevel(UiAppMgr::getInstance().getTopLevel()),
-      _widgetCbs(makeShd<WidgetCbs>(this))
+      _moveCb(this, &Dialog::onTitleBarMove), _armCb(this, &Dialog::onTitleBarPress),
+      _disarmCb(this, &Dialog::onTitleBarRelease), _widgetCbs(makeShd<WidgetCbs>(this))
 {
     createUi(position);
 }
@@ -137,7 +145,7 @@ Dialog::~Dialog()
     _topLevel.reset();
 }
 
-void Dialog::createUi(Positionner const&)
+void Dialog::createUi(Positionner const& position)
 {
     if (_width < 1 || _height < 1)
     {
@@ -161,6 +169,8 @@ void Dialog::createUi(Positionner const&)
         _ownTopLevel = true;
         _container = createTopLevelPanel(_topLevel);
     }
+    else
+        _container = createFloatingContainer(_width, _height, position.divisions, position.position, _title);
     XmlDocument const document(_xml);
     RCShdPtr<XmlElement> const root = document.getRoot();
     UiWidgetFactory::createWidget(_container, *root);
@@ -178,15 +188,75 @@ RCShdPtr<UiContainer> Dialog::createTopLevelPanel(RCShdPtr<UiTopLevel> const& to
     return panel;
 }
 
+RCShdPtr<UiContainer> Dialog::createFloatingContainer(int width, int height, int divisions, int position,
+                                                      std::string const& title)
+{
+    RCShdPtr<UiPanel> const panel = UiAppMgr::getInstance().getMainPanel();
+    GeRectangle<int> const size = panel->getRect();
+    RCShdPtr<UiContainer> const container = UiMoveContainer::create(panel, "Whatever", nullptr);
+    GeRectangle<int> const place = panel->getRect();
+    GeRectangle<int> rect;
+    rect.xMin = size.getWidth() / 2 - width / 2 + place.xMin;
+    rect.yMin = size.getHeight() / divisions * position - height / 2 + place.yMin;
+    rect.xMax = rect.xMin + width;
+    rect.yMax = rect.yMin + height + floatingTitleHeight;
+    container->setRect(rect, true);
+    createTitleBar(container, title);
+    container->setKeyboardFocusable(true);
+    if (RCShdPtr<UiContainer> const root = container->getWindow()->getRootContainer())
+    {
+        container->show();
+        root->setFocusWidget(container);
+        root->front(container);
+    }
+    return container;
+}
+
+void Dialog::createTitleBar(RCShdPtr<UiContainer> const& container, std::string const& title)
+{
+    RCShdPtr<UiLabel> const titleBar = UiLabel::create(container, "titleBar", nullptr);
+    titleBar->getLabel().setString(title.c_str());
+    constexpr auto pixels = UiConstraint::Type(0);
+    constexpr auto low = UiConstraint::Target(0);
+    constexpr auto high = UiConstraint::Target(1);
+    UiConstraint const constraint(0.0F, -24.0F, 0.0F, 0.0F, pixels, pixels, pixels, pixels, low, high, high, high, "",
+                                  "", "", "");
+    RCShdPtr<UiFrame> const frame = makeShd<UiFrameLineBottom>();
+    titleBar->setConstraint(constraint);
+    titleBar->setFrame(frame, UiWidget::DefaultFrame);
+    titleBar->setColor(UiWidget::BackgroundColor, UiColorRegistry::getInstance().getColor(UiColorRegistry::Grey65));
+    titleBar->setPointerMoveCb(&_moveCb);
+    titleBar->setPointerDownCb(&_armCb);
+    titleBar->setPointerUpCb(&_disarmCb);
+}
+
+void Dialog::onTitleBarMove(EvEvent& event)
+{
+    _container->mmove(dynamic_cast<EvPointerMoveEvent&>(event));
+}
+
+void Dialog::onTitleBarPress(EvEvent& event)
+{
+    _container->arm(dynamic_cast<EvPointerButtonDownEvent&>(event));
+}
+
+void Dialog::onTitleBarRelease(EvEvent& event)
+{
+    _container->disarm(dynamic_cast<EvPointerButtonUpEvent&>(event));
+}
+
 std::string Dialog::launch()
 {
     clearCloseCallbacks();
     setupCloseCallbacks();
+    std::unique_ptr<UiAppDisabler> disabler;
     if (_ownTopLevel)
     {
         UiAppMgr::getInstance().setTopLevel(_topLevel);
         _topLevel->show();
     }
+    else
+        disabler = std::make_unique<UiAppDisabler>();
     _container->getParent()->front(_container);
     _container->show();
     {

@@ -10,6 +10,7 @@
 #include "pyCallables.h"
 #include "pyWidgetCbs.h"
 #include "ui/uiContainer.h"
+#include "ui/uiEventCallback.h"
 #include "ui/uiTopLevel.h"
 
 #include <string>
@@ -22,8 +23,9 @@ namespace Kv::PyextUi
 inline std::string const closeButtonPrefix = "CloseButton_";
 
 /// A dialog: a window built from a description, whose widgets a script fills, reads and hears of, and which runs
-/// modally until one of its close buttons is pressed. Held through `RCShdPtr`; owns its window and every handler that
-/// it gives to the widgets in it.
+/// modally until one of its close buttons is pressed. Inside the application it floats in the main panel, otherwise it
+/// has a window of its own. Held through `RCShdPtr`; owns that window and every handler that it gives to the widgets in
+/// it.
 ///
 /// A failure that the dialog finds itself is a `UiError`; those of the host pass through.
 class KVPYEXTUI_API Dialog : public RCBase<LkCounter<int>>
@@ -40,7 +42,7 @@ public:
         int position;
     };
 
-    /// Builds the dialog; it stands on no screen before `launch`. `xmlString` is the description itself, `width` and
+    /// Builds the dialog. Inside the application it is seen from here on, otherwise from `launch` on. `xmlString` is the description itself, `width` and
     /// `height` are the size of the content in pixels, where anything below 1 stands for 80 % of the screen.
     Dialog(std::string const& title, std::string const& xmlString, int width, int height, Positionner const& position);
     Dialog(Dialog const&) = delete;
@@ -123,6 +125,13 @@ private:
 
     void createUi(Positionner const& position);
     static RCShdPtr<UiContainer> createTopLevelPanel(RCShdPtr<UiTopLevel> const& topLevel);
+    RCShdPtr<UiContainer> createFloatingContainer(int width, int height, int divisions, int position,
+                                                  std::string const& title);
+    void createTitleBar(RCShdPtr<UiContainer> const& container, std::string const& title);
+
+    void onTitleBarMove(EvEvent& event);
+    void onTitleBarPress(EvEvent& event);
+    void onTitleBarRelease(EvEvent& event);
 
     void clearCloseCallbacks();
     /// Takes the handler of a close button from the button that has it, where several bear the name.
@@ -140,6 +149,9 @@ private:
     bool _ownTopLevel = false;
     RCShdPtr<UiTopLevel> _topLevel;
     RCShdPtr<UiContainer> _container;
+    UiEventCallback<Dialog> _moveCb;
+    UiEventCallback<Dialog> _armCb;
+    UiEventCallback<Dialog> _disarmCb;
     std::string _closeButtonClicked;
     RCShdPtr<WidgetCbs> _widgetCbs;
     CallbackSets _closeCallbacks;

@@ -1,0 +1,296 @@
+#include "application.h"
+
+#include "buildInfo.h"
+
+#include "appUi/uiAppMgr.h"
+#include "base/exBase.h"
+#include "base/rcWeakAccessor.h"
+#include "gfx/wsNative.h"
+
+#include <QApplication>
+#include <QFileDialog>
+#include <QFileInfo>
+#include <QMessageBox>
+
+#include <algorithm>
+#include <sstream>
+#include <utility>
+
+namespace Velmora
+{
+
+namespace
+{
+
+/// How often Ctrl-C is looked for while no script runs.
+constexpr int signalInterval = 100;
+constexpr int interruptedStatus = 130;
+
+QString toText(std::string const& bytes)
+{
+    return QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()));
+}
+
+} // namespace
+
+Application::Application() : _window(makeCommands())
+{
+    makeHost();
+    QObject::connect(&_signalTimer, &QTimer::timeout, &_window, [this] { checkSignals(); });
+    showCompositions();
+}
+
+Application::~Application()
+{
+    // Scripts leave dialogs in the window.
+    _interpreter.finish(0);
+    _workspace->setListener(nullptr);
+    Kv::UiWorkspace::setCurrentWorkspace(nullptr);
+    Kv::UiAppMgr::getInstance().setApplication(nullptr, nullptr, nullptr);
+}
+
+void Application::openComposition(std::string const& path)
+{
+    _workspace->open(Kv::OsFilePath(path));
+}
+
+int Application::run(std::optional<ScriptCall> const& script, bool exit)
+{
+    _hostWindow->show();
+    if (script)
+        QTimer::singleShot(0, &_window,
+                           [this, script = *script, exit]
+                           {
+                               int const status = runScript(script);
+                               if (exit || _closing)
+                                   QApplication::exit(status);
+                           });
+    _signalTimer.start(signalInterval);
+    int const status = QApplication::exec();
+    _signalTimer.stop();
+    return _interpreter.finish(status);
+}
+
+Commands Application::makeCommands()
+{
+    Commands commands;
+    commands.openComposition = [this] { askComposition(); };
+    commands.saveComposition = [this] { saveComposition(); };
+    commands.closeComposition = [this] { closeComposition(); };
+    commands.runScript = [this] { askScript(); };
+    commands.runScriptAgain = [this] { startScript(*_lastScript); };
+    commands.showBuildInfo = [this] { showBuildInfo(); };
+    commands.makeCurrent = [this](int place) { makeCurrent(place); };
+    commands.step = [this](int places) { step(places); };
+    commands.quit = [this] { return quit(); };
+    return commands;
+}
+
+void Application::makeHost()
+{
+    using namespace Kv;
+    _hostWindow = UiMainWindow::create("Velmora", "Velmora", NtForeignWidget{&_window},
+                                       [this](bool enabled) { _window.setOwnEnabled(enabled); });
+    RCShdPtr<UiContainer> const root = _hostWindow->getRootContainer();
+    _panel = UiPanel::create(root, "mainPanel", NtForeignWidget{_window.getPanel()});
+    _workspace = makeShd<UiCompositionWorkspace>([this] { return _hostWindow->findKeyboardHolder(); });
+    _workspace->setListener(this);
+    UiWorkspace::setCurrentWorkspace(_workspace);
+    UiAppMgr::getInstance().setApplication(_hostWindow, _panel, nullptr);
+}
+
+void Application::startScript(ScriptCall const& script)
+{
+    // Later: what asked for it, a menu for one, has first to give the keyboard back.
+    QTimer::singleShot(0, &_window,
+                       [this, script]
+                       {
+                           int const status = runScript(script);
+                           if (_closing)
+                               QApplication::exit(status);
+                       });
+}
+
+int Application::runScript(ScriptCall const& script)
+{
+    if (_scriptRuns)
+    {
+        _window.tell(QObject::tr("A script is running already"));
+        return 1;
+    }
+    _scriptRuns = true;
+    _lastScript = script;
+    QString const name = QFileInfo(toText(script.target)).fileName();
+    _window.tell(QObject::tr("%1 is running").arg(name));
+    int const status = _interpreter.run(script);
+    _scriptRuns = false;
+    _window.setRunAgainEnabled(true);
+    std::string const& failure = _interpreter.getFailure();
+    if (!failure.empty())
+        _window.tell(QObject::tr("%1 has failed: %2").arg(name, toText(failure).simplified()));
+    else
+        _window.tell(QObject::tr("%1 has ended").arg(name));
+    return status;
+}
+
+void Application::checkSignals()
+{
+    // A script that runs hears of its signals itself.
+    if (!_scriptRuns && _interpreter.isInterrupted())
+        QApplication::exit(interruptedStatus);
+}
+
+std::string Application::askPath(QString const& title)
+{
+    return QFileDialog::getOpenFileName(&_window, title).toStdString();
+}
+
+void Application::askComposition()
+{
+    std::string const path = askPath(QObject::tr("Open Composition"));
+    if (!path.empty())
+        attempt([&] { openComposition(path); });
+}
+
+void Application::askScript()
+{
+    std::string const path = askPath(QObject::tr("Run Script"));
+    if (!path.empty())
+        startScript({ScriptCall::Kind::File, path, {}});
+}
+
+void Application::saveComposition()
+{
+    attempt([this] { _workspace->save(_workspace->getCurrentComposition()); });
+}
+
+void Application::closeComposition()
+{
+    Composition const current = _workspace->getCurrentComposition();
+    if (!current.isExpired() && confirmLoss({current}))
+        attempt([&] { _workspace->close(current); });
+}
+
+void Application::makeCurrent(int place)
+{
+    std::vector<Composition> const compositions = getCompositions();
+    if (place >= 0 && place < static_cast<int>(compositions.size()))
+        _workspace->makeCurrent(compositions[static_cast<std::size_t>(place)]);
+}
+
+void Application::step(int places)
+{
+    std::vector<Composition> const compositions = getCompositions();
+    auto const count = static_cast<int>(compositions.size());
+    Composition const current = _workspace->getCurrentComposition();
+    auto const found = std::find_if(compositions.begin(), compositions.end(),
+                                    [&](Composition const& other) { return other == current; });
+    if (found != compositions.end())
+        makeCurrent((static_cast<int>(found - compositions.begin()) + places + count) % count);
+}
+
+void Application::showBuildInfo()
+{
+    std::ostringstream text;
+    writeBuildInfo(text);
+    QMessageBox box(QMessageBox::Information, QObject::tr("Build Information"), QObject::tr("Quorvane Velmora"),
+                    QMessageBox::Close, &_window);
+    box.setDetailedText(toText(text.str()));
+    box.exec();
+}
+
+bool Application::confirmLoss(std::vector<Composition> const& compositions)
+{
+    for (Composition const& composition : compositions)
+    {
+        Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const accessor(composition);
+        if (accessor.isNull() || !accessor->isModified())
+            continue;
+        QString const name = toText(accessor->getGraph()->getName());
+        QMessageBox box(QMessageBox::Question, QObject::tr("Velmora"),
+                        QObject::tr("%1 has changes that are not saved.").arg(name),
+                        QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, &_window);
+        box.setDefaultButton(QMessageBox::Save);
+        int const answer = box.exec();
+        if (answer == QMessageBox::Cancel)
+            return false;
+        if (answer == QMessageBox::Save && !attempt([&] { _workspace->save(composition); }))
+            return false;
+    }
+    return true;
+}
+
+bool Application::quit()
+{
+    if (!_closing && !confirmLoss(getCompositions()))
+        return false;
+    _closing = true;
+    _window.hide();
+    // A script that runs comes to its end first, with its dialogs ended.
+    if (_scriptRuns)
+        Kv::WsNative::getPlatform().closeLoops();
+    else
+        QApplication::exit(0);
+    return true;
+}
+
+bool Application::attempt(std::function<void()> const& action)
+{
+    try
+    {
+        action();
+        return true;
+    }
+    catch (Kv::ExBase const& error)
+    {
+        QMessageBox::warning(&_window, QObject::tr("Velmora"), toText(error.getReason()));
+        return false;
+    }
+}
+
+std::vector<Application::Composition> Application::getCompositions() const
+{
+    std::vector<Composition> compositions;
+    for (auto iterator = _workspace->getCompositions(); !iterator.atEnd(); ++iterator)
+        compositions.push_back(*iterator);
+    return compositions;
+}
+
+void Application::showCompositions()
+{
+    Composition const current = _workspace->getCurrentComposition();
+    std::vector<CompositionEntry> entries;
+    for (Composition const& composition : getCompositions())
+    {
+        Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const accessor(composition);
+        if (accessor.isNull())
+            continue;
+        entries.push_back({toText(accessor->getGraph()->getName()), toText(accessor->getPath().toString()),
+                           composition == current, accessor->isEditable(), accessor->isModified()});
+    }
+    _window.showCompositions(entries);
+    Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const accessor(current);
+    _window.showGraph(accessor.isNull() ? nullptr : accessor->getGraph());
+}
+
+void Application::compositionOpened(Composition const&)
+{
+    showCompositions();
+}
+
+void Application::compositionClosed(Composition const&)
+{
+    showCompositions();
+}
+
+void Application::currentCompositionChanged()
+{
+    showCompositions();
+}
+
+void Application::compositionChanged(Composition const&)
+{
+    showCompositions();
+}
+
+} // namespace Velmora

@@ -1,0 +1,81 @@
+#pragma once
+
+#include "commandLine.h"
+#include "interpreter.h"
+#include "mainWindow.h"
+
+#include "appUi/uiCompositionWorkspace.h"
+#include "appUi/uiCompositionWorkspaceListener.h"
+#include "ui/uiMainWindow.h"
+#include "ui/uiPanel.h"
+
+#include <QTimer>
+
+#include <memory>
+#include <optional>
+
+namespace Velmora
+{
+
+/// The running application: what its window shows, and what its commands do.
+class Application final : private Kv::UiCompositionWorkspaceListener
+{
+public:
+    /// Throws `Kv::ExBase` with words where windows cannot be shown.
+    Application();
+    ~Application() override;
+
+    /// Throws `Kv::ExBase` with words for a file that is no composition.
+    void openComposition(std::string const& path);
+
+    /// Shows the window and runs until the user ends it, or until the script ends it where `exit` is set. Gives the exit
+    /// status.
+    int run(std::optional<ScriptCall> const& script, bool exit);
+
+private:
+    using Composition = Kv::RCWeakPtr<const Kv::PiCompositionGraphInterface>;
+
+    Commands makeCommands();
+    void makeHost();
+
+    void startScript(ScriptCall const& script);
+    int runScript(ScriptCall const& script);
+    void checkSignals();
+
+    /// Asks for a path in a browser above the window; empty if none was chosen.
+    std::string askPath(QString const& title);
+    void askComposition();
+    void askScript();
+    void saveComposition();
+    void closeComposition();
+    void makeCurrent(int place);
+    void step(int places);
+    void showBuildInfo();
+
+    /// Asks what is to become of changes that have not been saved. True if they may go.
+    bool confirmLoss(std::vector<Composition> const& compositions);
+    bool quit();
+
+    /// Does what can fail for reasons that the user has to know.
+    bool attempt(std::function<void()> const& action);
+
+    std::vector<Composition> getCompositions() const;
+    void showCompositions();
+
+    void compositionOpened(Composition const& composition) override;
+    void compositionClosed(Composition const& composition) override;
+    void currentCompositionChanged() override;
+    void compositionChanged(Composition const& composition) override;
+
+    Interpreter _interpreter;
+    MainWindow _window;
+    Kv::RCShdPtr<Kv::UiMainWindow> _hostWindow;
+    Kv::RCShdPtr<Kv::UiPanel> _panel;
+    Kv::RCShdPtr<Kv::UiCompositionWorkspace> _workspace;
+    QTimer _signalTimer;
+    std::optional<ScriptCall> _lastScript;
+    bool _scriptRuns = false;
+    bool _closing = false;
+};
+
+} // namespace Velmora

@@ -1,0 +1,51 @@
+#pragma once
+
+#include <optional>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+namespace Velmora
+{
+
+/// A script with its arguments, all in the bytes that the system gave.
+struct ScriptCall
+{
+    enum class Kind
+    {
+        File,
+        Module,
+    };
+
+    Kind kind = Kind::File;
+    /// The script's path, or the module's name.
+    std::string target;
+    std::vector<std::string> arguments;
+};
+
+/// What the application was asked to do.
+struct CommandLine
+{
+    /// Paths of composition files, in order.
+    std::vector<std::string> compositions;
+    /// Whether to end with the script.
+    bool exit = false;
+    bool help = false;
+    bool buildInfo = false;
+    std::optional<ScriptCall> script;
+};
+
+/// A command line that says nothing sensible; the words are for its author.
+class UsageError : public std::runtime_error
+{
+public:
+    using std::runtime_error::runtime_error;
+};
+
+/// Throws `UsageError`. What comes behind the script or the module is the script's.
+CommandLine readCommandLine(int argc, char** argv);
+
+/// The text of `--help`.
+char const* getUsage();
+
+} // namespace Velmora

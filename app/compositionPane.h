@@ -1,0 +1,43 @@
+#pragma once
+
+#include "pluginAPI/piGraph.h"
+
+#include <QListWidget>
+#include <QTreeWidget>
+#include <QWidget>
+
+#include <functional>
+#include <vector>
+
+namespace Velmora
+{
+
+/// What the pane shows of a composition.
+struct CompositionEntry
+{
+    QString name;
+    QString path;
+    bool isCurrent = false;
+    bool isEditable = false;
+    bool isModified = false;
+};
+
+/// The open compositions, of which Enter or a click makes one the current one, and the nodes of that.
+class CompositionPane final : public QWidget
+{
+public:
+    /// `onChosen` gets the place of the composition in the list.
+    CompositionPane(QWidget* parent, std::function<void(int)> onChosen);
+
+    void showCompositions(std::vector<CompositionEntry> const& entries);
+
+    /// Null for no graph.
+    void showNodes(Kv::RCShdPtr<const Kv::PiGraph> const& graph);
+
+private:
+    QListWidget* _list;
+    QTreeWidget* _nodes;
+    std::function<void(int)> _onChosen;
+};
+
+} // namespace Velmora

@@ -1,0 +1,47 @@
+#pragma once
+
+#include "commandLine.h"
+
+#include <string>
+
+namespace Velmora
+{
+
+/// The Python interpreter of the process. Its lock is held only while Python runs, so that the threads of scripts go on
+/// meanwhile.
+class Interpreter
+{
+public:
+    /// Throws `std::runtime_error` where Python cannot be started.
+    Interpreter();
+    Interpreter(Interpreter const&) = delete;
+    Interpreter& operator=(Interpreter const&) = delete;
+    ~Interpreter();
+
+    /// Runs a script as the interpreter on its own would: as `__main__`, with `sys.argv` and `sys.path` its own, and
+    /// with the traceback on the standard error stream. Gives the exit status. What a script that has failed had is let
+    /// go; that of one that has not stays until the next script.
+    int run(ScriptCall const& call);
+
+    /// The last line of the traceback of the script that ran last; empty if it did not fail.
+    std::string const& getFailure() const { return _failure; }
+
+    /// Runs what is pending for the interpreter. True if that is Ctrl-C.
+    bool isInterrupted();
+
+    /// Makes the module `ui` and all that it brings along be loaded. Throws `std::runtime_error`.
+    void loadModules();
+
+    /// Ends the interpreter and all that scripts have left. Gives the exit status: `status`, or another one if the
+    /// output of the scripts could not be written.
+    int finish(int status);
+
+private:
+    /// Takes the error that is set, prints it, and gives the exit status that it stands for.
+    int takeError();
+
+    std::string _failure;
+    void* _threadState = nullptr;
+};
+
+} // namespace Velmora

@@ -1,0 +1,20 @@
+#include "appUi/uiAppDisabler.h"
+
+#include "appUi/uiAppMgr.h"
+
+namespace Kv
+{
+
+UiAppDisabler::UiAppDisabler() : _window(UiAppMgr::getInstance().getMainWindow())
+{
+    if (_window)
+        _window->refuseInput();
+}
+
+UiAppDisabler::~UiAppDisabler()
+{
+    if (_window)
+        _window->admitInput();
+}
+
+} // namespace Kv

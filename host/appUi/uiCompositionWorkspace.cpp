@@ -1,0 +1,155 @@
+#include "appUi/uiCompositionWorkspace.h"
+
+#include "appUi/uiCompositionWorkspaceListener.h"
+#include "base/rcWeakAccessor.h"
+#include "framework/fwComposition.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace Kv
+{
+
+UiCompositionWorkspace::UiCompositionWorkspace(FocusFinder findFocus) : _findFocus(std::move(findFocus)) {}
+
+UiCompositionWorkspace::~UiCompositionWorkspace()
+{
+    // Whoever goes through one just now holds it a little longer.
+    for (RCStrongPtr<FwComposition> const& composition : _compositions)
+        composition->setListener(nullptr);
+}
+
+void UiCompositionWorkspace::setListener(UiCompositionWorkspaceListener* listener)
+{
+    _listener = listener;
+}
+
+RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::open(OsFilePath const& path)
+{
+    OsFilePath const canonical = path.getCanonical();
+    if (auto const known = find(canonical); known != _compositions.end())
+    {
+        RCWeakPtr<const PiCompositionGraphInterface> const composition = *known;
+        setCurrent(*known);
+        return composition;
+    }
+    RCStrongPtr<FwComposition> const composition = FwComposition::open(canonical);
+    composition->setListener(this);
+    _compositions.push_back(composition);
+    if (_listener)
+        _listener->compositionOpened(composition);
+    setCurrent(composition);
+    return composition;
+}
+
+void UiCompositionWorkspace::close(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
+{
+    RCStrongPtr<FwComposition> const closing = require(composition);
+    closing->setListener(nullptr);
+    auto const next = _compositions.erase(find(closing->getPath()));
+    bool const wasCurrent = closing.get() == _current.get();
+    if (wasCurrent && _compositions.empty())
+        _current = nullptr;
+    else if (wasCurrent)
+        _current = next == _compositions.end() ? _compositions.back() : *next;
+    if (!_listener)
+        return;
+    _listener->compositionClosed(closing);
+    if (wasCurrent)
+        _listener->currentCompositionChanged();
+}
+
+void UiCompositionWorkspace::save(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
+{
+    require(composition)->save();
+}
+
+void UiCompositionWorkspace::makeCurrent(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
+{
+    setCurrent(require(composition));
+}
+
+UPtr<UiWidget> UiCompositionWorkspace::getFocus() const
+{
+    return _findFocus ? _findFocus() : nullptr;
+}
+
+RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::getCurrentComposition() const
+{
+    return _current;
+}
+
+void UiCompositionWorkspace::openComposition(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
+{
+    makeCurrent(composition);
+}
+
+RCWeakPtr<const PiCompositionGraphInterface>
+UiCompositionWorkspace::getComposition(RCShdPtr<const PiGraph> const& graph) const
+{
+    for (RCStrongPtr<const FwComposition> const composition : _compositions)
+        if (composition->getGraph() == graph)
+            return composition;
+    return {};
+}
+
+bool UiCompositionWorkspace::isCompositionEditable(
+    RCWeakPtr<const PiCompositionGraphInterface> const& composition) const
+{
+    RCWeakAccessor<const PiCompositionGraphInterface> const accessor(composition);
+    return !accessor.isNull() && accessor->isEditable();
+}
+
+bool UiCompositionWorkspace::isCompositionOpened(OsFilePath const& path) const
+{
+    return find(path.getCanonical()) != _compositions.end();
+}
+
+unsigned int UiCompositionWorkspace::getNbCompositions() const
+{
+    return static_cast<unsigned int>(_compositions.size());
+}
+
+ConstIterator<RCWeakPtr<const PiCompositionGraphInterface>> UiCompositionWorkspace::getCompositions() const
+{
+    return ConstIterator<RCWeakPtr<const PiCompositionGraphInterface>>({_compositions.begin(), _compositions.end()});
+}
+
+void UiCompositionWorkspace::compositionChanged(FwComposition const& composition)
+{
+    if (_listener)
+        _listener->compositionChanged(getComposition(composition.getGraph()));
+}
+
+void UiCompositionWorkspace::compositionSaved(FwComposition const& composition)
+{
+    compositionChanged(composition);
+}
+
+/// `path` is canonical.
+UiCompositionWorkspace::Compositions::const_iterator UiCompositionWorkspace::find(OsFilePath const& path) const
+{
+    return std::find_if(_compositions.begin(), _compositions.end(),
+                        [&path](RCStrongPtr<FwComposition> const& composition)
+                        { return composition->getPath() == path; });
+}
+
+RCStrongPtr<FwComposition>
+UiCompositionWorkspace::require(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const
+{
+    for (RCStrongPtr<FwComposition> const& open : _compositions)
+        if (RCWeakPtr<const PiCompositionGraphInterface>(open) == composition)
+            return open;
+    throw ExBase(__FILE__, __LINE__, "The composition is not open: it has been closed");
+}
+
+void UiCompositionWorkspace::setCurrent(RCStrongPtr<FwComposition> const& composition)
+{
+    if (composition.get() == _current.get())
+        return;
+    _current = composition;
+    if (_listener)
+        _listener->currentCompositionChanged();
+}
+
+} // namespace Kv

@@ -1,0 +1,79 @@
+#pragma once
+
+#include "appUi/kvAppUiExport.h"
+#include "appUi/uiCompositionWorkspaceClientInterface.h"
+#include "appUi/uiWorkspace.h"
+#include "base/rcStrongPtr.h"
+#include "framework/fwCompositionListener.h"
+
+#include <functional>
+#include <vector>
+
+namespace Kv
+{
+
+class FwComposition;
+class UiCompositionWorkspaceListener;
+
+/// The workspace of the application: opens compositions, holds them, and closes them. While there are any, one of them
+/// is the current one.
+class KVAPPUI_API UiCompositionWorkspace : public UiWorkspace,
+                                           public UiCompositionWorkspaceClientInterface,
+                                           private FwCompositionListener
+{
+public:
+    /// Gives the widget that has the keyboard, borrowed, or null.
+    using FocusFinder = std::function<UiWidget*()>;
+
+    /// Without a `findFocus` no widget ever has the keyboard.
+    explicit UiCompositionWorkspace(FocusFinder findFocus = {});
+    UiCompositionWorkspace(UiCompositionWorkspace const&) = delete;
+    UiCompositionWorkspace& operator=(UiCompositionWorkspace const&) = delete;
+    ~UiCompositionWorkspace() override;
+
+    /// Borrowed; null for none. Takes the place of the one before.
+    void setListener(UiCompositionWorkspaceListener* listener);
+
+    /// Opens the composition of a file, if it is not open already, and makes it the current one. Throws `ExBase`,
+    /// naming the file and the line, for what is wrong with it.
+    RCWeakPtr<const PiCompositionGraphInterface> open(OsFilePath const& path);
+
+    /// Lets the composition go, with the changes that have not been saved. If it was the current one, the next one in
+    /// the list is so now, or else the last. Throws `ExBase` for one that has been closed.
+    void close(RCWeakPtr<const PiCompositionGraphInterface> const& composition);
+
+    /// Writes the file of the composition. Throws `ExBase` for one that has been closed, and where it cannot be
+    /// written.
+    void save(RCWeakPtr<const PiCompositionGraphInterface> const& composition);
+
+    /// Throws `ExBase` for a composition that has been closed.
+    void makeCurrent(RCWeakPtr<const PiCompositionGraphInterface> const& composition);
+
+    UPtr<UiWidget> getFocus() const override;
+
+    RCWeakPtr<const PiCompositionGraphInterface> getCurrentComposition() const override;
+    void openComposition(RCWeakPtr<const PiCompositionGraphInterface> const& composition) override;
+    RCWeakPtr<const PiCompositionGraphInterface> getComposition(RCShdPtr<const PiGraph> const& graph) const override;
+    bool isCompositionEditable(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const override;
+    bool isCompositionOpened(OsFilePath const& path) const override;
+    unsigned int getNbCompositions() const override;
+    ConstIterator<RCWeakPtr<const PiCompositionGraphInterface>> getCompositions() const override;
+
+private:
+    using Compositions = std::vector<RCStrongPtr<FwComposition>>;
+
+    void compositionChanged(FwComposition const& composition) override;
+    void compositionSaved(FwComposition const& composition) override;
+
+    Compositions::const_iterator find(OsFilePath const& path) const;
+    RCStrongPtr<FwComposition> require(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const;
+    void setCurrent(RCStrongPtr<FwComposition> const& composition);
+
+    FocusFinder _findFocus;
+    UiCompositionWorkspaceListener* _listener = nullptr;
+    Compositions _compositions;
+    /// Null while there are no compositions.
+    RCStrongPtr<FwComposition> _current;
+};
+
+} // namespace Kv

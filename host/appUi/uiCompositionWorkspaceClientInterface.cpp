@@ -1,0 +1,8 @@
+#include "appUi/uiCompositionWorkspaceClientInterface.h"
+
+namespace Kv
+{
+
+UiCompositionWorkspaceClientInterface::~UiCompositionWorkspaceClientInterface() = default;
+
+} // namespace Kv

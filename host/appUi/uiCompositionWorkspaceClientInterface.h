@@ -1,0 +1,45 @@
+#pragma once
+
+#include "appUi/kvAppUiExport.h"
+#include "base/constIterator.h"
+#include "base/rcShdPtr.h"
+#include "base/rcWeakPtr.h"
+#include "internalAPI/piCompositionGraphInterface.h"
+#include "pluginAPI/piGraph.h"
+#include "resmgt/osFilePath.h"
+
+namespace Kv
+{
+
+/// The compositions of a workspace, for whoever is not the application. They are watched, not held: one that is closed
+/// expires.
+class KVAPPUI_API UiCompositionWorkspaceClientInterface
+{
+public:
+    UiCompositionWorkspaceClientInterface() = default;
+    UiCompositionWorkspaceClientInterface(UiCompositionWorkspaceClientInterface const&) = delete;
+    UiCompositionWorkspaceClientInterface& operator=(UiCompositionWorkspaceClientInterface const&) = delete;
+    virtual ~UiCompositionWorkspaceClientInterface();
+
+    /// Expired when there is none.
+    virtual RCWeakPtr<const PiCompositionGraphInterface> getCurrentComposition() const = 0;
+
+    /// Makes the composition the current one. Throws `ExBase` for one that has been closed.
+    virtual void openComposition(RCWeakPtr<const PiCompositionGraphInterface> const& composition) = 0;
+
+    /// The open composition that the graph belongs to; expired if there is none.
+    virtual RCWeakPtr<const PiCompositionGraphInterface> getComposition(RCShdPtr<const PiGraph> const& graph) const = 0;
+
+    /// Whether the composition is open and can be changed now, which the disk decides.
+    virtual bool isCompositionEditable(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const = 0;
+
+    /// Whether the file is that of an open composition, by whatever path it is named, and also if it was deleted since.
+    virtual bool isCompositionOpened(OsFilePath const& path) const = 0;
+
+    virtual unsigned int getNbCompositions() const = 0;
+
+    /// All of them, in the order in which they were opened.
+    virtual ConstIterator<RCWeakPtr<const PiCompositionGraphInterface>> getCompositions() const = 0;
+};
+
+} // namespace Kv

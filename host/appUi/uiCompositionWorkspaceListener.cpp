@@ -1,0 +1,8 @@
+#include "appUi/uiCompositionWorkspaceListener.h"
+
+namespace Kv
+{
+
+UiCompositionWorkspaceListener::~UiCompositionWorkspaceListener() = default;
+
+} // namespace Kv

@@ -1,0 +1,27 @@
+#pragma once
+
+#include "appUi/kvAppUiExport.h"
+#include "base/rcShdPtr.h"
+#include "base/uPtr.h"
+#include "ui/uiWidget.h"
+
+namespace Kv
+{
+
+/// Where the user of the interactive application works.
+class KVAPPUI_API UiWorkspace : public RCBase<LkCounter<int>>
+{
+public:
+    ~UiWorkspace() override;
+
+    /// Null where there is no interactive application.
+    static RCShdPtr<UiWorkspace> getCurrentWorkspace();
+
+    /// For the application: null when it ends.
+    static void setCurrentWorkspace(RCShdPtr<UiWorkspace> const& workspace);
+
+    /// The widget that has the keyboard, borrowed; null if none has.
+    virtual UPtr<UiWidget> getFocus() const = 0;
+};
+
+} // namespace Kv

@@ -1,0 +1,8 @@
+#include "base/inBuildInfo.h"
+
+namespace Kv
+{
+
+InBuildInfo::~InBuildInfo() = default;
+
+} // namespace Kv

@@ -1,0 +1,57 @@
+#pragma once
+
+#include "base/rcStrongPtr.h"
+#include "base/rcWeakPtr.h"
+#include "framework/kvFrameworkExport.h"
+#include "internalAPI/piCompositionGraphInterface.h"
+#include "resmgt/osFilePath.h"
+
+namespace Kv
+{
+
+class FwCompositionListener;
+class FwGraph;
+class FwNode;
+
+/// A composition that has been read from its file. It is closed by its strong pointers being let go; what is left of
+/// its graph then no longer changes.
+class KVFRAMEWORK_API FwComposition : public PiCompositionGraphInterface
+{
+public:
+    /// The extension of the names of compositions' files, without the dot.
+    static constexpr char const* extension = "vmcomposition";
+
+    /// Reads the file, whatever its extension. Throws `ExBase`, naming the file and the line, for what is wrong with
+    /// it.
+    static RCStrongPtr<FwComposition> open(OsFilePath const& path);
+
+    ~FwComposition() override;
+
+    /// The node that stands for the composition as a whole, and is none of the nodes of its graph.
+    RCShdPtr<const PiNode> getNode() const override;
+
+    RCShdPtr<const PiGraph> getGraph() const override;
+    RCShdPtr<PiGraph> getGraph() override;
+    OsFilePath const& getPath() const override;
+    bool isEditable() const override;
+    bool isModified() const override;
+    void save() override;
+
+    /// Borrowed; null for none. Takes the place of the one before.
+    void setListener(FwCompositionListener* listener);
+
+private:
+    friend class FwGraph;
+
+    explicit FwComposition(OsFilePath path);
+
+    void noteChange();
+
+    OsFilePath _path;
+    RCShdPtr<FwNode> _node;
+    RCShdPtr<FwGraph> _graph;
+    bool _isModified = false;
+    FwCompositionListener* _listener = nullptr;
+};
+
+} // namespace Kv

@@ -1,0 +1,8 @@
+#include "framework/fwCompositionListener.h"
+
+namespace Kv
+{
+
+FwCompositionListener::~FwCompositionListener() = default;
+
+} // namespace Kv

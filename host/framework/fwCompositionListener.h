@@ -1,0 +1,23 @@
+#pragma once
+
+#include "framework/kvFrameworkExport.h"
+
+namespace Kv
+{
+
+class FwComposition;
+
+/// Hears what happens to a composition, after it has happened.
+class KVFRAMEWORK_API FwCompositionListener
+{
+public:
+    FwCompositionListener() = default;
+    FwCompositionListener(FwCompositionListener const&) = delete;
+    FwCompositionListener& operator=(FwCompositionListener const&) = delete;
+    virtual ~FwCompositionListener();
+
+    virtual void compositionChanged(FwComposition const& composition) = 0;
+    virtual void compositionSaved(FwComposition const& composition) = 0;
+};
+
+} // namespace Kv

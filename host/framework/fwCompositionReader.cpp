@@ -1,0 +1,135 @@
+#include "framework/fwCompositionReader.h"
+
+#include "framework/fwCompositionFormat.h"
+#include "resmgt/liStringUtil.h"
+#include "resmgt/osFile.h"
+#include "resmgt/xmlDocument.h"
+#include "resmgt/xmlError.h"
+
+#include <algorithm>
+#include <initializer_list>
+
+namespace Kv
+{
+
+namespace Format = FwCompositionFormat;
+
+namespace
+{
+
+[[noreturn]] void fail(int line, std::string const& words)
+{
+    throw XmlError(__FILE__, __LINE__, line, words);
+}
+
+[[noreturn]] void fail(XmlElement const& element, std::string const& words)
+{
+    fail(element.getLine(), words);
+}
+
+/// What nobody would read is an error: it may be a word that is misspelt.
+void requireNothingElse(XmlElement const& element, std::initializer_list<char const*> attributeNames)
+{
+    for (std::string const& name : element.getAttributeNames())
+        if (std::find(attributeNames.begin(), attributeNames.end(), name) == attributeNames.end())
+            fail(element,
+                 "element '" + element.getName() + "' has an unknown attribute " + LiStringUtil::getPrintable(name));
+    if (element.hasText())
+        fail(element, "element '" + element.getName() + "' holds a text");
+}
+
+void requireNoChildren(XmlElement const& element)
+{
+    for (XmlElement const& child : element.getChildren())
+        fail(child, "unknown element " + LiStringUtil::getPrintable(child.getName()));
+}
+
+std::string getFilledAttribute(XmlElement const& element, char const* name)
+{
+    std::string text = element.getAttribute(name);
+    if (text.empty())
+        fail(element, "attribute '" + std::string(name) + "' of element '" + element.getName() + "' is empty");
+    return text;
+}
+
+/// `names` are those that the node has used for elements of this kind.
+std::string readName(XmlElement const& element, std::set<std::string>& names)
+{
+    std::string name = getFilledAttribute(element, Format::name);
+    if (!names.insert(name).second)
+        fail(element, "there are two elements '" + element.getName() + "' named " + LiStringUtil::getPrintable(name) +
+                          " in one node");
+    return name;
+}
+
+} // namespace
+
+std::vector<FwNode::Description> FwCompositionReader::read(OsFilePath const& path)
+{
+    std::string const text = OsFile(path).read();
+    try
+    {
+        return FwCompositionReader(text)._nodes;
+    }
+    catch (XmlError const& error)
+    {
+        throw ExBase(__FILE__, __LINE__,
+                     LiStringUtil::getPrintable(path.toString()) + " is no composition: " + error.getReason());
+    }
+}
+
+FwCompositionReader::FwCompositionReader(std::string const& text)
+{
+    RCShdPtr<XmlElement> const root = XmlDocument(text).getRoot();
+    if (!root)
+        fail(1, "there is no element");
+    if (root->getName() != Format::composition)
+        fail(*root, "the root element is " + LiStringUtil::getPrintable(root->getName()) + " and not '" +
+                        Format::composition + "'");
+    requireNothingElse(*root, {});
+    for (XmlElement const& child : root->getChildren())
+        readNode(child);
+    requireReferencedNodes();
+}
+
+void FwCompositionReader::readNode(XmlElement const& element)
+{
+    if (element.getName() != Format::node)
+        fail(element, "unknown element " + LiStringUtil::getPrintable(element.getName()));
+    requireNothingElse(element, {Format::name, Format::type});
+    FwNode::Description node;
+    node.name = getFilledAttribute(element, Format::name);
+    node.type = getFilledAttribute(element, Format::type);
+    if (!_names.insert(node.name).second)
+        fail(element, "there are two nodes named " + LiStringUtil::getPrintable(node.name));
+    std::set<std::string> valueNames;
+    std::set<std::string> inputNames;
+    for (XmlElement const& child : element.getChildren())
+    {
+        requireNoChildren(child);
+        if (child.getName() == Format::value)
+        {
+            requireNothingElse(child, {Format::name, Format::text});
+            node.values.emplace_back(readName(child, valueNames), child.getAttribute(Format::text));
+        }
+        else if (child.getName() == Format::input)
+        {
+            requireNothingElse(child, {Format::name, Format::node});
+            node.inputs.emplace_back(readName(child, inputNames), getFilledAttribute(child, Format::node));
+            _references.push_back({child.getLine(), node.inputs.back().first, node.inputs.back().second});
+        }
+        else
+            fail(child, "unknown element " + LiStringUtil::getPrintable(child.getName()));
+    }
+    _nodes.push_back(std::move(node));
+}
+
+void FwCompositionReader::requireReferencedNodes() const
+{
+    for (Reference const& reference : _references)
+        if (_names.count(reference.nodeName) == 0)
+            fail(reference.line, "input " + LiStringUtil::getPrintable(reference.inputName) + " refers to node " +
+                                     LiStringUtil::getPrintable(reference.nodeName) + ", which is not there");
+}
+
+} // namespace Kv

@@ -1,0 +1,40 @@
+#pragma once
+
+#include "framework/fwNode.h"
+#include "resmgt/osFilePath.h"
+#include "resmgt/xmlElement.h"
+
+#include <set>
+#include <string>
+#include <vector>
+
+namespace Kv
+{
+
+/// Reads the file of a composition, of which it takes nothing that it does not know.
+class FwCompositionReader
+{
+public:
+    /// The nodes in their order. Throws `ExBase`, naming the file and the line, for whatever is wrong with it.
+    static std::vector<FwNode::Description> read(OsFilePath const& path);
+
+private:
+    struct Reference
+    {
+        int line;
+        std::string inputName;
+        std::string nodeName;
+    };
+
+    explicit FwCompositionReader(std::string const& text);
+
+    void readNode(XmlElement const& element);
+    void requireReferencedNodes() const;
+
+    std::vector<FwNode::Description> _nodes;
+    std::set<std::string> _names;
+    /// An input can refer to a node further down.
+    std::vector<Reference> _references;
+};
+
+} // namespace Kv

@@ -1,0 +1,62 @@
+#include "framework/fwCompositionWriter.h"
+
+#include "framework/fwCompositionFormat.h"
+#include "pluginAPI/piNode.h"
+#include "resmgt/xmlWriter.h"
+
+#include <sstream>
+
+namespace Kv
+{
+
+namespace Format = FwCompositionFormat;
+
+namespace
+{
+
+constexpr int indent = 2;
+
+void writeEntry(XmlWriter& writer, char const* element, std::string const& name, char const* attribute,
+                std::string const& text)
+{
+    writer.openTag(element);
+    writer.writeAttrib(Format::name, name);
+    writer.writeAttrib(attribute, text);
+    writer.closeTag();
+}
+
+void writeNode(XmlWriter& writer, PiNode const& node)
+{
+    writer.openTag(Format::node);
+    writer.writeAttrib(Format::name, node.getName());
+    writer.writeAttrib(Format::type, node.getType());
+    for (auto const& value : node.getValues())
+        writeEntry(writer, Format::value, value.first, Format::text, value.second);
+    for (auto const& input : node.getInputs())
+        writeEntry(writer, Format::input, input.first, Format::node, input.second);
+    writer.closeTag();
+}
+
+} // namespace
+
+std::string FwCompositionWriter::write(PiGraph const& graph)
+{
+    std::ostringstream stream;
+    XmlWriter writer(stream, indent);
+    writer.openTag(Format::composition);
+    for (RCShdPtr<const PiNode> const& node : graph.getNodes())
+        writeNode(writer, *node);
+    writer.closeTag();
+    return stream.str();
+}
+
+void FwCompositionWriter::requireValue(std::string const& name, std::string const& text)
+{
+    if (name.empty())
+        throw ExBase(__FILE__, __LINE__, "A value needs a name");
+    std::ostringstream stream;
+    XmlWriter writer(stream, indent);
+    writeEntry(writer, Format::value, name, Format::text, text);
+}
+
+} // namespace Kv

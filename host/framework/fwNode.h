@@ -1,0 +1,43 @@
+#pragma once
+
+#include "base/rcWeakPtr.h"
+#include "pluginAPI/piNode.h"
+
+#include <string>
+
+namespace Kv
+{
+
+class FwComposition;
+
+/// A node of a composition. It can outlive the composition, and keeps what it says then.
+class FwNode : public PiNode
+{
+public:
+    /// What a file tells of a node.
+    struct Description
+    {
+        std::string name;
+        std::string type;
+        NamedTexts inputs;
+        NamedTexts values;
+    };
+
+    FwNode(RCWeakPtr<FwComposition> const& composition, Description description);
+
+    RCShdPtr<const PiGraph> getGraph() const override;
+    RCWeakPtr<PiNodeController> getController() override;
+    std::string const& getName() const override;
+    std::string const& getType() const override;
+    NamedTexts const& getInputs() const override;
+    NamedTexts const& getValues() const override;
+
+    /// Sets a value or adds it behind the others. True if that is a change.
+    bool setValue(std::string const& name, std::string const& text);
+
+private:
+    RCWeakPtr<FwComposition> _composition;
+    Description _description;
+};
+
+} // namespace Kv

@@ -1,0 +1,8 @@
+#include "internalAPI/piCompositionGraphInterface.h"
+
+namespace Kv
+{
+
+PiCompositionGraphInterface::~PiCompositionGraphInterface() = default;
+
+} // namespace Kv

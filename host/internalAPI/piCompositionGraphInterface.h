@@ -1,0 +1,34 @@
+#pragma once
+
+#include "internalAPI/kvInternalApiExport.h"
+#include "pluginAPI/piGraph.h"
+#include "pluginAPI/piNodeController.h"
+#include "resmgt/osFilePath.h"
+
+namespace Kv
+{
+
+/// A composition as the application sees it: the controller of a graph that is kept in a file.
+class KVINTERNALAPI_API PiCompositionGraphInterface : public virtual PiNodeController
+{
+public:
+    ~PiCompositionGraphInterface() override;
+
+    virtual RCShdPtr<const PiGraph> getGraph() const = 0;
+    virtual RCShdPtr<PiGraph> getGraph() = 0;
+
+    /// The composition's file: absolute, with symbolic links followed. It may have been deleted.
+    virtual OsFilePath const& getPath() const = 0;
+
+    /// Whether the file can be written now, which is asked of the disk at each call.
+    virtual bool isEditable() const = 0;
+
+    /// Whether there are changes that have not been saved.
+    virtual bool isModified() const = 0;
+
+    /// Writes the file as a whole or not at all. Throws `ExBase`, naming the path, where it cannot be written; the file
+    /// is then as it was.
+    virtual void save() = 0;
+};
+
+} // namespace Kv

@@ -1,0 +1,32 @@
+#pragma once
+
+#include <QScrollArea>
+
+#include <functional>
+
+namespace Kv
+{
+
+/// Scrolls a content where that is larger than the room, and says how much room there is.
+class ContentArea final : public QScrollArea
+{
+public:
+    /// `onRoom` hears of the width and height in pixels; it may end the area.
+    ContentArea(QWidget* parent, std::function<void(int, int)> onRoom);
+
+    /// Tells the room if it is another than was told last; none is told while the area is hidden.
+    void tellRoom();
+
+    /// The room is told anew, whatever it was.
+    void forgetRoom() { _told = QSize(); }
+
+protected:
+    void resizeEvent(QResizeEvent* event) override;
+
+private:
+    std::function<void(int, int)> _onRoom;
+    QSize _told;
+    bool _telling = false;
+};
+
+} // namespace Kv

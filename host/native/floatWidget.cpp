@@ -1,0 +1,171 @@
+#include "native/floatWidget.h"
+
+#include "native/qtFocusOrder.h"
+
+#include <QApplication>
+#include <QKeyEvent>
+#include <QLabel>
+#include <QPainter>
+#include <QTimer>
+
+#include <algorithm>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// Line around a float, above all that stands in it.
+class Edge final : public QWidget
+{
+public:
+    explicit Edge(QWidget* parent) : QWidget(parent) { setAttribute(Qt::WA_TransparentForMouseEvents); }
+
+protected:
+    void paintEvent(QPaintEvent*) override
+    {
+        QPainter painter(this);
+        painter.setPen(palette().color(QPalette::Shadow));
+        painter.drawRect(rect().adjusted(0, 0, -1, -1));
+    }
+};
+
+/// By how much a span of `size` from `start` must move to lie within the room; its start wins where both ends cannot.
+int getShift(int start, int size, int room)
+{
+    if (start + size > room)
+        return std::max(room - size - start, -start);
+    return std::max(-start, 0);
+}
+
+} // namespace
+
+FloatWidget::FloatWidget(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle)
+    : QWidget(parent), _handle(handle),
+      _area(new ContentArea(this, [handle](int width, int height)
+                            { handle.tell(&NtFloatListener::onResized, width, height); })),
+      _edge(new Edge(this))
+{
+    setAutoFillBackground(true);
+    // Of no size of its own: that comes with the content.
+    _area->setWidget(new QWidget);
+    connect(qApp, &QApplication::focusChanged, this, [this](QWidget* from, QWidget* to) { onFocusChanged(from, to); });
+    QTimer::singleShot(0, this, [handle] { handle.tell(&NtFloatListener::onFirstTurn); });
+}
+
+FloatWidget* FloatWidget::findAround(QWidget& widget)
+{
+    for (QWidget* around = &widget; around; around = around->parentWidget())
+        if (auto* const floating = dynamic_cast<FloatWidget*>(around))
+            return floating;
+    return nullptr;
+}
+
+void FloatWidget::pin(QWidget& widget)
+{
+    widget.setParent(this);
+    widget.show();
+    if (_edge)
+        _edge->raise();
+    auto* const title = qobject_cast<QLabel*>(&widget);
+    if (!title)
+        return;
+    constexpr int indent = 8;
+    title->setIndent(indent);
+    QFont font = title->font();
+    font.setBold(true);
+    title->setFont(font);
+}
+
+void FloatWidget::askIntoView(QWidget const& widget) const
+{
+    QWidget const* const room = parentWidget();
+    QPoint const place = widget.mapTo(room, QPoint(0, 0));
+    int const right = getShift(place.x(), widget.width(), room->width());
+    int const down = getShift(place.y(), widget.height(), room->height());
+    if (right != 0 || down != 0)
+        _handle.tell(&NtFloatListener::onMoveWanted, right, down);
+}
+
+QWidget* FloatWidget::findEarlierHolder() const
+{
+    QWidget* const holder = _earlierHolder;
+    if (!holder)
+        return nullptr;
+    if (holder->isEnabled() && holder->isVisibleTo(window()))
+        return holder;
+    FloatWidget const* const around = findAround(*holder);
+    return around && around != this ? around->findEarlierHolder() : nullptr;
+}
+
+void FloatWidget::showEvent(QShowEvent* event)
+{
+    QWidget::showEvent(event);
+    if (event->spontaneous())
+        return;
+    noteHolder(window()->focusWidget());
+    if (_area)
+        _area->tellRoom();
+}
+
+void FloatWidget::hideEvent(QHideEvent* event)
+{
+    QWidget::hideEvent(event);
+    if (event->spontaneous())
+        return;
+    if (_area)
+        _area->forgetRoom();
+    if (!holds(window()->focusWidget()))
+        return;
+    if (QWidget* const holder = findEarlierHolder())
+        holder->setFocus(Qt::OtherFocusReason);
+}
+
+void FloatWidget::resizeEvent(QResizeEvent* event)
+{
+    QWidget::resizeEvent(event);
+    if (_area)
+        _area->setGeometry(rect());
+    if (_edge)
+        _edge->setGeometry(rect());
+}
+
+void FloatWidget::keyPressEvent(QKeyEvent* event)
+{
+    if (event->key() != Qt::Key_Escape)
+    {
+        QWidget::keyPressEvent(event);
+        return;
+    }
+    event->accept();
+    if (!event->isAutoRepeat())
+        _handle.tell(&NtFloatListener::onEscape);
+}
+
+bool FloatWidget::focusNextPrevChild(bool next)
+{
+    return QtFocusOrder(*this).step(next);
+}
+
+bool FloatWidget::holds(QWidget const* widget) const
+{
+    return widget && (widget == this || isAncestorOf(widget));
+}
+
+void FloatWidget::noteHolder(QWidget* holder)
+{
+    if (holder && !holds(holder))
+        _earlierHolder = holder;
+}
+
+void FloatWidget::onFocusChanged(QWidget* from, QWidget* to)
+{
+    if (!holds(to) || holds(from))
+        return;
+    if (from && from->window() == window())
+        noteHolder(from);
+    raise();
+}
+
+} // namespace Kv

@@ -1,0 +1,56 @@
+#pragma once
+
+#include "native/contentArea.h"
+#include "native/ntPeers.h"
+#include "native/qtListenerHandle.h"
+#include "native/qtStage.h"
+
+#include <QPointer>
+#include <QWidget>
+
+namespace Kv
+{
+
+/// The toolkit's side of a floating container: has a ground and an edge of its own, walks the keyboard through the
+/// widgets in it, passes on Escape, and gives the keyboard back when it is hidden.
+class FloatWidget final : public QWidget, public QtStage
+{
+public:
+    FloatWidget(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle);
+
+    /// The innermost one that holds the widget, or is it; null if there is none.
+    static FloatWidget* findAround(QWidget& widget);
+
+    /// Where the widgets in it stand; scrolled where it is larger.
+    QWidget* getContent() const { return _area ? _area->widget() : nullptr; }
+
+    /// Keeps a widget of the content in place when that scrolls. A text in it becomes a title.
+    void pin(QWidget& widget);
+
+    /// Asks to be moved so that a widget in it is seen.
+    void askIntoView(QWidget const& widget) const;
+
+    /// The widget that had the keyboard before and can have it again; null if there is none.
+    QWidget* findEarlierHolder() const;
+
+protected:
+    void showEvent(QShowEvent* event) override;
+    void hideEvent(QHideEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    bool focusNextPrevChild(bool next) override;
+
+private:
+    bool holds(QWidget const* widget) const;
+    /// Remembers from whom the keyboard comes.
+    void noteHolder(QWidget* holder);
+    void onFocusChanged(QWidget* from, QWidget* to);
+
+    QtListenerHandle<NtFloatListener> _handle;
+    /// Natively children, which others can delete.
+    QPointer<ContentArea> _area;
+    QPointer<QWidget> _edge;
+    QPointer<QWidget> _earlierHolder;
+};
+
+} // namespace Kv

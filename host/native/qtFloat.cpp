@@ -1,0 +1,33 @@
+#include "native/qtFloat.h"
+
+namespace Kv
+{
+
+QtFloat::QtFloat(QWidget* parent, std::string const& name, NtFloatListener& listener)
+    : QtFloat(parent, name, QtListenerHandle<NtFloatListener>(listener))
+{
+}
+
+QtFloat::QtFloat(QWidget* parent, std::string const& name, QtListenerHandle<NtFloatListener> const& handle)
+    : QtPeer(makeNative<FloatWidget>(parent, handle), name, 0), _handle(handle)
+{
+}
+
+QtFloat::~QtFloat()
+{
+    _handle.close();
+}
+
+void QtFloat::setContentSize(int width, int height)
+{
+    if (QWidget* const content = getContent())
+        content->resize(width, height);
+}
+
+QWidget* QtFloat::getContent() const
+{
+    FloatWidget const* const native = getNative();
+    return native ? native->getContent() : nullptr;
+}
+
+} // namespace Kv

@@ -1,0 +1,28 @@
+#pragma once
+
+#include "native/floatWidget.h"
+#include "native/qtHolder.h"
+#include "native/qtPeer.h"
+
+namespace Kv
+{
+
+/// Floating container.
+class QtFloat final : public QtPeer<NtFloat, FloatWidget>, public QtHolder
+{
+public:
+    /// `parent`, which owns the widget natively, can be null. The listener is borrowed.
+    QtFloat(QWidget* parent, std::string const& name, NtFloatListener& listener);
+    ~QtFloat() override;
+
+    void focusFirst() override { focusFirstInContent(); }
+    void setContentSize(int width, int height) override;
+    QWidget* getContent() const override;
+
+private:
+    QtFloat(QWidget* parent, std::string const& name, QtListenerHandle<NtFloatListener> const& handle);
+
+    QtListenerHandle<NtFloatListener> _handle;
+};
+
+} // namespace Kv

@@ -1,0 +1,30 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "native/qtListenerHandle.h"
+
+#include <QObject>
+#include <QWidget>
+
+class QMouseEvent;
+
+namespace Kv
+{
+
+/// Tells a listener what the pointer does on a widget, and on those in it that do not want it themselves.
+class QtPointerWatch final : public QObject
+{
+public:
+    /// Both are borrowed; the widget may go first.
+    QtPointerWatch(QWidget& widget, NtPointerListener& listener);
+    ~QtPointerWatch() override;
+
+    bool eventFilter(QObject* watched, QEvent* event) override;
+
+private:
+    void tell(void (NtPointerListener::*what)(int, int), QWidget const& widget, QMouseEvent const& event) const;
+
+    QtListenerHandle<NtPointerListener> _handle;
+};
+
+} // namespace Kv

@@ -1,0 +1,8 @@
+#include "pluginAPI/piGraph.h"
+
+namespace Kv
+{
+
+PiGraph::~PiGraph() = default;
+
+} // namespace Kv

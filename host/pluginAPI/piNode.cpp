@@ -1,0 +1,8 @@
+#include "pluginAPI/piNode.h"
+
+namespace Kv
+{
+
+PiNode::~PiNode() = default;
+
+} // namespace Kv

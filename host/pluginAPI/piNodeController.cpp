@@ -1,0 +1,8 @@
+#include "pluginAPI/piNodeController.h"
+
+namespace Kv
+{
+
+PiNodeController::~PiNodeController() = default;
+
+} // namespace Kv

@@ -1,0 +1,105 @@
+#include "ui/uiMainWindow.h"
+
+#include "native/ntPlatform.h"
+#include "ui/uiMoveContainer.h"
+#include "ui/uiPanel.h"
+
+#include <utility>
+
+namespace Kv
+{
+
+namespace
+{
+
+UiWidget* findHolderIn(UiContainer const& container)
+{
+    for (RCShdPtr<UiWidget> const& child : container.getChildren())
+    {
+        if (!child->hasKeyboard())
+            continue;
+        auto const* const inner = dynamic_cast<UiContainer const*>(child.get());
+        UiWidget* const innermost = inner ? findHolderIn(*inner) : nullptr;
+        return innermost ? innermost : child.get();
+    }
+    return nullptr;
+}
+
+} // namespace
+
+UiMainWindow::UiMainWindow(char const* name, char const* title, NtForeignWidget widget,
+                           std::function<void(bool)> enableOwn)
+    : UiTopLevel(name, title, nullptr), _widget(widget), _enableOwn(std::move(enableOwn))
+{
+}
+
+UiMainWindow::~UiMainWindow() = default;
+
+RCShdPtr<UiMainWindow> UiMainWindow::create(char const* name, char const* title, NtForeignWidget widget,
+                                            std::function<void(bool)> enableOwn)
+{
+    RCShdPtr<UiMainWindow> window(new UiMainWindow(name, title, widget, std::move(enableOwn)));
+    window->makeNative();
+    return window;
+}
+
+RttiType const& UiMainWindow::getClassType()
+{
+    return RttiGenType1<UiMainWindow, UiTopLevel>::getInstance();
+}
+
+RttiType const& UiMainWindow::getRttiType() const
+{
+    return getClassType();
+}
+
+void UiMainWindow::refuseInput()
+{
+    requireUiThread();
+    ++_inputLevel;
+    _native->refuseInput();
+    blockWidgetsIn(*getRootContainer());
+}
+
+void UiMainWindow::admitInput()
+{
+    --_inputLevel;
+    blockWidgetsIn(*getRootContainer());
+    _native->admitInput();
+}
+
+UiWidget* UiMainWindow::findKeyboardHolder() const
+{
+    return findHolderIn(*getRootContainer());
+}
+
+std::unique_ptr<NtWindow> UiMainWindow::createNative(NtPlatform& platform)
+{
+    std::unique_ptr<NtMainWindow> native = platform.adoptWindow(_widget, _enableOwn, *this);
+    _native = native.get();
+    return native;
+}
+
+void UiMainWindow::onResized(int width, int height)
+{
+    RCShdPtr<UiContainer> const root = getRootContainer();
+    GeRectangle<int> const before = root->getRect();
+    // The panels hear of their own places.
+    root->setRect({0, width, 0, height}, false);
+    UiMoveContainer::follow(*root, before);
+}
+
+void UiMainWindow::blockWidgetsIn(UiContainer const& container) const
+{
+    for (RCShdPtr<UiWidget> const& child : container.getChildren())
+    {
+        if (auto const* const panel = dynamic_cast<UiPanel const*>(child.get()))
+            blockWidgetsIn(*panel);
+        else if (auto* const floating = dynamic_cast<UiMoveContainer*>(child.get()))
+            floating->setBlocked(floating->getInputLevel() < _inputLevel);
+        else
+            child->setBlocked(_inputLevel > 0);
+    }
+}
+
+} // namespace Kv

@@ -1,0 +1,89 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "ui/evPointerEvent.h"
+#include "ui/uiContainer.h"
+#include "ui/uiEventCallback.h"
+
+#include <optional>
+
+namespace Kv
+{
+
+/// Container that floats above its siblings and that the user moves: by the widgets whose pointer events its owner
+/// forwards to it, and by all of it that is no widget for input. It stands where it is told to; dragged, it can show
+/// each of its edges and cannot be lost. Escape in it presses the button that it does in a window. What needs more room
+/// than it has scrolls.
+///
+/// One that nobody but its parent owns goes with the next turn of the loop: its maker has failed.
+class KVUI_API UiMoveContainer : public UiContainer, private NtFloatListener
+{
+public:
+    /// A floating container at the end of `parent`. There are no resource tables for the built-in kinds: pass null.
+    static RCShdPtr<UiMoveContainer> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
+
+    ~UiMoveContainer() override;
+
+    static RttiType const& getClassType();
+    RttiType const& getRttiType() const override;
+
+    /// The floating containers directly in `parent` keep their distance from its upper left corner, and stay within
+    /// reach: `parent` has just been moved from the rectangle `before`.
+    static void follow(UiContainer const& parent, GeRectangle<int> const& before);
+
+    GeRectangle<int> getFrame() const override;
+    void setRect(GeRectangle<int> const& rect, bool layOut) override;
+    void show() override;
+
+    /// Brings the container to the front and begins to move it with the pointer.
+    void arm(EvPointerButtonDownEvent const& event) override;
+    void mmove(EvPointerMoveEvent const& event) override;
+    void disarm(EvPointerButtonUpEvent const& event) override;
+
+    /// How many refusals of input were in force in the window when it came to the front last: a later one stops it.
+    int getInputLevel() const { return _inputLevel; }
+
+protected:
+    explicit UiMoveContainer(char const* name);
+
+    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
+    void dropPeer() override;
+
+    /// Not any more once nobody but its parent owns it: who it would call is gone.
+    bool takesInput() const override;
+
+    void layOutChildren() override;
+    void cameToFront() override;
+
+private:
+    struct Drag
+    {
+        GeVector2<int> from;
+        GeRectangle<int> rect;
+    };
+
+    /// The rectangle moved by so many pixels, y growing upward, as far as it stays within reach.
+    GeRectangle<int> getMoved(GeRectangle<int> const& rect, GeVector2<int> const& by) const;
+
+    void onPointerMoved(EvEvent& event);
+    void onPointerDown(EvEvent& event);
+    void onPointerUp(EvEvent& event);
+
+    void onResized(int width, int height) override;
+    void onEscape() override;
+    void onMoveWanted(int x, int y) override;
+    void onFirstTurn() override;
+
+    UiEventCallback<UiMoveContainer> _moveCb;
+    UiEventCallback<UiMoveContainer> _downCb;
+    UiEventCallback<UiMoveContainer> _upCb;
+    std::optional<Drag> _drag;
+    int _inputLevel = 0;
+
+    /// What the screen leaves for the content, beside scroll bars, in pixels; unknown while it is on none.
+    std::optional<GeVector2<int>> _room;
+    GeVector2<int> _contentSize;
+    NtFloat* _float = nullptr;
+};
+
+} // namespace Kv

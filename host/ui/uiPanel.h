@@ -1,0 +1,34 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "ui/uiContainer.h"
+
+namespace Kv
+{
+
+/// Container that stands where the application's window has it. Floating containers in it keep their distance from its
+/// upper left corner.
+class KVUI_API UiPanel : public UiContainer, private NtPlaceListener
+{
+public:
+    /// A panel at the end of `parent`, which is the root of the application's window. `widget` is the application's own
+    /// for it.
+    static RCShdPtr<UiPanel> create(RCShdPtr<UiContainer> const& parent, char const* name, NtForeignWidget widget);
+
+    ~UiPanel() override;
+
+    static RttiType const& getClassType();
+    RttiType const& getRttiType() const override;
+
+protected:
+    UiPanel(char const* name, NtForeignWidget widget);
+
+    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
+
+private:
+    void onPlaced(GeRectangle<int> const& place) override;
+
+    NtForeignWidget _widget;
+};
+
+} // namespace Kv

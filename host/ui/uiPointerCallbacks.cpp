@@ -1,0 +1,40 @@
+#include "ui/uiPointerCallbacks.h"
+
+#include "ui/uiWidget.h"
+
+namespace Kv
+{
+
+void UiPointerCallbacks::clear()
+{
+    _moveCb = nullptr;
+    _downCb = nullptr;
+    _upCb = nullptr;
+}
+
+void UiPointerCallbacks::onPointerMoved(int x, int y)
+{
+    run<EvPointerMoveEvent>(_moveCb, x, y);
+}
+
+void UiPointerCallbacks::onPointerDown(int x, int y)
+{
+    run<EvPointerButtonDownEvent>(_downCb, x, y);
+}
+
+void UiPointerCallbacks::onPointerUp(int x, int y)
+{
+    run<EvPointerButtonUpEvent>(_upCb, x, y);
+}
+
+template <typename Event> void UiPointerCallbacks::run(CbHandler<EvEvent>* handler, int x, int y) const
+{
+    if (!handler || !_widget->takesInput())
+        return;
+    // What the handler does may end the widget, and with it these.
+    RCShdPtr<UiWidget> const keeper(_widget);
+    Event event(_widget->turnOver(x, y));
+    handler->call(event);
+}
+
+} // namespace Kv

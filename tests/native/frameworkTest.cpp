@@ -1,0 +1,369 @@
+#include "appUi/uiCompositionWorkspace.h"
+#include "appUi/uiCompositionWorkspaceListener.h"
+#include "base/rcWeakAccessor.h"
+#include "framework/fwComposition.h"
+#include "pluginAPI/piNode.h"
+
+#include <csignal>
+#include <filesystem>
+#include <fstream>
+#include <gtest/gtest.h>
+#include <iterator>
+#include <string>
+#include <sys/resource.h>
+#include <sys/stat.h>
+#include <utility>
+#include <vector>
+
+using namespace Kv;
+using namespace std::string_literals;
+
+namespace fs = std::filesystem;
+
+namespace
+{
+
+using Composition = RCWeakPtr<const PiCompositionGraphInterface>;
+
+template <typename Action> std::string wordsOf(Action const& action)
+{
+    try
+    {
+        action();
+    }
+    catch (ExBase const& exception)
+    {
+        return exception.getReason();
+    }
+    ADD_FAILURE() << "nothing was refused";
+    return {};
+}
+
+void expectContains(std::string const& text, std::string const& part)
+{
+    EXPECT_NE(text.find(part), std::string::npos) << "no \"" << part << "\" in \"" << text << "\"";
+}
+
+/// A folder of its own for each test, which is the current one too.
+class Compositions : public testing::Test
+{
+protected:
+    Compositions()
+    {
+        std::string name = (fs::temp_directory_path() / "compositions-XXXXXX").string();
+        folder = fs::canonical(mkdtemp(name.data()));
+        fs::current_path(folder);
+    }
+    ~Compositions() override
+    {
+        fs::current_path("/");
+        fs::permissions(folder, fs::perms::owner_all);
+        fs::remove_all(folder);
+    }
+
+    void write(std::string const& name, std::string const& text) const { std::ofstream(folder / name) << text; }
+
+    std::string read(std::string const& name) const
+    {
+        std::ifstream file(folder / name);
+        return {std::istreambuf_iterator<char>(file), {}};
+    }
+
+    OsFilePath pathOf(std::string const& name) const { return OsFilePath((folder / name).string()); }
+
+    RCStrongPtr<FwComposition> open(std::string const& name) const { return FwComposition::open(pathOf(name)); }
+
+    std::vector<std::string> listFiles() const
+    {
+        std::vector<std::string> names;
+        for (auto const& entry : fs::directory_iterator(folder))
+            names.push_back(entry.path().filename().string());
+        return names;
+    }
+
+    fs::path folder;
+};
+
+constexpr char const* grade = R"(<composition>
+  <node name="Grade" type="ColourGrade">
+    <value name="gain" text="1.5"/>
+    <input name="source" node="Read"/>
+  </node>
+  <node name="Read" type="ImageReader"/>
+</composition>
+)";
+
+} // namespace
+
+TEST_F(Compositions, NameTheFileAndTheLineOfWhatIsWrongWithThem)
+{
+    struct Case
+    {
+        int line;
+        char const* words;
+        char const* text;
+    };
+    for (Case const& wrong : std::vector<Case>{
+             {1, "no element", ""},
+             {2, "", "<composition>\n</comp>"},
+             {1, "'graph'", "<graph/>"},
+             {2, "'noode'", "<composition>\n<noode/></composition>"},
+             {2, "'colour'", "<composition>\n<node name='a' type='t' colour='c'/></composition>"},
+             {1, "'version'", "<composition version='1'/>"},
+             {2, "no attribute 'name'", "<composition>\n<node type='t'/></composition>"},
+             {2, "'name' of element 'node' is empty", "<composition>\n<node name='' type='t'/></composition>"},
+             {2, "no attribute 'type'", "<composition>\n<node name='a'/></composition>"},
+             {1, "holds a text", "<composition>text</composition>"},
+             {3, "two nodes named 'a'",
+              "<composition><node name='a' type='t'/>\n\n<node name='a' type='u'/></composition>"},
+             {2, "'value'", "<composition><node name='a' type='t'>\n<value name='v'/></node></composition>"},
+             {3, "two elements 'value' named 'v'",
+              "<composition><node name='a' type='t'>\n<value name='v' text=''/>\n<value name='v' "
+              "text=''/></node></composition>"},
+             {2, "'deeper'",
+              "<composition><node name='a' type='t'><value name='v' text=''>\n<deeper/></value></node></composition>"},
+             {2, "node 'b', which is not there",
+              "<composition><node name='a' type='t'>\n<input name='i' node='b'/></node></composition>"}})
+    {
+        write("wrong.vmcomposition", wrong.text);
+        std::string const words = wordsOf([this] { open("wrong.vmcomposition"); });
+        expectContains(words, (folder / "wrong.vmcomposition").string());
+        expectContains(words, "line " + std::to_string(wrong.line) + ":");
+        expectContains(words, wrong.words);
+    }
+    expectContains(wordsOf([this] { open(""); }), folder.string() + "': it is a folder");
+    expectContains(wordsOf([this] { open("missing"); }), "missing': No such file");
+    mkfifo((folder / "pipe").c_str(), 0600);
+    expectContains(wordsOf([this] { open("pipe"); }), "no regular file");
+}
+
+TEST_F(Compositions, AreReadAgainExactlyAsTheyWereWritten)
+{
+    std::string const name = "sh\xff\xe9t.vmcomposition";
+    std::string const text = " <&>\"'\t\r\n]]> \xe2\x82\xac\xf0\x9f\x8e\xac ";
+    write(name, grade);
+    RCStrongPtr<FwComposition> const composition = open(name);
+    EXPECT_EQ(composition->getGraph()->getName(), "sh\xff\xe9t");
+    composition->getGraph()->setNodeValue("Read", text, text);
+    composition->getGraph()->setNodeValue("Grade", "lift", "");
+    composition->getGraph()->setNodeValue("Grade", "gain", text);
+    composition->save();
+    RCStrongPtr<FwComposition> const again = open(name);
+    std::vector<RCShdPtr<const PiNode>> const nodes = again->getGraph()->getNodes();
+    ASSERT_EQ(nodes.size(), 2U);
+    EXPECT_EQ(nodes[0]->getName() + " " + nodes[0]->getType(), "Grade ColourGrade");
+    EXPECT_EQ(nodes[0]->getValues(), (PiNode::NamedTexts{{"gain", text}, {"lift", ""}}));
+    EXPECT_EQ(nodes[0]->getInputs(), (PiNode::NamedTexts{{"source", "Read"}}));
+    EXPECT_EQ(nodes[1]->getValues(), (PiNode::NamedTexts{{text, text}}));
+    std::string const written = read(name);
+    again->save();
+    EXPECT_EQ(read(name), written);
+}
+
+TEST_F(Compositions, StayAsTheyAreWhereAChangeIsRefused)
+{
+    write("shot.vmcomposition", grade);
+    RCStrongPtr<FwComposition> composition = open("shot.vmcomposition");
+    RCShdPtr<PiGraph> const graph = composition->getGraph();
+    expectContains(wordsOf([&] { graph->setNodeValue("Blur", "size", "1"); }), "'shot' has no node 'Blur'");
+    expectContains(wordsOf([&] { graph->setNodeValue("Read", "", "1"); }), "name");
+    EXPECT_THROW(graph->setNodeValue("Read", "file", "zero\0"s), ExBase);
+    EXPECT_THROW(graph->setNodeValue("Read", "file", "\xff"), ExBase);
+    EXPECT_THROW(graph->setNodeValue("Read", "\x1b", "1"), ExBase);
+    graph->setNodeValue("Grade", "gain", "1.5");
+    EXPECT_FALSE(composition->isModified()) << "it had that value";
+    RCShdPtr<const PiNode> const read = graph->findNode("Read");
+    EXPECT_TRUE(read->getValues().empty());
+    EXPECT_EQ(read->getGraph(), RCShdPtr<const PiGraph>(graph));
+    composition = nullptr;
+    expectContains(wordsOf([&] { graph->setNodeValue("Read", "file", "a"); }), "closed");
+    EXPECT_TRUE(graph->getController().isExpired());
+    EXPECT_TRUE(read->getGraph().isNull());
+    EXPECT_EQ(graph->getNodes().size(), 2U);
+}
+
+TEST_F(Compositions, CanBeEditedWhereTheDiskCanBeWrittenNow)
+{
+    write("shot.vmcomposition", grade);
+    RCStrongPtr<FwComposition> const composition = open("shot.vmcomposition");
+    auto const set = [&composition](char const* text) { composition->getGraph()->setNodeValue("Read", "file", text); };
+    set("a");
+    fs::permissions("shot.vmcomposition", fs::perms::owner_read);
+    EXPECT_FALSE(composition->isEditable());
+    expectContains(wordsOf([&] { set("b"); }), "cannot be written");
+    expectContains(wordsOf([&] { composition->save(); }), "permissions");
+    EXPECT_TRUE(composition->isModified());
+    fs::permissions("shot.vmcomposition", fs::perms(0640));
+    EXPECT_TRUE(composition->isEditable());
+    fs::permissions(folder, fs::perms(0500));
+    EXPECT_FALSE(composition->isEditable());
+    EXPECT_THROW(composition->save(), ExBase);
+    fs::permissions(folder, fs::perms(0700));
+    composition->save();
+    EXPECT_FALSE(composition->isModified());
+    EXPECT_EQ(fs::status("shot.vmcomposition").permissions(), fs::perms(0640));
+
+    fs::remove("shot.vmcomposition");
+    EXPECT_TRUE(composition->isEditable());
+    composition->save();
+    expectContains(read("shot.vmcomposition"), "text=\"a\"");
+    fs::remove("shot.vmcomposition");
+    fs::create_directory("shot.vmcomposition");
+    EXPECT_FALSE(composition->isEditable());
+    expectContains(wordsOf([&] { composition->save(); }), "it is a folder");
+}
+
+TEST_F(Compositions, AreSavedWhereTheirLinksLead)
+{
+    fs::create_directory("versions");
+    write("versions/v3", grade);
+    fs::create_symlink("v3", "versions/latest");
+    fs::create_symlink("versions/latest", "shot.vmcomposition");
+    RCStrongPtr<FwComposition> const composition = FwComposition::open(OsFilePath("./versions/../shot.vmcomposition"));
+    EXPECT_EQ(composition->getPath(), pathOf("versions/v3"));
+    composition->getGraph()->setNodeValue("Read", "file", "through links");
+    composition->save();
+    EXPECT_TRUE(fs::is_symlink("shot.vmcomposition") && fs::is_symlink("versions/latest"));
+    expectContains(read("versions/v3"), "through links");
+}
+
+TEST_F(Compositions, AreAsTheyWereOnADiskThatIsFull)
+{
+    write("shot.vmcomposition", grade);
+    RCStrongPtr<FwComposition> const composition = open("shot.vmcomposition");
+    composition->getGraph()->setNodeValue("Read", "file", std::string(10000, 'x'));
+    struct rlimit old = {};
+    getrlimit(RLIMIT_FSIZE, &old);
+    struct rlimit const little = {4096, old.rlim_max};
+    auto const oldHandler = std::signal(SIGXFSZ, SIG_IGN);
+    setrlimit(RLIMIT_FSIZE, &little);
+    std::string const words = wordsOf([&] { composition->save(); });
+    setrlimit(RLIMIT_FSIZE, &old);
+    static_cast<void>(std::signal(SIGXFSZ, oldHandler));
+    expectContains(words, "shot.vmcomposition': File too large");
+    EXPECT_EQ(read("shot.vmcomposition"), grade);
+    EXPECT_EQ(listFiles(), std::vector<std::string>{"shot.vmcomposition"});
+    EXPECT_TRUE(composition->isModified());
+}
+
+namespace
+{
+
+/// Writes down what it hears, with the name of the composition and that of the current one.
+class Hearer : public UiCompositionWorkspaceListener
+{
+public:
+    explicit Hearer(UiCompositionWorkspace& workspace) : _workspace(workspace) { workspace.setListener(this); }
+
+    void compositionOpened(Composition const& composition) override { note("opened", composition); }
+    void compositionClosed(Composition const& composition) override { note("closed", composition); }
+    void currentCompositionChanged() override { note("current", _workspace.getCurrentComposition()); }
+    void compositionChanged(Composition const& composition) override { note("changed", composition); }
+
+    std::string take() { return std::exchange(_heard, ""); }
+
+    static std::string nameOf(Composition const& composition)
+    {
+        return composition.isExpired() ? "none" : RCWeakAccessor(composition)->getGraph()->getName();
+    }
+
+private:
+    void note(std::string const& what, Composition const& composition)
+    {
+        _heard += what + " " + nameOf(composition) + " of " + std::to_string(_workspace.getNbCompositions()) + "; ";
+    }
+
+    UiCompositionWorkspace& _workspace;
+    std::string _heard;
+};
+
+} // namespace
+
+TEST_F(Compositions, AreOpenedMadeCurrentAndClosedInAWorkspace)
+{
+    RCShdPtr<UiCompositionWorkspace> const workspace = makeShd<UiCompositionWorkspace>();
+    Hearer hearer(*workspace);
+    for (char const* const name : {"a", "b", "c"})
+        write(name, grade);
+    EXPECT_TRUE(workspace->getCurrentComposition().isExpired());
+    EXPECT_TRUE(workspace->getFocus().isNull());
+    Composition const a = workspace->open(pathOf("a"));
+    EXPECT_EQ(hearer.take(), "opened a of 1; current a of 1; ");
+    Composition const b = workspace->open(pathOf("b"));
+    Composition const c = workspace->open(pathOf("c"));
+    hearer.take();
+    EXPECT_TRUE(workspace->open(pathOf("b")) == b);
+    EXPECT_EQ(hearer.take(), "current b of 3; ");
+    workspace->openComposition(b);
+    EXPECT_EQ(hearer.take(), "") << "it is current already";
+    EXPECT_THROW(workspace->open(pathOf("missing")), ExBase);
+    EXPECT_EQ(hearer.take(), "");
+    std::string order;
+    for (auto all = workspace->getCompositions(); !all.atEnd(); ++all)
+        order += Hearer::nameOf(*all);
+    EXPECT_EQ(order, "abc");
+
+    RCWeakAccessor<const PiCompositionGraphInterface> const held(b);
+    RCShdPtr<const PiGraph> const graph = held->getGraph();
+    EXPECT_TRUE(workspace->getComposition(graph) == b);
+    workspace->close(b);
+    EXPECT_EQ(hearer.take(), "closed b of 2; current c of 2; ");
+    EXPECT_TRUE(workspace->getComposition(graph).isExpired()) << "closed, although it is held here";
+    expectContains(wordsOf([&] { workspace->openComposition(b); }), "has been closed");
+    EXPECT_THROW(workspace->close(b), ExBase);
+    workspace->openComposition(a);
+    hearer.take();
+    workspace->close(c);
+    EXPECT_EQ(hearer.take(), "closed c of 1; ");
+    EXPECT_TRUE(c.isExpired());
+    workspace->close(a);
+    EXPECT_EQ(hearer.take(), "closed a of 0; current none of 0; ");
+    EXPECT_THROW(workspace->openComposition({}), ExBase);
+}
+
+TEST_F(Compositions, TellTheirWorkspaceOfEachChange)
+{
+    RCShdPtr<UiCompositionWorkspace> workspace = makeShd<UiCompositionWorkspace>();
+    write("shot", grade);
+    Composition const composition = workspace->open(pathOf("shot"));
+    EXPECT_TRUE(workspace->isCompositionEditable(composition));
+    Hearer hearer(*workspace);
+    // As the application has it: the graph is reached from the node, which keeps no const of its own.
+    RCWeakAccessor<const PiCompositionGraphInterface> const held(composition);
+    auto const writable =
+        RCWeakAccessor(const_cast<PiNode&>(*held->getNode()).getController()).castTo<PiCompositionGraphInterface>();
+    RCShdPtr<PiGraph> const graph = RCWeakAccessor(writable)->getGraph();
+    graph->setNodeValue("Read", "file", "a");
+    graph->setNodeValue("Read", "file", "a");
+    EXPECT_EQ(hearer.take(), "changed shot of 1; ");
+    EXPECT_TRUE(held->isModified());
+    workspace->save(composition);
+    EXPECT_EQ(hearer.take(), "changed shot of 1; ");
+    EXPECT_FALSE(held->isModified());
+    workspace = nullptr;
+    graph->setNodeValue("Read", "file", "b");
+    EXPECT_TRUE(held->isModified());
+}
+
+TEST_F(Compositions, AreKnownAsOpenByEveryPathOfTheirFile)
+{
+    UiCompositionWorkspace workspace;
+    fs::create_directory("deep");
+    write("deep/shot", grade);
+    fs::create_symlink("deep", "alias");
+    fs::create_symlink("alias/../deep/shot", "link");
+    fs::create_symlink("link", "linktolink");
+    fs::create_symlink("loop", "loop");
+    Composition const composition = workspace.open(OsFilePath("link"));
+    for (bool const isDeleted : {false, true})
+    {
+        if (isDeleted)
+            fs::remove_all("deep");
+        for (char const* const path : {"deep/shot", "./deep/../deep//shot", "alias/shot", "link", "linktolink"})
+            EXPECT_TRUE(workspace.isCompositionOpened(OsFilePath(path))) << path << isDeleted;
+        for (char const* const path : {"", "deep", "shot", "loop", "deep/other"})
+            EXPECT_FALSE(workspace.isCompositionOpened(OsFilePath(path))) << path << isDeleted;
+        EXPECT_EQ(workspace.isCompositionEditable(composition), !isDeleted) << "its folder went with it";
+    }
+    EXPECT_TRUE(workspace.isCompositionOpened(pathOf("deep/shot")));
+}
