@@ -130,9 +130,11 @@ void BrBrowser::select(RCShdPtr<SnSelection> const& selection)
             if (path.parent_path() == _directory && path.has_filename())
                 names.push_back(path.filename());
         }
-    if (!_multiple && names.size() > 1)
+    if (names.empty())
+        return;
+    if (!_multiple)
         names.resize(1);
-    onSelectionChanged(names.empty() ? "" : names.front(), names);
+    onSelectionChanged(names.front(), names);
     if (_native)
         _native->goTo(_directory, _focus, _selected);
 }

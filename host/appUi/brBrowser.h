@@ -60,7 +60,8 @@ public:
     /// in the current directory of the process. False, with everything as it was, if nothing is there.
     bool setURL(LiString const& url, HistoryEnum, UpdateEnum);
 
-    /// Selects the browsables of the selection that are in the current directory. A null selection selects nothing.
+    /// Selects the browsables of the selection that are in the current directory. Where none is, or the selection is
+    /// null, all stays as it was.
     void select(RCShdPtr<SnSelection> const& selection);
 
     /// The path of the entry that has the keyboard in it; empty if none is selected.

@@ -83,6 +83,7 @@ FUNCTIONS = {
     'showMessageBox': 'title messages | closeButtons',
     'makeXmlFromWidgetList': 'widgets | closeButtons',
     'createDialog': 'title xmlString | width height initialValues',
+    'showBrowser': '| title initialPath pathValidationCb',
     'instantiateAppMgr': '',
 }
 METHODS = {
@@ -97,7 +98,7 @@ METHODS = {
 VALUES = {'title': 't', 'xmlFile': '/missing', 'width': 1, 'height': 1, 'initialValues': {}, 'list': [()],
           'cancelButton': True, 'messages': [1], 'closeButtons': [], 'widgets': [], 'xmlString': XML,
           'widgetName': 'a', 'value': 'x', 'values': {}, 'invokeCallback': True, 'eventType': ui.EventType.STATE,
-          'cb': print, 'resName': 'r', 'display': True, 'enable': True}
+          'cb': print, 'resName': 'r', 'display': True, 'enable': True, 'initialPath': '/', 'pathValidationCb': None}
 
 
 def parameters_of(name, table):
@@ -111,7 +112,7 @@ def test_names_stand_in_the_order_of_their_registration():
         return [name for name in vars(scope) if not name.startswith('_')]
 
     functions = list(FUNCTIONS)
-    assert public(ui) == functions[:5] + ['EventType', 'Dialog', 'CursorGuard', 'BrowserScheme'] + functions[5:] + ['UiError']
+    assert public(ui) == functions[:6] + ['EventType', 'Dialog', 'CursorGuard', 'BrowserScheme'] + functions[6:] + ['UiError']
     assert public(ui.Dialog) == list(METHODS)
     assert [(name, int(value)) for name, value in ui.EventType.names.items()] == [
         ('ENABLE', 1), ('DISABLE', 2), ('STATE', 22), ('ACTIVATE', 23), ('VALUE_CHANGED', 24)]
@@ -167,7 +168,8 @@ def test_the_module_has_one_exception_whose_text_is_the_reason():
 
 DEFAULTS = {'width': 'Defaults to -1', 'height': 'Defaults to -1', 'initialValues': 'Defaults to {}',
             'closeButtons': 'Defaults to []', 'cancelButton': 'Default is C{False}',
-            'invokeCallback': 'Defaults to C{True}'}
+            'invokeCallback': 'Defaults to C{True}', 'initialPath': 'Defaults to ""',
+            'pathValidationCb': 'Defaults to C{None}', 'title': ''}
 FAIL_ON_UNKNOWN_NAME = ['addCallback', 'removeCallback', 'setWidgetResourceName', 'displayWidget', 'showWidget',
                         'hideWidget', 'isDisplayed', 'enableWidget']
 
