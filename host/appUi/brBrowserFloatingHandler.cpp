@@ -77,7 +77,7 @@ RCShdPtr<UiPushButton> BrBrowserFloatingHandler::createButton(char const* label,
     RCShdPtr<UiPushButton> button = UiPushButton::create(getContainer(), label, nullptr);
     button->getLabel().setString(label);
     button->setConstraint(
-        UiConstraint({edge(-buttonWidth, UiConstraint::OwnOpposite), edge(gap, UiConstraint::ParentLow),
+        UiConstraint({edge(buttonWidth, UiConstraint::OwnOpposite), edge(gap, UiConstraint::ParentLow),
                       edge(-right, UiConstraint::ParentHigh), edge(buttonHeight, UiConstraint::OwnOpposite)}));
     button->getPiWidget()->addCallback(PiWidget::Activate, &cb);
     return button;

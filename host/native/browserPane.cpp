@@ -206,6 +206,7 @@ void BrowserPane::activate()
         return;
     }
     _list->selectionModel()->select(current, QItemSelectionModel::Select | QItemSelectionModel::Rows);
+    forgetTyped();
     _handle.tell(&NtBrowserListener::onActivated);
 }
 
@@ -345,9 +346,16 @@ void BrowserPane::onChosen()
 {
     if (_choosing)
         return;
-    _notice.clear();
-    showState();
+    forgetTyped();
     tellChoice();
+}
+
+void BrowserPane::forgetTyped()
+{
+    _notice.clear();
+    if (_path->isEdited())
+        _path->setDirectory(_directory);
+    showState();
 }
 
 void BrowserPane::tellChoice()

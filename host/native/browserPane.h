@@ -82,6 +82,8 @@ private:
     void restoreView();
     Choice getChoice() const;
     void onChosen();
+    /// The user has turned to the list: what stands in the field counts no more.
+    void forgetTyped();
     void tellChoice();
     void say(std::string const& words);
     void showState();
