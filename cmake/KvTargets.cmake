@@ -11,5 +11,7 @@ endfunction()
 function(kv_python_module name)
   kv_library(${name} ${ARGN})
   target_link_libraries(${name} PUBLIC Boost::python Python3::Python)
-  set_target_properties(${name} PROPERTIES LIBRARY_OUTPUT_DIRECTORY ${KV_PACKAGE_DIR}/quorvane_velmora/libs)
+  # Modules that are linked to each other find each other wherever the package lies.
+  set_target_properties(${name} PROPERTIES LIBRARY_OUTPUT_DIRECTORY ${KV_PACKAGE_DIR}/quorvane_velmora/libs
+                                           BUILD_RPATH "$ORIGIN")
 endfunction()

@@ -28,7 +28,7 @@ public:
     explicit Iterator(RCShdPtr<IteratorImp<T>> engine) : _engine(std::move(engine)) {}
     Iterator(Iterator const&) = default;
     Iterator& operator=(Iterator const&) = default;
-    virtual ~Iterator() = default;
+    virtual ~Iterator();
 
     virtual T const* operator->() const { return &_engine->item(); }
     virtual T* operator->() { return &_engine.makeOwn().item(); }
@@ -79,5 +79,7 @@ public:
 private:
     RCPvtEngPtr<IteratorImp<T>> _engine;
 };
+
+template <typename T> Iterator<T>::~Iterator() = default;
 
 } // namespace Kv

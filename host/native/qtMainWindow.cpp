@@ -29,7 +29,6 @@ void QtMainWindow::show()
     if (!native)
         return;
     native->show();
-    native->raise();
     native->activateWindow();
     tellSize();
 }

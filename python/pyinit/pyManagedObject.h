@@ -18,10 +18,16 @@ public:
     {
     }
 
+    PyManagedObject(PyManagedObject const&) = delete;
+    PyManagedObject& operator=(PyManagedObject const&) = delete;
+    ~PyManagedObject() override;
+
     T const& getValue() const { return _value; }
 
 private:
     T _value;
 };
+
+template <typename T> PyManagedObject<T>::~PyManagedObject() = default;
 
 } // namespace Kv

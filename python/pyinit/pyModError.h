@@ -18,9 +18,9 @@ public:
     ModError(char const* sourcePath, int line, char const* reason) : Error(sourcePath, line, _modName.c_str(), reason)
     {
     }
-    ModError(ModError const&) = default;
-    ModError& operator=(ModError const&) = default;
-    ~ModError() override = default;
+    ModError(ModError const&);
+    ModError& operator=(ModError const&);
+    ~ModError() override;
 
     ExBase* clone() const override { return new ModError(*this); }
     [[noreturn]] void raise() const override { throw ModError(*this); }
@@ -44,6 +44,11 @@ private:
 template <typename Tag> std::string ModError<Tag>::_modName;
 template <typename Tag> std::string ModError<Tag>::_className;
 template <typename Tag> void* ModError<Tag>::_pythonException = nullptr;
+
+// Not in the class, where the compiler would make them for each library anew.
+template <typename Tag> ModError<Tag>::ModError(ModError const&) = default;
+template <typename Tag> ModError<Tag>& ModError<Tag>::operator=(ModError const&) = default;
+template <typename Tag> ModError<Tag>::~ModError() = default;
 
 template <typename Tag> void ModError<Tag>::initialize(char const* modName, char const* className)
 {

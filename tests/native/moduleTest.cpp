@@ -1,14 +1,21 @@
 #include <boost/python.hpp>
 
+#include "base/inBuildInfoUtil.h"
 #include "gfx/wsCursorRegistry.h"
+#include "pyui/src/inPyextUi.h"
 #include "pyui/src/pyManagedDialog.h"
 #include "pyui/src/pyUiError.h"
 #include "resmgt/osFilePath.h"
 #include "ui/uiCursorGuard.h"
+#include "ui/uiTopLevel.h"
 
+#include <algorithm>
 #include <gtest/gtest.h>
 #include <memory>
+#include <regex>
+#include <sstream>
 #include <string>
+#include <vector>
 
 namespace bp = boost::python;
 
@@ -177,6 +184,69 @@ TEST_F(Script, HasItsOwnExceptionComeThroughANativeLaunchThatIsWellUnwound)
     }
     run("del dialog\ngc.collect()\n");
     EXPECT_EQ(dialog->getReferenceCount(), 1);
+}
+
+TEST_F(Script, HasItsDialogDescribedByAPointer)
+{
+    run("dialog = make()\n");
+    RCShdPtr<Dialog> const dialog = getManaged("dialog")->getValue();
+    RCBasePtr<Dialog> const& pointer = dialog;
+    std::ostringstream written;
+    pointer.dump(written);
+    std::ostringstream address;
+    address << static_cast<void*>(dialog.get());
+    EXPECT_EQ(written.str(), "Pointee type = Kv::PyextUi::Dialog, T type = Kv::PyextUi::Dialog, ref: 2, pointer:" +
+                                 address.str() + ", RCBase pointer: " + address.str());
+}
+
+TEST(WidgetIterator, OfTheModuleSharesItsWidgetsUntilTheyChange)
+{
+    RCShdPtr<UiWidget> const widget = UiTopLevel::create("name", "title", nullptr, nullptr);
+    Iterator<RCShdPtr<UiWidget>> walk(std::vector<RCShdPtr<UiWidget>>(2, widget));
+    Iterator<RCShdPtr<UiWidget>> const before = walk;
+    EXPECT_EQ(widget->getReferenceCount(), 3) << "the widgets of a copy are those of the first";
+    *walk = nullptr;
+    EXPECT_EQ(widget->getReferenceCount(), 4);
+    EXPECT_EQ((*before)->getName(), "name");
+    EXPECT_THROW((*walk)->getName(), ExNullPtr);
+}
+
+TEST(PackageRecord, NamesThePackagesThatTheModuleNeeds)
+{
+    EXPECT_EQ(*InInit<KvInit::pyextUi>::getType(), typeid(InInit<KvInit::pyextUi>));
+    std::vector<std::string> names;
+    for (InPackageInfo const& info : InBuildInfoUtil::getInfos())
+        names.emplace_back(info.packageName);
+    auto const own = std::find(names.begin(), names.end(), "pyextUi");
+    ASSERT_NE(own, names.end());
+    for (char const* const needed : {"pyextGraph", "pyextInit", "appUi", "gfx", "ui", "internalAPI", "framework",
+                                     "scriptingAPI", "resmgt", "pluginAPI", "base"})
+        EXPECT_EQ(std::count(names.begin(), own, needed), 1) << needed;
+}
+
+TEST(BuildInfo, OfTheModuleAndItsLibrariesIsThatOfOneBuild)
+{
+    std::regex const date("[A-Z][a-z]{2} [ 123][0-9] 20[0-9]{2}");
+    std::regex const flavour("(opt|dbg|sanitize)\\.[a-z0-9_]+\\.(gnu|clang)");
+    std::vector<InPackageInfo> const infos = InBuildInfoUtil::getInfos();
+    for (InPackageInfo const& package : infos)
+    {
+        ASSERT_NE(package.buildInfo, nullptr) << package.packageName;
+        InBuildInfo const& info = *package.buildInfo;
+        bool const isModule = package.packageName == std::string("pyextUi");
+        EXPECT_EQ(info.getLibraryName(), isModule ? "libKvpyextUi" : std::string("libKV") + package.packageName);
+        EXPECT_STREQ(info.getProductName(), "Quorvane Velmora Library");
+        EXPECT_STREQ(info.getReleaseYear(), "2013");
+        EXPECT_STREQ(info.getVersionString(), "8.0");
+        EXPECT_STREQ(info.getVersionSuffix(), "");
+        EXPECT_EQ(info.getMajorVersion(), 8);
+        EXPECT_EQ(info.getMinorVersion(), 0);
+        EXPECT_EQ(info.getReleaseStage(), 42);
+        EXPECT_STREQ(info.getBuildNumber(), "2600");
+        EXPECT_TRUE(std::regex_match(info.getBuildDate(), date)) << info.getBuildDate();
+        EXPECT_TRUE(std::regex_match(info.getBuildFlavour(), flavour)) << info.getBuildFlavour();
+        EXPECT_STREQ(info.getBuildFlavour(), infos.front().buildInfo->getBuildFlavour());
+    }
 }
 
 int main(int argc, char** argv)

@@ -5,6 +5,7 @@ from contextlib import contextmanager
 
 import pytest
 
+import stage
 from quorvane_velmora import ui
 from PyQt6.QtCore import QTimer, Qt
 from PyQt6.QtTest import QTest
@@ -61,11 +62,11 @@ class User:
             return
         if self.failures:
             self._steps.clear()
-            window.close()
+            self.dismiss()
             return
         self._idle = 0 if self._steps else self._idle + 1
         if self._idle > self.PATIENCE:
-            self.failures.append('left open: ' + window.windowTitle())
+            self.failures.append('left open: ' + stage.title_of(window))
         if not self._steps:
             return
         step = self._steps.pop(0)
@@ -77,7 +78,7 @@ class User:
     @staticmethod
     def window():
         """The dialog that takes input now."""
-        return QApplication.activeModalWidget()
+        return stage.active()
 
     def find(self, name, kind=QWidget):
         found = [widget for widget in self.window().findChildren(kind) if widget.objectName() == name]
@@ -90,9 +91,21 @@ class User:
     def close(self, label='OK'):
         self.click('CloseButton_' + label)
 
+    def dismiss(self):
+        """Ends the dialog without a look at its buttons: a window is closed, in the application Escape is pressed."""
+        if self.window().isWindow():
+            self.window().close()
+        else:
+            QTest.keyClick(self.window(), Qt.Key.Key_Escape)
+
+    def title(self):
+        return stage.title_of(self.window())
+
     def focused(self):
         """The widget that has the keyboard. Where no window system says so, an open window may not be active."""
-        return QApplication.focusWidget() or self.window().focusWidget() or self.window()
+        window = self.window()
+        holder = QApplication.focusWidget() or window.window().focusWidget()
+        return holder if holder and (window.isWindow() or window.isAncestorOf(holder)) else window
 
     def focus(self):
         return self.focused().objectName()

@@ -2,3 +2,6 @@
 
 /// Marks what libKVpyextUi exports.
 #define KVPYEXTUI_API __attribute__((visibility("default")))
+
+/// Marks what libKVpyextUi keeps to itself of a class that it exports.
+#define KVPYEXTUI_LOCAL __attribute__((visibility("hidden")))

@@ -290,6 +290,21 @@ std::string Dialog::getCloseButtonClicked() const
     return _closeButtonClicked;
 }
 
+std::string const& Dialog::getCloseButtonClickedKey()
+{
+    return _closeButtonClickedKey;
+}
+
+void Dialog::disableNextClose()
+{
+    _disableNextClose = true;
+}
+
+PyCallables& Dialog::getCallables()
+{
+    return _callables;
+}
+
 void Dialog::clearCloseCallbacks()
 {
     for (RCStrongPtr<CallbackSet> const& set : _closeCallbacks)
@@ -491,3 +506,11 @@ bool Dialog::isEnabled(std::string const& widgetName) const
 }
 
 } // namespace Kv::PyextUi
+
+namespace Kv
+{
+
+template class RCBasePtr<PyextUi::Dialog>;
+template class Iterator<RCShdPtr<UiWidget>>;
+
+} // namespace Kv

@@ -4,6 +4,7 @@
 #include <boost/python/object.hpp>
 
 #include "appUi/uiAppMgr.h"
+#include "base/iterator.h"
 #include "base/rcShdPtr.h"
 #include "base/rcStrongPtr.h"
 #include "kvPyextUiExport.h"
@@ -60,13 +61,13 @@ public:
     virtual std::string getCloseButtonClicked() const;
 
     /// The key under which `getValues` gives the close button.
-    static std::string const& getCloseButtonClickedKey() { return _closeButtonClickedKey; }
+    static std::string const& getCloseButtonClickedKey();
 
     /// Takes the dialog's widgets off the screen.
     void hide() const;
 
     /// The next press of a close button, only that, leaves the dialog open.
-    void disableNextClose() { _disableNextClose = true; }
+    void disableNextClose();
 
     /// The value of the first widget of that name that has one; None if there is none, or it holds none.
     boost::python::object getValue(std::string const& widgetName) const;
@@ -107,40 +108,41 @@ public:
     bool isEnabled(std::string const& widgetName) const;
 
     /// The callables of the scripts' callbacks, whose references the wrappers of the dialog share.
-    PyCallables& getCallables() { return _callables; }
+    PyCallables& getCallables();
 
 protected:
-    virtual boost::python::object getWidgetValue(RCShdPtr<UiContainer> container, std::string const& widgetName) const;
-    virtual void getWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict& values) const;
+    KVPYEXTUI_LOCAL virtual boost::python::object getWidgetValue(RCShdPtr<UiContainer> container,
+                                                                 std::string const& widgetName) const;
+    KVPYEXTUI_LOCAL virtual void getWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict& values) const;
     /// True once a widget has taken the value.
-    virtual bool setWidgetValue(RCShdPtr<UiContainer> container, std::string const& widgetName,
-                                boost::python::object const& value, bool invokeCallback);
-    virtual void setWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict const& values,
-                                 bool invokeCallback);
+    KVPYEXTUI_LOCAL virtual bool setWidgetValue(RCShdPtr<UiContainer> container, std::string const& widgetName,
+                                                boost::python::object const& value, bool invokeCallback);
+    KVPYEXTUI_LOCAL virtual void setWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict const& values,
+                                                 bool invokeCallback);
 
 private:
     friend class WidgetCbs;
 
     using CallbackSets = std::vector<RCStrongPtr<CallbackSet>>;
 
-    void createUi(Positionner const& position);
-    static RCShdPtr<UiContainer> createTopLevelPanel(RCShdPtr<UiTopLevel> const& topLevel);
-    RCShdPtr<UiContainer> createFloatingContainer(int width, int height, int divisions, int position,
-                                                  std::string const& title);
-    void createTitleBar(RCShdPtr<UiContainer> const& container, std::string const& title);
+    KVPYEXTUI_LOCAL void createUi(Positionner const& position);
+    KVPYEXTUI_LOCAL static RCShdPtr<UiContainer> createTopLevelPanel(RCShdPtr<UiTopLevel> const& topLevel);
+    KVPYEXTUI_LOCAL RCShdPtr<UiContainer> createFloatingContainer(int width, int height, int divisions, int position,
+                                                                  std::string const& title);
+    KVPYEXTUI_LOCAL void createTitleBar(RCShdPtr<UiContainer> const& container, std::string const& title);
 
-    void onTitleBarMove(EvEvent& event);
-    void onTitleBarPress(EvEvent& event);
-    void onTitleBarRelease(EvEvent& event);
+    KVPYEXTUI_LOCAL void onTitleBarMove(EvEvent& event);
+    KVPYEXTUI_LOCAL void onTitleBarPress(EvEvent& event);
+    KVPYEXTUI_LOCAL void onTitleBarRelease(EvEvent& event);
 
-    void clearCloseCallbacks();
+    KVPYEXTUI_LOCAL void clearCloseCallbacks();
     /// Takes the handler of a close button from the button that has it, where several bear the name.
-    void unwireNamesake(CallbackSet const& set) const;
-    void setupCloseCallbacks();
+    KVPYEXTUI_LOCAL void unwireNamesake(CallbackSet const& set) const;
+    KVPYEXTUI_LOCAL void setupCloseCallbacks();
 
-    RCShdPtr<UiWidget> getWidget(std::string const& name) const;
+    KVPYEXTUI_LOCAL RCShdPtr<UiWidget> getWidget(std::string const& name) const;
 
-    static std::string const _closeButtonClickedKey;
+    KVPYEXTUI_LOCAL static std::string const _closeButtonClickedKey;
 
     std::string _xml;
     std::string _title;
@@ -162,3 +164,12 @@ private:
 };
 
 } // namespace Kv::PyextUi
+
+namespace Kv
+{
+
+// Whoever uses dialogs shares these with the module.
+extern template class KVPYEXTUI_API RCBasePtr<PyextUi::Dialog>;
+extern template class KVPYEXTUI_API Iterator<RCShdPtr<UiWidget>>;
+
+} // namespace Kv

@@ -5,6 +5,13 @@
 
 namespace bp = boost::python;
 
+namespace Kv
+{
+
+template class PyManagedObject<RCShdPtr<PyextUi::Dialog>>;
+
+} // namespace Kv
+
 namespace Kv::PyextUi
 {
 

@@ -1,17 +1,91 @@
 #include <boost/python.hpp>
 
+#include "appUi/inAppUi.h"
 #include "appUi/uiAppMgr.h"
+#include "base/inBase.h"
+#include "base/inBuildInfoUtil.h"
+#include "framework/inFramework.h"
+#include "gfx/inGfx.h"
+#include "inPyextUi.h"
+#include "internalAPI/inInternalApi.h"
 #include "internalAPI/piBrowserSchemes.h"
+#include "pluginAPI/inPluginApi.h"
 #include "pyCompat.h"
 #include "pyConvenienceFunctions.h"
 #include "pyManagedDialog.h"
 #include "pyUiError.h"
 #include "pyextUiDocs.h"
+#include "pygraph/inPyextGraph.h"
+#include "pyinit/inPyextInit.h"
+#include "resmgt/inResmgt.h"
+#include "scriptingAPI/inScriptingApi.h"
+#include "ui/inUi.h"
 #include "ui/uiCursorGuard.h"
 
+#include <memory>
 #include <string>
 
 namespace bp = boost::python;
+
+namespace Kv
+{
+
+namespace
+{
+
+class LibraryBuildInfo : public InBuildInfo
+{
+public:
+    char const* getProductName() const override { return "Quorvane Velmora Library"; }
+    char const* getLibraryName() const override { return "libKvpyextUi"; }
+    char const* getReleaseYear() const override { return "2013"; }
+    char const* getVersionString() const override { return "8.0"; }
+    char const* getVersionSuffix() const override { return getReleaseStage() == 3 ? "dev" : ""; }
+    int getMajorVersion() const override { return 8; }
+    int getMinorVersion() const override { return 0; }
+    int getReleaseStage() const override { return 42; }
+    char const* getBuildNumber() const override { return "2600"; }
+    char const* getBuildDate() const override { return __DATE__; }
+    char const* getBuildFlavour() const override { return KV_BUILD_FLAVOUR; }
+};
+
+} // namespace
+
+template <> std::type_info const* InInit<KvInit::pyextUi>::getType()
+{
+    return &typeid(InInit);
+}
+
+template <> InInit<KvInit::pyextUi>::InInit() : InPackageInit("pyextUi")
+{
+    registerPackage();
+    addDependency(InInit<KvInit::pyextGraph>::getType());
+    addDependency(InInit<KvInit::pyextInit>::getType());
+    addDependency(InInit<KvInit::appUi>::getType());
+    addDependency(InInit<KvInit::gfx>::getType());
+    addDependency(InInit<KvInit::ui>::getType());
+    addDependency(InInit<KvInit::internalAPI>::getType());
+    addDependency(InInit<KvInit::framework>::getType());
+    addDependency(InInit<KvInit::scriptingAPI>::getType());
+    addDependency(InInit<KvInit::resmgt>::getType());
+    addDependency(InInit<KvInit::pluginAPI>::getType());
+    addDependency(InInit<KvInit::base>::getType());
+}
+
+template <> void InInit<KvInit::pyextUi>::initPackage()
+{
+    InBuildInfoUtil::registerInfo(std::make_unique<LibraryBuildInfo>());
+}
+
+namespace
+{
+
+/// Before every other static object of the module.
+InInit<KvInit::pyextUi> const packageRecord __attribute__((init_priority(101)));
+
+} // namespace
+
+} // namespace Kv
 
 namespace Kv::PyextUi
 {

@@ -1,0 +1,88 @@
+"""What the module's shared object shows to other libraries, and what the libraries tell of each other."""
+
+import os
+import re
+import subprocess
+from collections import Counter
+
+from quorvane_velmora import ui
+
+SOURCES = os.path.join(os.path.dirname(__file__), '..', '..')
+LIBS = os.path.dirname(ui.__file__)
+BUILD = os.path.join(LIBS, '..', '..', '..')
+DIALOG = 'Kv::PyextUi::Dialog'
+ERROR = 'Kv::PyextInit::ModError<Kv::PyextUi::Ui>'
+WRAPPER = 'Kv::PyManagedObject<Kv::RCShdPtr<Kv::PyextUi::Dialog> >'
+ITERATOR = 'Kv::Iterator<Kv::RCShdPtr<Kv::UiWidget> >'
+POINTER = 'Kv::RCBasePtr<Kv::PyextUi::Dialog>'
+
+
+def read(command, *arguments):
+    return subprocess.run([command, *arguments], capture_output=True, text=True, check=True).stdout
+
+
+def symbols(library, kind):
+    """The full names; what a compiler makes twice, such as a constructor, stands here once."""
+    return {line[19:] for line in read('nm', '-D', '-C', kind, library).splitlines()}
+
+
+def declared_in(header, class_name, only_public=False):
+    """How often each operation is declared in a class; what the compiler makes itself does not count."""
+    with open(os.path.join(SOURCES, header)) as lines:
+        body = re.search(r'^(?:template .*)?class (?:KV\w+ )?%s\b[^;]*?\n\{\n(.*?)^\};' % class_name, lines.read(),
+                         re.DOTALL | re.MULTILINE).group(1)
+    if only_public:
+        body = re.search(r'public:\n(.*?)^\w+:', body, re.DOTALL | re.MULTILINE).group(1)
+    lines = [line for line in body.splitlines()
+             if re.match(r' {4}[\w[~]', line) and not re.search(r'= (default|delete);$', line)]
+    return Counter(re.findall(r'^.*?(operator[^(]*|~?\w+)\(', '\n'.join(lines), re.MULTILINE))
+
+
+def exported_by_class():
+    counts = {}
+    rest = set()
+    for name in symbols(os.path.join(LIBS, 'libKVpyextUi.so'), '--defined-only'):
+        for class_name in DIALOG, ERROR, WRAPPER, ITERATOR, POINTER:
+            if name.startswith(class_name + '::'):
+                member = re.match(r'operator[^(]*|[~\w]+', name[len(class_name) + 2:]).group()
+                counts.setdefault(class_name, Counter())[member] += 1
+                break
+        else:
+            rest.add(name)
+    return counts, rest
+
+
+def test_the_module_shows_its_public_operations_and_nothing_else():
+    counts, rest = exported_by_class()
+    error = declared_in('python/pyinit/pyModError.h', 'ModError')
+    error.update(('_modName', '_className', '_pythonException'))
+    assert counts == {
+        DIALOG: declared_in('python/pyui/src/pyDialog.h', 'Dialog', only_public=True),
+        ERROR: error,
+        WRAPPER: declared_in('python/pyinit/pyManagedObject.h', 'PyManagedObject'),
+        ITERATOR: declared_in('host/base/iterator.h', 'Iterator'),
+        POINTER: declared_in('host/base/rcBasePtr.h', 'RCBasePtr'),
+    }
+    assert {'launch', 'redraw', 'hide', '~Dialog'} < set(counts[DIALOG]) and 'getWidget' not in counts[DIALOG]
+    assert rest == {'PyInit_libKVpyextUi', 'Kv::InInit<KvInit::pyextUi>::getType()'} | {
+        f'{what} for {name}' for what in ('vtable', 'typeinfo') for name in (DIALOG, ERROR, WRAPPER, ITERATOR)}
+
+
+def linked_to(path):
+    return set(re.findall(r'\(NEEDED\).*\[libKV(\w+)\.so\]', read('readelf', '-d', path)))
+
+
+def test_a_library_names_what_it_is_linked_to_as_its_dependencies():
+    paths = {name[5:-3]: os.path.join(folder, name) for folder in (LIBS, os.path.join(BUILD, 'lib'))
+             for name in os.listdir(folder) if name.endswith('.so')}
+    get_type = re.compile(r'Kv::InInit<KvInit::(\w+)>::getType\(\)')
+    named, shown = ({package: set(get_type.findall('\n'.join(symbols(path, kind)))) for package, path in paths.items()}
+                    for kind in ('--undefined-only', '--defined-only'))
+    assert shown == {package: {package} - {'native'} for package in paths}
+    assert len(named['pyextUi']) == 11
+
+    def reach(package):
+        return named[package].union(*map(reach, named[package]))
+
+    for package, path in paths.items():
+        assert named[package] <= linked_to(path) <= reach(package), package
