@@ -121,15 +121,17 @@ bool BrBrowser::setURL(LiString const& url, HistoryEnum, UpdateEnum)
 void BrBrowser::select(RCShdPtr<SnSelection> const& selection)
 {
     requireUiThread();
+    if (!selection)
+        return;
     using Convert = SnItemConvert<RCShdPtr<BrBrowsable>>;
+    RCShdPtr<const SnSelection> const browsables = selection->filter(Convert::getPredicate());
     std::vector<std::string> names;
-    if (selection)
-        for (RCShdPtr<const SnItem> const& item : *selection->filter(Convert::getPredicate()))
-        {
-            std::filesystem::path const path = Convert::get(item)->getPath().toString();
-            if (path.parent_path() == _directory && path.has_filename())
-                names.push_back(path.filename());
-        }
+    for (RCShdPtr<const SnItem> const& item : *browsables)
+    {
+        std::filesystem::path const path = Convert::get(item)->getPath().toString();
+        if (path.parent_path() == _directory && path.has_filename())
+            names.push_back(path.filename());
+    }
     if (names.empty())
         return;
     if (!_multiple)
