@@ -17,6 +17,11 @@ namespace Kv
 namespace
 {
 
+bool isJump(int key)
+{
+    return key == Qt::Key_Home || key == Qt::Key_End || key == Qt::Key_PageUp || key == Qt::Key_PageDown;
+}
+
 /// Gives the rows air.
 class RowDelegate final : public QStyledItemDelegate
 {
@@ -72,16 +77,25 @@ void BrowserList::setPlaceholder(QString const& text)
 void BrowserList::keyPressEvent(QKeyEvent* event)
 {
     bool const isEnter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
-    bool const isUp = event->key() == Qt::Key_Backspace;
+    bool const isArrow = event->key() == Qt::Key_Down || event->key() == Qt::Key_Up;
     // With Alt the arrows are not for the rows.
     if (event->modifiers() & Qt::AltModifier)
         event->ignore();
-    else if (isEnter && !event->isAutoRepeat())
-        _wishes.activate();
-    else if (isUp)
+    else if (event->key() == Qt::Key_Backspace)
         _wishes.goUp();
-    else if (!isEnter && !selectFirst(*event))
+    else if (isEnter && event->isAutoRepeat())
+        event->accept();
+    else if ((isEnter || isArrow) && selectFirst())
+        event->accept();
+    else if (isEnter)
+        _wishes.activate();
+    else
+    {
         QTreeView::keyPressEvent(event);
+        // A jump to the row that the keyboard is on already would select nothing.
+        if (isJump(event->key()))
+            selectFirst();
+    }
 }
 
 void BrowserList::mousePressEvent(QMouseEvent* event)
@@ -122,10 +136,9 @@ void BrowserList::changeEvent(QEvent* event)
         fitColumns();
 }
 
-bool BrowserList::selectFirst(QKeyEvent const& event)
+bool BrowserList::selectFirst()
 {
-    bool const isArrow = event.key() == Qt::Key_Down || event.key() == Qt::Key_Up;
-    if (!isArrow || !currentIndex().isValid() || selectionModel()->hasSelection())
+    if (!currentIndex().isValid() || selectionModel()->hasSelection())
         return false;
     setCurrentIndex(currentIndex());
     return true;

@@ -34,8 +34,9 @@ protected:
     void changeEvent(QEvent* event) override;
 
 private:
-    /// True if the key has selected the row that the keyboard is on, where nothing was selected.
-    bool selectFirst(QKeyEvent const& event);
+    /// Where nothing is selected, selects the row that the keyboard is on: what a key does next is seen before. True if
+    /// it has.
+    bool selectFirst();
     void fitColumns();
 
     Wishes _wishes;

@@ -6,7 +6,6 @@
 #include "native/pathField.h"
 #include "native/qtFocusOrder.h"
 #include "native/qtText.h"
-#include "resmgt/liStringUtil.h"
 #include "resmgt/osPlace.h"
 
 #include <QApplication>
@@ -41,7 +40,7 @@ std::string findFault(std::string const& directory)
     {
         if (OsPlace::find(directory, "").name.empty())
             return "";
-        return LiStringUtil::getPrintable(directory) + " is no folder any more";
+        return OsPlace::quote(directory) + " is no folder any more";
     }
     catch (ExBase const& error)
     {
@@ -258,7 +257,7 @@ void BrowserPane::leave(std::string const& reason)
 {
     std::string const nearest = OsPlace::findNearest(_directory);
     walkTo(nearest, {});
-    say(reason + ". This is " + LiStringUtil::getPrintable(nearest));
+    say(reason + ". This is " + OsPlace::quote(nearest));
 }
 
 void BrowserPane::keepView()
@@ -311,7 +310,9 @@ void BrowserPane::restoreView()
         return rows.empty() ? QModelIndex() : _model->index(rows.front(), 0);
     };
     QModelIndex const focus = indexOf(_wanted.focus.empty() ? _wantedView.current : _wanted.focus);
-    _list->selectionModel()->setCurrentIndex(focus, QItemSelectionModel::NoUpdate);
+    // The keyboard is always on some row: from none, the list would take every key for a step to the first.
+    _list->selectionModel()->setCurrentIndex(focus.isValid() ? focus : _model->index(0, 0),
+                                             QItemSelectionModel::NoUpdate);
     _list->doItemsLayout();
     QModelIndex const top = indexOf(_wantedView.top);
     if (_wantedView.top.empty())

@@ -162,8 +162,8 @@ protected:
 
 TEST_F(Folder, IsReadAndSortedInSmallStepsWhateverItsSize)
 {
-    constexpr int count = 10000;
-    for (int number = 0; number < count; ++number)
+    constexpr std::size_t count = 10000;
+    for (std::size_t number = 0; number < count; ++number)
         make({"file" + std::to_string(number * 7919 % count)});
     OsDirScan scan(folder, {});
     std::size_t before = 0;

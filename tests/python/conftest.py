@@ -7,7 +7,21 @@ import traceback
 
 import pytest
 
+import stage
 from user import User
+
+
+def pytest_configure(config):
+    config.addinivalue_line('markers', 'standalone: about dialogs that have windows of their own')
+    config.addinivalue_line('markers', 'inside: about the running application')
+
+
+def pytest_collection_modifyitems(config, items):
+    """Each test belongs to both settings unless it is marked as one of a single setting."""
+    other = 'inside' if stage.application() is None else 'standalone'
+    left = [item for item in items if item.get_closest_marker(other)]
+    items[:] = [item for item in items if item not in left]
+    config.hook.pytest_deselected(items=left)
 
 
 @pytest.fixture

@@ -8,12 +8,16 @@ def application():
     return next((window for window in QApplication.topLevelWidgets() if window.objectName() == 'Velmora'), None)
 
 
+# The names that floating containers go by.
+FLOATING = ('Whatever', 'BrowserWindow')
+
+
 def dialogs():
     """The dialogs on the screen, the uppermost last."""
     main = application()
     if main is None:
         return [window for window in QApplication.topLevelWidgets() if window.isVisible()]
-    return [widget for widget in main.findChildren(QWidget, 'Whatever') if widget.isVisible()]
+    return [widget for widget in main.findChildren(QWidget) if widget.objectName() in FLOATING and widget.isVisible()]
 
 
 def active():
