@@ -4,15 +4,27 @@
 #include "appUi/uiView.h"
 #include "base/exBase.h"
 #include "native/ntPlatform.h"
-#include "resmgt/osFsUtils.h"
 #include "resmgt/osPlace.h"
 #include "ui/uiContainer.h"
 
 #include <filesystem>
+#include <system_error>
 #include <utility>
 
 namespace Kv
 {
+
+namespace
+{
+
+/// True also for a link that leads nowhere.
+bool isThere(std::string const& path)
+{
+    std::error_code error;
+    return std::filesystem::exists(std::filesystem::symlink_status(path, error));
+}
+
+} // namespace
 
 /// Client data outlives the widget where somebody holds it, and then has no selection.
 class BrBrowser::View : public UiView
@@ -143,7 +155,8 @@ void BrBrowser::select(RCShdPtr<SnSelection> const& selection)
 
 LiString BrBrowser::getInputFocusPath() const
 {
-    return _focus.empty() ? LiString() : LiString(OsPlace::join(_directory, _focus));
+    std::string const path = OsPlace::join(_directory, _focus);
+    return _focus.empty() || !isThere(path) ? LiString() : LiString(path);
 }
 
 LiString BrBrowser::getPath() const
@@ -210,7 +223,7 @@ RCShdPtr<SnSelection> BrBrowser::makeSelection() const
 {
     SnSelection::Items items;
     for (std::string const& name : _selected)
-        if (std::string const path = OsPlace::join(_directory, name); OsFsUtils::fileExists(OsFilePath(path)))
+        if (std::string const path = OsPlace::join(_directory, name); isThere(path))
             items.push_back(makeShd<BrBrowsableItem>(makeShd<BrBrowsable>(path)));
     return makeShd<SnSelection>(std::move(items));
 }

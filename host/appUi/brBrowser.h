@@ -64,7 +64,7 @@ public:
     /// null, all stays as it was.
     void select(RCShdPtr<SnSelection> const& selection);
 
-    /// The path of the entry that has the keyboard in it; empty if none is selected.
+    /// The path of the entry that has the keyboard in it; empty if none is selected, or it is gone.
     LiString getInputFocusPath() const;
 
     /// The current directory.

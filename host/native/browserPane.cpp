@@ -280,6 +280,10 @@ void BrowserPane::onRead()
     bool const isNew = std::exchange(_arriving, false);
     if (std::exchange(_replaced, false) || isNew)
         choose();
+    // A file of a sequence stays in focus as it was asked for, though the sequence goes by its first.
+    if (isNew && _wanted.selected.size() <= 1 && !_model->findRows({_wanted.focus}).empty())
+        _told = getChoice();
+    tellChoice();
     showState();
 }
 
@@ -295,11 +299,6 @@ void BrowserPane::choose()
     _list->selectionModel()->select(selection, QItemSelectionModel::ClearAndSelect);
     restoreView();
     _choosing = false;
-    // A file of a sequence stays what was asked for, though the sequence goes by its first.
-    bool const isFound = !selection.isEmpty() && _model->findRows({_wanted.focus}).size() == 1;
-    if (isFound && _wanted.selected.size() <= 1)
-        _told = getChoice();
-    tellChoice();
 }
 
 void BrowserPane::restoreView()

@@ -9,6 +9,7 @@
 #include <QElapsedTimer>
 #include <QLocale>
 #include <QStyle>
+#include <QTextDocument>
 
 #include <algorithm>
 #include <optional>
@@ -126,7 +127,7 @@ QVariant DirModel::data(QModelIndex const& index, int role) const
     if (role == Qt::DecorationRole && isName)
         return entry.isDirectory ? _directoryIcon : _fileIcon;
     if (role == Qt::ToolTipRole && isName)
-        return toShownPath(entry.title).toHtmlEscaped();
+        return Qt::convertFromPlainText(toShownPath(entry.title), Qt::WhiteSpaceNormal);
     if (role == Qt::TextAlignmentRole)
         return QVariant(getAlignment(index.column()));
     return {};
