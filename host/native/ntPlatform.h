@@ -99,6 +99,8 @@ public:
                                                NtMenuListener& listener) = 0;
     virtual std::unique_ptr<NtPushButton> createPushButton(NtContainer& parent, std::string const& name,
                                                            NtPushButtonListener& listener) = 0;
+    virtual std::unique_ptr<NtBrowser> createBrowser(NtContainer& parent, std::string const& name,
+                                                     NtBrowserListener& listener) = 0;
 
     /// Dispatches events until `*until` is true, however it came to be. What a handler throws ends the loop and is
     /// thrown on from here. When the application is asked to quit, or a window closes that has nothing else to press,

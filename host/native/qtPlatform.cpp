@@ -1,6 +1,7 @@
 #include "native/qtPlatform.h"
 
 #include "native/qtAdoptedContainer.h"
+#include "native/qtBrowser.h"
 #include "native/qtContainer.h"
 #include "native/qtFloat.h"
 #include "native/qtGuard.h"
@@ -175,6 +176,12 @@ std::unique_ptr<NtPushButton> QtPlatform::createPushButton(NtContainer& parent, 
                                                            NtPushButtonListener& listener)
 {
     return std::make_unique<QtPushButton>(nativeOf(parent), name, listener);
+}
+
+std::unique_ptr<NtBrowser> QtPlatform::createBrowser(NtContainer& parent, std::string const& name,
+                                                     NtBrowserListener& listener)
+{
+    return std::make_unique<QtBrowser>(nativeOf(parent), name, listener);
 }
 
 void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)

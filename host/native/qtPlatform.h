@@ -37,6 +37,8 @@ public:
     std::unique_ptr<NtMenu> createMenu(NtContainer& parent, std::string const& name, NtMenuListener& listener) override;
     std::unique_ptr<NtPushButton> createPushButton(NtContainer& parent, std::string const& name,
                                                    NtPushButtonListener& listener) override;
+    std::unique_ptr<NtBrowser> createBrowser(NtContainer& parent, std::string const& name,
+                                             NtBrowserListener& listener) override;
 
     void runLoop(bool const volatile* until, bool volatile* end) override;
     void endLoop() override;

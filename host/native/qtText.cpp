@@ -11,4 +11,18 @@ QString toQString(std::string const& text)
     return decoder(QByteArrayView(text));
 }
 
+QString toShownPath(std::string const& path)
+{
+    QString text = toQString(path);
+    for (QChar& c : text)
+        if (!c.isPrint() && !c.isSurrogate())
+            c = QChar::ReplacementCharacter;
+    return text;
+}
+
+std::string toPath(QString const& text)
+{
+    return text.toStdString();
+}
+
 } // namespace Kv

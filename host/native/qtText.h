@@ -11,4 +11,11 @@ namespace Kv
 /// takes for a byte order mark where it stands first.
 QString toQString(std::string const& text);
 
+/// Bytes of the file system for a reader: those that are no text, and characters that would break a line or are not to
+/// be seen, stand as replacement characters.
+QString toShownPath(std::string const& path);
+
+/// The bytes of the file system that a text stands for.
+std::string toPath(QString const& text);
+
 } // namespace Kv

@@ -1,8 +1,8 @@
 #include "resmgt/osDirScan.h"
 
 #include "base/exBase.h"
-#include "resmgt/liStringUtil.h"
 #include "resmgt/osNumberedName.h"
+#include "resmgt/osPlace.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -21,8 +21,7 @@ namespace
 [[noreturn]] void throwCannotRead(std::string const& directory)
 {
     throw ExBase(__FILE__, __LINE__,
-                 "Cannot read " + LiStringUtil::getPrintable(directory) + ": " +
-                     std::generic_category().message(errno));
+                 "Cannot read " + OsPlace::quote(directory) + ": " + std::generic_category().message(errno));
 }
 
 /// File systems keep times no finer than the kernel's clock ticks; two changes within one tick bear one time.

@@ -1,7 +1,6 @@
 #include "resmgt/osPlace.h"
 
 #include "base/exBase.h"
-#include "resmgt/liStringUtil.h"
 
 #include <cstdlib>
 #include <filesystem>
@@ -59,10 +58,10 @@ OsPlace OsPlace::find(std::string const& path, std::string const& base)
     std::error_code error;
     fs::file_status const status = fs::status(absolute, error);
     if (status.type() == fs::file_type::not_found)
-        throw ExBase(__FILE__, __LINE__, "There is no " + LiStringUtil::getPrintable(absolute.native()));
+        throw ExBase(__FILE__, __LINE__, "There is no " + OsPlace::quote(absolute.native()));
     if (status.type() == fs::file_type::none)
         throw ExBase(__FILE__, __LINE__,
-                     "Cannot look at " + LiStringUtil::getPrintable(absolute.native()) + ": " + error.message());
+                     "Cannot look at " + OsPlace::quote(absolute.native()) + ": " + error.message());
     if (fs::is_directory(status))
         return {trim(absolute), ""};
     return {trim(absolute.parent_path()), absolute.filename().native()};
@@ -75,6 +74,11 @@ std::string OsPlace::findNearest(std::string const& directory)
     while (!fs::is_directory(path, error) && path.has_relative_path())
         path = path.parent_path();
     return path.native();
+}
+
+std::string OsPlace::quote(std::string const& path)
+{
+    return "'" + path + "'";
 }
 
 std::string OsPlace::join(std::string const& directory, std::string const& name)

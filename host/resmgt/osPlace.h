@@ -24,6 +24,10 @@ struct KVRESMGT_API OsPlace
 
     /// The path of an entry; of the directory itself where the name is empty.
     static std::string join(std::string const& directory, std::string const& name);
+
+    /// A path within words for a person: in quotes, and whole however long, since it is the end that tells it from
+    /// others.
+    static std::string quote(std::string const& path);
 };
 
 } // namespace Kv

@@ -9,8 +9,12 @@ APPLICATION = next((window for window in QApplication.topLevelWidgets() if windo
 TITLE_HEIGHT = 25 if APPLICATION else 24
 
 
+# The names that floating containers go by.
+FLOATING = ('Whatever', 'BrowserWindow')
+
+
 def floating():
-    return [widget for widget in APPLICATION.findChildren(QWidget, 'Whatever') if widget.isVisible()]
+    return [widget for widget in APPLICATION.findChildren(QWidget) if widget.objectName() in FLOATING and widget.isVisible()]
 
 
 def dialogs():

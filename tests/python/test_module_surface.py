@@ -86,6 +86,7 @@ FUNCTIONS = {
     'showMessageBox': 'title messages | closeButtons',
     'makeXmlFromWidgetList': 'widgets | closeButtons',
     'createDialog': 'title xmlString | width height initialValues',
+    'showBrowser': '| title initialPath pathValidationCb',
     'instantiateAppMgr': '',
 }
 METHODS = {
@@ -104,7 +105,7 @@ WORKSPACE_METHODS = {
 VALUES = {'title': 't', 'xmlFile': '/missing', 'width': 1, 'height': 1, 'initialValues': {}, 'list': [()],
           'cancelButton': True, 'messages': [1], 'closeButtons': [], 'widgets': [], 'xmlString': XML,
           'widgetName': 'a', 'value': 'x', 'values': {}, 'invokeCallback': True, 'eventType': ui.EventType.STATE,
-          'cb': print, 'resName': 'r', 'display': True, 'enable': True}
+          'cb': print, 'resName': 'r', 'display': True, 'enable': True, 'initialPath': '/', 'pathValidationCb': None}
 
 
 def parameters_of(name, table):
@@ -118,8 +119,8 @@ def test_names_stand_in_the_order_of_their_registration():
         return [name for name in vars(scope) if not name.startswith('_')]
 
     functions = list(FUNCTIONS)
-    assert public(ui) == functions[:5] + [
-        'EventType', 'Dialog', 'CursorGuard', 'BrowserScheme', 'Workspace'] + functions[5:] + ['UiError']
+    assert public(ui) == functions[:6] + [
+        'EventType', 'Dialog', 'CursorGuard', 'BrowserScheme', 'Workspace'] + functions[6:] + ['UiError']
     assert public(ui.Dialog) == list(METHODS)
     assert public(ui.Workspace) == list(WORKSPACE_METHODS)
     assert [(name, int(value)) for name, value in ui.EventType.names.items()] == [
@@ -177,7 +178,8 @@ def test_the_module_has_one_exception_whose_text_is_the_reason():
 TABLES = {ui: FUNCTIONS, ui.Dialog: METHODS, ui.Workspace: WORKSPACE_METHODS}
 DEFAULTS = {'width': 'Defaults to -1', 'height': 'Defaults to -1', 'initialValues': 'Defaults to {}',
             'closeButtons': 'Defaults to []', 'cancelButton': 'Default is C{False}',
-            'invokeCallback': 'Defaults to C{True}'}
+            'invokeCallback': 'Defaults to C{True}', 'initialPath': 'Defaults to ""',
+            'pathValidationCb': 'Defaults to C{None}', 'title': ''}
 FAIL_ON_UNKNOWN_NAME = ['addCallback', 'removeCallback', 'setWidgetResourceName', 'displayWidget', 'showWidget',
                         'hideWidget', 'isDisplayed', 'enableWidget']
 

@@ -18,6 +18,12 @@ inline PyObject* stringFromStringAndSize(char const* text, Py_ssize_t size)
     return PyUnicode_FromStringAndSize(text, size);
 }
 
+/// The bytes of a path as scripts see paths.
+inline PyObject* pathFromStringAndSize(char const* path, Py_ssize_t size)
+{
+    return PyUnicode_DecodeFSDefaultAndSize(path, size);
+}
+
 /// Boost.Python gives the module also where its body has failed, which the interpreter takes for a fault of its own.
 inline PyObject* initModule(PyModuleDef& definition, void (*body)())
 {
@@ -42,6 +48,11 @@ constexpr int importLevel = -1;
 inline PyObject* stringFromStringAndSize(char const* text, Py_ssize_t size)
 {
     return PyString_FromStringAndSize(text, size);
+}
+
+inline PyObject* pathFromStringAndSize(char const* path, Py_ssize_t size)
+{
+    return PyString_FromStringAndSize(path, size);
 }
 
 inline PyObject* dictGetItem(PyObject* dictionary, PyObject* key)

@@ -2,11 +2,25 @@
 
 #include "pyConvenienceFunctions.h"
 
+#include "appUi/brBrowserFloatingHandler.h"
+#include "appUi/uiAppDisabler.h"
+#include "appUi/uiAppMgr.h"
+#include "base/inBuildInfoUtil.h"
+#include "base/oPtr.h"
+#include "base/vector.h"
+#include "gfx/wsCursorRegistry.h"
+#include "internalAPI/piBrowserSchemes.h"
+#include "pyCompat.h"
+#include "pyUiError.h"
 #include "pyUtils.h"
 #include "pyWidgetListGenerator.h"
+#include "resmgt/osFsUtils.h"
+#include "ui/uiApplication.h"
 #include "ui/uiConstraint.h"
+#include "ui/uiCursorGuard.h"
 
 #include <algorithm>
+#include <memory>
 
 namespace bp = boost::python;
 
@@ -50,6 +64,82 @@ RCShdPtr<Dialog> makeDialog(std::string const& title, std::string const& xmlStri
     RCShdPtr<Dialog> dialog = makeDialog(title, xmlString, width, height);
     dialog->setValues(initialValues, false);
     return dialog;
+}
+
+bp::object toPyPath(std::string const& path)
+{
+    return bp::object(bp::handle<>(PyCompat::pathFromStringAndSize(path.data(), static_cast<Py_ssize_t>(path.size()))));
+}
+
+/// One run of the application's browser, for picking a path.
+class PyBrowser
+{
+public:
+    PyBrowser(std::string const& title, OsFilePath const& initialPath, bp::object const& pathValidationCb);
+
+    /// OK was pressed.
+    void onActivate(EvEvent&);
+
+    BrBrowserFloatingHandler& getHandler() const { return *_handler; }
+
+    /// What was picked; empty if nothing was.
+    OsFilePath const& getPath() const { return _path; }
+
+private:
+    void configure() const;
+    OsFilePath validate(std::string const& focusPath, std::string const& currentPath) const;
+
+    OPtr<BrBrowserFloatingHandler> _handler;
+    RCShdPtr<BrBrowser> _browser;
+    UiEventCallback<PyBrowser> _activateCb;
+    bp::object _pathValidationCb;
+    OsFilePath _path;
+};
+
+PyBrowser::PyBrowser(std::string const& title, OsFilePath const& initialPath, bp::object const& pathValidationCb)
+    : _activateCb(this, &PyBrowser::onActivate), _pathValidationCb(pathValidationCb)
+{
+    Vector<LiString> const schemes{PiBrowserSchemes::FsScheme};
+    UiAppMgr const& appMgr = UiAppMgr::getInstance();
+    _handler = std::make_unique<BrBrowserFloatingHandler>(appMgr.getMainWindow()->getRootContainer(), title.c_str(),
+                                                          appMgr.getSelection(), schemes, "", Bookmarkable(1));
+    _browser = _handler->getBrowser();
+    configure();
+    if (OsFsUtils::fileExists(initialPath))
+        static_cast<void>(_browser->setURL(initialPath.toString(), HistoryEnum(0), UpdateEnum(0)));
+    _handler->setActivateCb(&_activateCb);
+}
+
+void PyBrowser::configure() const
+{
+    _browser->setFolderOption(PaneEnum(0));
+    _browser->setViewType(BrTypes::ViewType(0));
+    _browser->setSequencesCollapsed(true);
+    _browser->setCompositionsCollapsed(false);
+    _browser->setDontLoadCompositions(true);
+}
+
+void PyBrowser::onActivate(EvEvent&)
+{
+    std::string const focusPath = _browser->getInputFocusPath().toString();
+    std::string const currentPath = _browser->getPath().toString();
+    if (_pathValidationCb.is_none() || !PyCallable_Check(_pathValidationCb.ptr()))
+        _path = OsFilePath(focusPath.empty() ? currentPath : focusPath);
+    else
+        _path = validate(focusPath, currentPath);
+    if (!_path.isEmpty())
+        _handler->hide();
+}
+
+OsFilePath PyBrowser::validate(std::string const& focusPath, std::string const& currentPath) const
+{
+    bp::object const focus = toPyPath(focusPath);
+    bp::object const current = toPyPath(currentPath);
+    bp::handle<> const result(
+        bp::allow_null(PyObject_CallFunction(_pathValidationCb.ptr(), "(OO)", focus.ptr(), current.ptr())));
+    if (!result)
+        bp::throw_error_already_set();
+    return bp::extract<OsFilePath>(bp::object(result));
 }
 
 } // namespace
@@ -106,6 +196,23 @@ std::string showMessageBox(std::string const& title, bp::list const& messages, b
 std::string makeXmlFromWidgetList(bp::list const& widgets, bp::list const& closeButtons)
 {
     return WidgetListGenerator(widgets, closeButtons).generate();
+}
+
+OsFilePath showBrowser(std::string const& title, OsFilePath const& initialPath, bp::object const& pathValidationCb)
+{
+    if (InBuildInfoUtil::getApplicationMode() == ApplicationModes(1))
+        throw UiError(__FILE__, __LINE__, "ui.showBrowser() can only be used within Velmora.");
+    PyBrowser const browser(title, initialPath, pathValidationCb);
+    BrBrowserFloatingHandler& handler = browser.getHandler();
+    UiAppDisabler const disabler;
+    RCShdPtr<UiMoveContainer> const container = handler.getContainer();
+    container->getParent()->front(container);
+    handler.show();
+    {
+        UiCursorGuard const cursor(WsCursorRegistry::Normal);
+        UiApplication::getInstance()->localMessageLoop(handler.isClosedConst(), handler.isClosed());
+    }
+    return browser.getPath();
 }
 
 } // namespace Kv::PyextUi

@@ -119,6 +119,31 @@ No callback runs for them. Defaults to {}.
 @raise IndexError: If the tuple of an initial value for a menu is too short.
 @raise RuntimeError: If the description is faulty; the words name the line.)";
 
+constexpr char const* showBrowser =
+    R"(Shows the file browser of Velmora for picking a path, and blocks until it is closed. It only works within Velmora.
+Example::
+
+    def isImage( focusPath, currentPath ):
+        return focusPath if focusPath.endswith( '.exr' ) else ''
+
+    path = ui.showBrowser( 'Pick an image', '/shots', isImage )
+
+@param title: The title of the browser.
+@type title: C{str}
+@param initialPath: The path that the browser goes to first: a directory, or a file, which then is in focus. One that
+does not exist leaves the browser at the root of the file system. Defaults to "".
+@type initialPath: C{str}
+@param pathValidationCb: A callable that is called each time that the user presses OK, with the path in focus, which is
+empty if nothing is selected, and the path of the current directory. It returns the path to give back, whatever that is,
+or an empty C{str}, which keeps the browser open. Without it, and where it cannot be called, the path in focus is given
+back, or the current directory if nothing is in focus. Defaults to C{None}.
+@type pathValidationCb: callable
+@return: The path, or an empty C{str} if the user has pressed Cancel. Of a sequence of files shown as one entry, it is
+that of the first file.
+@rtype: C{str}
+@raise UiError: If it is not used within Velmora.
+@raise ValueError: If a path holds a zero byte.)";
+
 constexpr char const* dialog =
     R"(A dialog, whose widgets can be filled, read, and heard of. There is no public constructor: L{createDialog} is the only
 way to get hold of a C{Dialog}.

@@ -108,6 +108,7 @@ BOOST_PYTHON_FUNCTION_OVERLOADS(showDialogOverloads, showDialog, 2, 5)
 BOOST_PYTHON_FUNCTION_OVERLOADS(showSimpleDialogOverloads, showSimpleDialog, 3, 5)
 BOOST_PYTHON_FUNCTION_OVERLOADS(showMessageBoxOverloads, showMessageBox, 2, 3)
 BOOST_PYTHON_FUNCTION_OVERLOADS(makeXmlOverloads, makeXmlFromWidgetList, 1, 2)
+BOOST_PYTHON_FUNCTION_OVERLOADS(showBrowserOverloads, showBrowser, 1, 3)
 
 void instantiateAppMgr()
 {
@@ -149,6 +150,8 @@ void defineFunctions()
     bp::def("createDialog", &createDialog,
             createDialogOverloads((positional(), positional(), arg("width"), arg("height"), arg("initialValues")),
                                   Docs::createDialog));
+    bp::def("showBrowser", &showBrowser,
+            showBrowserOverloads((arg("title"), arg("initialPath"), arg("pathValidationCb")), Docs::showBrowser));
 }
 
 void registerEventType()

@@ -1,0 +1,231 @@
+#include "appUi/brBrowser.h"
+
+#include "appUi/brBrowsable.h"
+#include "appUi/uiView.h"
+#include "base/exBase.h"
+#include "native/ntPlatform.h"
+#include "resmgt/osPlace.h"
+#include "ui/uiContainer.h"
+
+#include <filesystem>
+#include <system_error>
+#include <utility>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// True also for a link that leads nowhere.
+bool isThere(std::string const& path)
+{
+    std::error_code error;
+    return std::filesystem::exists(std::filesystem::symlink_status(path, error));
+}
+
+} // namespace
+
+/// Client data outlives the widget where somebody holds it, and then has no selection.
+class BrBrowser::View : public UiView
+{
+public:
+    explicit View(BrBrowser const& browser) : _browser(&browser) {}
+
+    void close() { _browser = nullptr; }
+
+    RCShdPtr<SnSelection> getSelection() override { return _browser ? _browser->makeSelection() : nullptr; }
+
+private:
+    BrBrowser const* _browser;
+};
+
+BrBrowser::BrBrowser(std::string name) : UiWidget(std::move(name)), _view(makeShd<View>(*this))
+{
+    addClientData(_view);
+}
+
+BrBrowser::~BrBrowser()
+{
+    _view->close();
+}
+
+RCShdPtr<BrBrowser> BrBrowser::create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*)
+{
+    RCShdPtr<BrBrowser> browser(new BrBrowser(name));
+    parent->addChild(browser);
+    return browser;
+}
+
+bool BrBrowser::isComposition(std::string const& name)
+{
+    return std::filesystem::path(name).extension() == ".vmcomposition";
+}
+
+RttiType const& BrBrowser::getClassType()
+{
+    return RttiGenType1<BrBrowser, UiWidget>::getInstance();
+}
+
+RttiType const& BrBrowser::getRttiType() const
+{
+    return getClassType();
+}
+
+void BrBrowser::setFolderOption(PaneEnum) {}
+
+void BrBrowser::setViewType(BrTypes::ViewType) {}
+
+void BrBrowser::setSequencesCollapsed(bool collapsed)
+{
+    requireUiThread();
+    _sequencesCollapsed = collapsed;
+    showCollapsing();
+}
+
+void BrBrowser::setCompositionsCollapsed(bool collapsed)
+{
+    requireUiThread();
+    _compositionsCollapsed = collapsed;
+    showCollapsing();
+}
+
+void BrBrowser::setDontLoadCompositions(bool dontLoad)
+{
+    requireUiThread();
+    _dontLoadCompositions = dontLoad;
+}
+
+void BrBrowser::setLoadCb(CbHandler<EvEvent>* handler)
+{
+    requireUiThread();
+    _loadCb = handler;
+}
+
+void BrBrowser::setMultiple(bool multiple)
+{
+    requireUiThread();
+    _multiple = multiple;
+    if (_native)
+        _native->setMultiple(multiple);
+}
+
+bool BrBrowser::setURL(LiString const& url, HistoryEnum, UpdateEnum)
+{
+    requireUiThread();
+    OsPlace place;
+    try
+    {
+        place = OsPlace::find(url.toString(), "");
+    }
+    catch (ExBase const&)
+    {
+        return false;
+    }
+    onDirectoryChanged(place.directory);
+    if (!place.name.empty())
+        onSelectionChanged(place.name, {place.name});
+    if (_native)
+        _native->goTo(_directory, _focus, _selected);
+    return true;
+}
+
+void BrBrowser::select(RCShdPtr<SnSelection> const& selection)
+{
+    requireUiThread();
+    if (!selection)
+        return;
+    using Convert = SnItemConvert<RCShdPtr<BrBrowsable>>;
+    RCShdPtr<const SnSelection> const browsables = selection->filter(Convert::getPredicate());
+    std::vector<std::string> names;
+    for (RCShdPtr<const SnItem> const& item : *browsables)
+    {
+        std::filesystem::path const path = Convert::get(item)->getPath().toString();
+        if (path.parent_path() == _directory && path.has_filename())
+            names.push_back(path.filename());
+    }
+    if (names.empty())
+        return;
+    if (!_multiple)
+        names.resize(1);
+    onSelectionChanged(names.front(), names);
+    if (_native)
+        _native->goTo(_directory, _focus, _selected);
+}
+
+LiString BrBrowser::getInputFocusPath() const
+{
+    std::string const path = OsPlace::join(_directory, _focus);
+    return _focus.empty() || !isThere(path) ? LiString() : LiString(path);
+}
+
+LiString BrBrowser::getPath() const
+{
+    return _directory;
+}
+
+bool BrBrowser::takeTypedPath()
+{
+    RCShdPtr<BrBrowser> const self(this);
+    requireUiThread();
+    return !_native || _native->takeTypedPath();
+}
+
+std::unique_ptr<NtPeer> BrBrowser::createPeer(NtPlatform& platform, NtContainer& parent)
+{
+    std::unique_ptr<NtBrowser> peer = platform.createBrowser(parent, getName(), *this);
+    _native = peer.get();
+    showCollapsing();
+    _native->setMultiple(_multiple);
+    _native->goTo(_directory, _focus, _selected);
+    return peer;
+}
+
+void BrBrowser::dropPeer()
+{
+    _native = nullptr;
+    UiWidget::dropPeer();
+}
+
+void BrBrowser::onDirectoryChanged(std::string const& directory)
+{
+    _directory = directory;
+    _focus.clear();
+    _selected.clear();
+}
+
+void BrBrowser::onSelectionChanged(std::string const& focus, std::vector<std::string> const& selected)
+{
+    _focus = focus;
+    _selected = selected;
+}
+
+void BrBrowser::onActivated()
+{
+    RCShdPtr<BrBrowser> const self(this);
+    if (!takesInput())
+        return;
+    EvEvent event(PiWidget::Activate);
+    if (_loadCb && !_dontLoadCompositions && isComposition(_focus))
+        _loadCb->call(event);
+    else
+        fire(PiWidget::Activate);
+}
+
+void BrBrowser::showCollapsing()
+{
+    if (_native)
+        _native->setCollapsing([sequences = _sequencesCollapsed, compositions = _compositionsCollapsed](
+                                   std::string const& name) { return isComposition(name) ? compositions : sequences; });
+}
+
+RCShdPtr<SnSelection> BrBrowser::makeSelection() const
+{
+    SnSelection::Items items;
+    for (std::string const& name : _selected)
+        if (std::string const path = OsPlace::join(_directory, name); isThere(path))
+            items.push_back(makeShd<BrBrowsableItem>(makeShd<BrBrowsable>(path)));
+    return makeShd<SnSelection>(std::move(items));
+}
+
+} // namespace Kv

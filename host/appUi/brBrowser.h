@@ -1,0 +1,106 @@
+#pragma once
+
+#include "appUi/brTypes.h"
+#include "appUi/kvAppUiExport.h"
+#include "base/cbHandler.h"
+#include "internalAPI/snSelection.h"
+#include "native/ntPeers.h"
+#include "resmgt/liString.h"
+#include "ui/uiWidget.h"
+
+#include <string>
+#include <vector>
+
+namespace Kv
+{
+
+/// Shows a directory of the file system and what is selected in it, first the root. The user goes from one directory to
+/// another in it. It raises `Activate` when the user presses Enter on a file or clicks it twice. Among its client data
+/// is a `UiView`, whose selection are the selected entries that still exist, as `BrBrowsable`.
+///
+/// Paths are bytes of the file system, absolute, and those of a collapsed sequence are that of its first file. All of
+/// it works without a window too: directory, focus and selection are the widget's own.
+class KVAPPUI_API BrBrowser : public UiWidget, private NtBrowserListener
+{
+public:
+    /// A browser at the end of `parent`. There are no resource tables for it: pass null.
+    static RCShdPtr<BrBrowser> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
+
+    /// True for the name of a file that is a composition, which it is by its extension.
+    static bool isComposition(std::string const& name);
+
+    ~BrBrowser() override;
+
+    static RttiType const& getClassType();
+    RttiType const& getRttiType() const override;
+
+    /// Where folders are shown.
+    void setFolderOption(PaneEnum);
+
+    /// How entries are shown.
+    void setViewType(BrTypes::ViewType);
+
+    /// Whether numbered files, as "frame.0001.exr" and those after it, are one entry; at first they are.
+    void setSequencesCollapsed(bool collapsed);
+
+    /// The same for numbered compositions, which are never part of another sequence; at first each is an entry.
+    void setCompositionsCollapsed(bool collapsed);
+
+    /// Whether a composition that the user activates is a file like any other. Where it is not, as at first, the
+    /// handler of `setLoadCb` runs for it, if there is one, and `Activate` is not raised.
+    void setDontLoadCompositions(bool dontLoad);
+
+    /// `handler`, borrowed, loads the composition in focus. Null takes it away.
+    void setLoadCb(CbHandler<EvEvent>* handler);
+
+    /// Whether more than one entry can be selected; at first only one can.
+    void setMultiple(bool multiple);
+
+    /// Goes to a directory, or to that of a file, which then is in focus. `url` is a path; one that is relative begins
+    /// in the current directory of the process. False, with everything as it was, if nothing is there.
+    bool setURL(LiString const& url, HistoryEnum, UpdateEnum);
+
+    /// Selects the browsables of the selection that are in the current directory. Where none is, or the selection is
+    /// null, all stays as it was.
+    void select(RCShdPtr<SnSelection> const& selection);
+
+    /// The path of the entry that has the keyboard in it; empty if none is selected, or it is gone.
+    LiString getInputFocusPath() const;
+
+    /// The current directory.
+    LiString getPath() const;
+
+    /// Goes where the user has typed in its field without pressing Enter. False, which the user is told, if nothing is
+    /// there.
+    bool takeTypedPath();
+
+protected:
+    explicit BrBrowser(std::string name);
+
+    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
+
+private:
+    class View;
+
+    void dropPeer() override;
+    void onDirectoryChanged(std::string const& directory) override;
+    void onSelectionChanged(std::string const& focus, std::vector<std::string> const& selected) override;
+    void onActivated() override;
+
+    void showCollapsing();
+    RCShdPtr<SnSelection> makeSelection() const;
+
+    std::string _directory = "/";
+    /// Names of entries of the directory.
+    std::string _focus;
+    std::vector<std::string> _selected;
+    bool _sequencesCollapsed = true;
+    bool _compositionsCollapsed = false;
+    bool _dontLoadCompositions = false;
+    bool _multiple = false;
+    CbHandler<EvEvent>* _loadCb = nullptr;
+    RCShdPtr<View> _view;
+    NtBrowser* _native = nullptr;
+};
+
+} // namespace Kv

@@ -1,0 +1,117 @@
+#pragma once
+
+#include "native/ntPeers.h"
+#include "native/qtListenerHandle.h"
+
+#include <QLabel>
+#include <QTimer>
+#include <QToolButton>
+#include <QWidget>
+
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace Kv
+{
+
+class BrowserList;
+class DirModel;
+class PathField;
+
+/// The toolkit's side of a browser: a field with the path, the list of the entries, and a line that says what went
+/// wrong. While it is visible it follows what becomes of the directory.
+class BrowserPane final : public QWidget
+{
+public:
+    /// Entries by their names: the one that has the keyboard, empty for none, and all that are selected, from top to
+    /// bottom.
+    struct Choice
+    {
+        std::string focus;
+        std::vector<std::string> selected;
+
+        friend bool operator==(Choice const& a, Choice const& b)
+        {
+            return a.focus == b.focus && a.selected == b.selected;
+        }
+    };
+
+    /// The widgets in it are named after it.
+    BrowserPane(QWidget* parent, std::string const& name, QtListenerHandle<NtBrowserListener> const& handle);
+
+    /// Shows a directory, an absolute path, and selects what is in it of a choice. The listener hears nothing.
+    void goTo(std::string const& directory, Choice const& choice);
+
+    void setCollapsing(std::function<bool(std::string const&)> collapses);
+    void setMultiple(bool multiple);
+
+    /// Goes where the user has typed, and tells the listener. False if nothing is there, which the user is told.
+    bool takeTypedPath();
+
+protected:
+    void showEvent(QShowEvent* event) override;
+    void hideEvent(QHideEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+
+private:
+    /// Where the list was before its rows were replaced.
+    struct View
+    {
+        /// The row that the keyboard was on, selected or not.
+        std::string current;
+        /// The uppermost row in sight, and how far it was out of sight.
+        std::string top;
+        int offset = 0;
+        int scroll = 0;
+    };
+
+    void makeNames(QString const& name);
+    void layOut();
+
+    void activate();
+    void goUp();
+    void walkTo(std::string const& directory, Choice const& choice);
+    void toggleHidden();
+    void look();
+    void leave(std::string const& reason);
+
+    void keepView();
+    void onRead();
+    void choose();
+    void restoreView();
+    Choice getChoice() const;
+    void onChosen();
+    /// The user has turned to the list: what stands in the field counts no more.
+    void forgetTyped();
+    void tellChoice();
+    void say(std::string const& words);
+    void showState();
+
+    QtListenerHandle<NtBrowserListener> _handle;
+    std::string _directory;
+
+    /// What is to be selected once the rows are there, and where the list is to stand then.
+    Choice _wanted;
+    View _wantedView;
+    bool _arriving = false;
+    bool _replaced = false;
+
+    /// What the listener knows.
+    Choice _told;
+    bool _choosing = false;
+
+    /// What the user did in vain, or what happened to the directory.
+    std::string _notice;
+
+    // Owned by this one natively.
+    QToolButton* _up;
+    PathField* _path;
+    DirModel* _model;
+    BrowserList* _list;
+    QLabel* _message;
+    QTimer _looking;
+    QTimer _patience;
+};
+
+} // namespace Kv

@@ -1,0 +1,47 @@
+#include "native/qtBrowser.h"
+
+#include <utility>
+
+namespace Kv
+{
+
+QtBrowser::QtBrowser(QWidget* parent, std::string const& name, NtBrowserListener& listener)
+    : QtBrowser(parent, name, QtListenerHandle<NtBrowserListener>(listener))
+{
+}
+
+QtBrowser::QtBrowser(QWidget* parent, std::string const& name, QtListenerHandle<NtBrowserListener> const& handle)
+    : QtPeer(makeNative<BrowserPane>(parent, name, handle), name, 0), _handle(handle)
+{
+}
+
+QtBrowser::~QtBrowser()
+{
+    _handle.close();
+}
+
+void QtBrowser::goTo(std::string const& directory, std::string const& focus, std::vector<std::string> const& selected)
+{
+    if (BrowserPane* const pane = getNative())
+        pane->goTo(directory, {focus, selected});
+}
+
+void QtBrowser::setCollapsing(std::function<bool(std::string const&)> collapses)
+{
+    if (BrowserPane* const pane = getNative())
+        pane->setCollapsing(std::move(collapses));
+}
+
+void QtBrowser::setMultiple(bool multiple)
+{
+    if (BrowserPane* const pane = getNative())
+        pane->setMultiple(multiple);
+}
+
+bool QtBrowser::takeTypedPath()
+{
+    BrowserPane* const pane = getNative();
+    return !pane || pane->takeTypedPath();
+}
+
+} // namespace Kv

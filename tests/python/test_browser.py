@@ -1,0 +1,176 @@
+"""Scripts ask the user for a path, and the user walks through the files to it."""
+
+import os
+
+import pytest
+
+from quorvane_velmora import ui
+from PyQt6.QtCore import Qt
+from PyQt6.QtWidgets import QApplication, QLabel, QLineEdit, QTreeView
+
+
+@pytest.mark.standalone
+@pytest.mark.parametrize('arguments, keywords', [(['t'], {}), (['t', '/', len], {}), ([], {'title': 't'}), (
+    ['t'], {'initialPath': b'/\xff', 'pathValidationCb': 5})])
+def test_outside_the_application_it_is_refused_whatever_the_arguments(arguments, keywords):
+    with pytest.raises(ui.UiError) as refused:
+        ui.showBrowser(*arguments, **keywords)
+    assert str(refused.value) == 'ui.showBrowser() can only be used within Velmora.'
+
+
+@pytest.mark.parametrize('path, failure', [(None, TypeError), (5, TypeError), ('a\0b', ValueError)])
+def test_what_is_no_path_is_refused(path, failure):
+    with pytest.raises(failure):
+        ui.showBrowser('t', path)
+
+
+@pytest.fixture
+def files(tmp_path):
+    """A folder with a folder and files in it, one of which has a name that is no text."""
+    (tmp_path / 'sub').mkdir()
+    for name in b'frame.0001.exr', b'frame.0002.exr', b'frame.0003.exr', b'notes.txt', b'\xff.txt':
+        with open(os.path.join(os.fsencode(tmp_path), name), 'w'):
+            pass
+    return str(tmp_path)
+
+
+def rows(user):
+    model = user.find('Browser.list', QTreeView).model()
+    return [model.index(row, 0).data() for row in range(model.rowCount())]
+
+
+def read(user):
+    """The listing, once it is there."""
+    while not rows(user):
+        QApplication.processEvents()
+    return rows(user)
+
+
+def browse(user, *steps, title='Pick', **keywords):
+    user.plan(read, *steps)
+    return ui.showBrowser(title, **keywords)
+
+
+def ok(user):
+    user.click('OK')
+
+
+def cancel(user):
+    user.click('Cancel')
+
+
+def enter(text):
+    def typed(user):
+        user.press(Qt.Key.Key_L, Qt.KeyboardModifier.ControlModifier)
+        user.type(text)
+    return typed
+
+
+def pick(text, then=None):
+    """Types ahead in the list."""
+    def picked(user):
+        read(user)
+        user.type(text)
+        if then:
+            user.press(then)
+    return picked
+
+
+def last(user):
+    """Selects the file at the end, whose name cannot be typed."""
+    read(user)
+    user.find('Browser.list').setFocus()
+    user.press(Qt.Key.Key_End)
+
+
+@pytest.mark.inside
+def test_it_floats_with_its_title_shows_sequences_as_one_and_has_the_keyboard_in_the_list(user, files):
+    seen = []
+
+    def look(user):
+        seen.extend([user.title(), user.focus(), rows(user)])
+
+    assert browse(user, look, ok, title='A <title>', initialPath=files) == files
+    assert seen == ['A <title>', 'Browser.list', ['sub', 'frame.####.exr  1-3', 'notes.txt', '\ufffd.txt']]
+
+
+@pytest.mark.inside
+@pytest.mark.parametrize('steps, path', [
+    ([ok], ''), ([pick('notes'), ok], 'notes.txt'), ([pick('frame', Qt.Key.Key_Return)], 'frame.0001.exr'),
+    ([last, ok], '\udcff.txt'), ([pick('sub'), ok], 'sub'), ([pick('sub', Qt.Key.Key_Return), ok], 'sub'),
+    ([enter('notes.txt'), ok], 'notes.txt'), ([enter('sub'), ok], 'sub'),
+])
+def test_ok_gives_what_is_in_focus_else_the_directory(user, files, steps, path):
+    assert browse(user, *steps, initialPath=files) == os.path.join(files, path).rstrip('/')
+
+
+@pytest.mark.inside
+def test_it_begins_at_the_path_if_there_is_one_else_at_the_root(user, files):
+    assert browse(user, ok, initialPath=files + '/frame.0002.exr') == files + '/frame.0002.exr'
+    assert browse(user, ok, initialPath=files + '/nothing') == '/'
+    assert browse(user, ok) == '/'
+
+
+@pytest.mark.inside
+@pytest.mark.parametrize('end', [cancel, lambda user: user.press(Qt.Key.Key_Escape)])
+def test_cancel_gives_nothing_and_asks_nobody(user, files, end):
+    calls = []
+
+    def refuse(*paths):
+        calls.append(paths)
+        return ''
+
+    assert browse(user, pick('notes'), end, initialPath=files, pathValidationCb=refuse) == '' and not calls
+    assert browse(user, ok, end, initialPath=files, pathValidationCb=refuse) == '' and len(calls) == 1
+
+
+@pytest.mark.inside
+def test_a_path_that_is_refused_keeps_it_open_and_one_that_is_given_comes_back_as_it_is(user, files):
+    calls = []
+
+    def validate(*paths):
+        calls.append(paths)
+        return '' if len(calls) == 1 else '/no/such \udcff'
+
+    assert browse(user, ok, last, ok, initialPath=files, pathValidationCb=validate) == '/no/such \udcff'
+    assert calls == [('', files), (files + '/\udcff.txt', files)]
+    assert all(browse(user, ok, initialPath=files, pathValidationCb=no) == files for no in (5, 'text'))
+
+
+@pytest.mark.inside
+def test_what_the_callback_does_wrong_comes_out_and_leaves_nothing_behind(user, files):
+    def fail(*_):
+        raise KeyError('mine')
+
+    with pytest.raises(KeyError, match='mine'):
+        browse(user, ok, initialPath=files, pathValidationCb=fail)
+    with pytest.raises(TypeError):
+        browse(user, ok, initialPath=files, pathValidationCb=lambda *_: 5)
+    assert user.window() is None and browse(user, ok, initialPath=files) == files
+
+
+@pytest.mark.inside
+def test_a_callback_can_open_a_browser_and_a_dialog_of_its_own(user, files):
+    def ask(*_):
+        with user.meanwhile(lambda inner: inner.close()):
+            ui.showMessageBox('Sure?', ['?'])
+        with user.meanwhile(read, pick('notes', Qt.Key.Key_Return)):
+            return ui.showBrowser('Inner', files)
+
+    assert browse(user, ok, initialPath='/', pathValidationCb=ask) == files + '/notes.txt'
+
+
+@pytest.mark.inside
+def test_a_typed_path_that_leads_nowhere_is_told_and_given_to_nobody(user, files):
+    told, calls = [], []
+
+    def look(user):
+        told.append(user.find('Browser.message', QLabel).text().replace('\u200b', ''))
+        told.append(user.find('Browser.path', QLineEdit).text())
+
+    def validate(*paths):
+        calls.append(paths)
+        return 'x'
+
+    assert browse(user, enter('nothing'), ok, look, cancel, initialPath=files, pathValidationCb=validate) == ''
+    assert told == ["There is no '%s/nothing'" % files, 'nothing'] and not calls
