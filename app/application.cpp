@@ -1,6 +1,7 @@
 #include "application.h"
 
 #include "buildInfo.h"
+#include "pathQuestion.h"
 
 #include "appUi/uiAppMgr.h"
 #include "base/exBase.h"
@@ -8,11 +9,11 @@
 #include "gfx/wsNative.h"
 
 #include <QApplication>
-#include <QFileDialog>
 #include <QFileInfo>
 #include <QMessageBox>
 
 #include <algorithm>
+#include <filesystem>
 #include <sstream>
 #include <utility>
 
@@ -31,9 +32,25 @@ QString toText(std::string const& bytes)
     return QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()));
 }
 
+Kv::UiConstraint makeFilling()
+{
+    using Kv::UiConstraint;
+    auto const edge = [](UiConstraint::Target target) { return UiConstraint::Edge{0, UiConstraint::Pixels, target, {}}; };
+    return UiConstraint({edge(UiConstraint::ParentLow), edge(UiConstraint::ParentLow), edge(UiConstraint::ParentHigh),
+                         edge(UiConstraint::ParentHigh)});
+}
+
+Kv::RCShdPtr<Kv::UiView> findView(Kv::UiWidget const& widget)
+{
+    for (int i = 0; i < widget.getClientDataListSize(); ++i)
+        if (Kv::RCShdPtr<Kv::UiView> const view = Kv::dynamicCast<Kv::UiView>(widget.getClientDataListPtr()[i]))
+            return view;
+    return nullptr;
+}
+
 } // namespace
 
-Application::Application() : _window(makeCommands())
+Application::Application() : _window(makeCommands()), _loadCb(this, &Application::loadFocused)
 {
     makeHost();
     QObject::connect(&_signalTimer, &QTimer::timeout, &_window, [this] { checkSignals(); });
@@ -57,6 +74,7 @@ void Application::openComposition(std::string const& path)
 int Application::run(std::optional<ScriptCall> const& script, bool exit)
 {
     _hostWindow->show();
+    _hostWindow->getRootContainer()->setFocusWidget(_browser);
     if (script)
         QTimer::singleShot(0, &_window,
                            [this, script = *script, exit]
@@ -93,10 +111,18 @@ void Application::makeHost()
                                        [this](bool enabled) { _window.setOwnEnabled(enabled); });
     RCShdPtr<UiContainer> const root = _hostWindow->getRootContainer();
     _panel = UiPanel::create(root, "mainPanel", NtForeignWidget{_window.getPanel()});
+    RCShdPtr<UiPanel> const place =
+        UiPanel::create(root, "browserPanel", NtForeignWidget{_window.getBrowserPlace()});
+    _browser = BrBrowser::create(place, "Browser", nullptr);
+    _browser->setConstraint(makeFilling());
+    _browser->setMultiple(true);
+    _browser->setLoadCb(&_loadCb);
+    _browser->setKeyboardFocusable(true);
+    _browser->setURL(std::filesystem::current_path().string(), HistoryEnum(0), UpdateEnum(0));
     _workspace = makeShd<UiCompositionWorkspace>([this] { return _hostWindow->findKeyboardHolder(); });
     _workspace->setListener(this);
     UiWorkspace::setCurrentWorkspace(_workspace);
-    UiAppMgr::getInstance().setApplication(_hostWindow, _panel, nullptr);
+    UiAppMgr::getInstance().setApplication(_hostWindow, _panel, findView(*_browser));
 }
 
 void Application::startScript(ScriptCall const& script)
@@ -142,7 +168,17 @@ void Application::checkSignals()
 
 std::string Application::askPath(QString const& title)
 {
-    return QFileDialog::getOpenFileName(&_window, title).toStdString();
+    std::string path;
+    auto const ask = [&]
+    { path = PathQuestion(title.toUtf8().constData(), _browser->getPath().toString()).ask(); };
+    if (!_interpreter.attempt(ask))
+        QApplication::exit(interruptedStatus);
+    return path;
+}
+
+void Application::loadFocused(Kv::EvEvent&)
+{
+    attempt([this] { openComposition(_browser->getInputFocusPath().toString()); });
 }
 
 void Application::askComposition()

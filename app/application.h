@@ -4,8 +4,10 @@
 #include "interpreter.h"
 #include "mainWindow.h"
 
+#include "appUi/brBrowser.h"
 #include "appUi/uiCompositionWorkspace.h"
 #include "appUi/uiCompositionWorkspaceListener.h"
+#include "ui/uiEventCallback.h"
 #include "ui/uiMainWindow.h"
 #include "ui/uiPanel.h"
 
@@ -42,8 +44,9 @@ private:
     int runScript(ScriptCall const& script);
     void checkSignals();
 
-    /// Asks for a path in a browser above the window; empty if none was chosen.
+    /// Asks for a file; empty if none was chosen.
     std::string askPath(QString const& title);
+    void loadFocused(Kv::EvEvent& event);
     void askComposition();
     void askScript();
     void saveComposition();
@@ -71,6 +74,8 @@ private:
     MainWindow _window;
     Kv::RCShdPtr<Kv::UiMainWindow> _hostWindow;
     Kv::RCShdPtr<Kv::UiPanel> _panel;
+    Kv::RCShdPtr<Kv::BrBrowser> _browser;
+    Kv::UiEventCallback<Application> _loadCb;
     Kv::RCShdPtr<Kv::UiCompositionWorkspace> _workspace;
     QTimer _signalTimer;
     std::optional<ScriptCall> _lastScript;

@@ -231,17 +231,33 @@ int Interpreter::run(ScriptCall const& call)
     return status;
 }
 
-bool Interpreter::isInterrupted()
+bool Interpreter::attempt(std::function<void()> const& action)
 {
     InterpreterHold const hold;
-    if (PyErr_CheckSignals() == 0)
-        return false;
-    bool const interrupted = PyErr_ExceptionMatches(PyExc_KeyboardInterrupt);
-    if (interrupted)
-        PyErr_Clear();
-    else
-        PyErr_PrintEx(0);
-    return interrupted;
+    try
+    {
+        action();
+        return true;
+    }
+    catch (bp::error_already_set const&)
+    {
+        bool const interrupted = PyErr_ExceptionMatches(PyExc_KeyboardInterrupt);
+        if (interrupted)
+            PyErr_Clear();
+        else
+            PyErr_PrintEx(0);
+        return !interrupted;
+    }
+}
+
+bool Interpreter::isInterrupted()
+{
+    return !attempt(
+        []
+        {
+            if (PyErr_CheckSignals() != 0)
+                bp::throw_error_already_set();
+        });
 }
 
 void Interpreter::loadModules()

@@ -2,6 +2,7 @@
 
 #include "commandLine.h"
 
+#include <functional>
 #include <string>
 
 namespace Velmora
@@ -25,6 +26,9 @@ public:
 
     /// The last line of the traceback of the script that ran last; empty if it did not fail.
     std::string const& getFailure() const { return _failure; }
+
+    /// Runs what may run Python on its way. What that raises is printed. False if it was Ctrl-C.
+    bool attempt(std::function<void()> const& action);
 
     /// Runs what is pending for the interpreter. True if that is Ctrl-C.
     bool isInterrupted();

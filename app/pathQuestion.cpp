@@ -1,0 +1,42 @@
+#include "pathQuestion.h"
+
+#include "appUi/uiAppDisabler.h"
+#include "appUi/uiAppMgr.h"
+#include "internalAPI/piBrowserSchemes.h"
+#include "ui/uiApplication.h"
+
+#include <filesystem>
+
+namespace Velmora
+{
+
+PathQuestion::PathQuestion(char const* title, std::string const& place)
+    : _handler(Kv::UiAppMgr::getInstance().getMainWindow()->getRootContainer(), title,
+               Kv::UiAppMgr::getInstance().getSelection(), {Kv::PiBrowserSchemes::FsScheme}, place,
+               Kv::Bookmarkable(1)),
+      _okCb(this, &PathQuestion::onOk)
+{
+    _handler.getBrowser()->setDontLoadCompositions(true);
+    _handler.setActivateCb(&_okCb);
+}
+
+std::string PathQuestion::ask()
+{
+    Kv::UiAppDisabler const disabler;
+    _handler.getContainer()->getParent()->front(_handler.getContainer());
+    _handler.show();
+    Kv::UiApplication::getInstance()->localMessageLoop(_handler.isClosedConst(), _handler.isClosed());
+    return _path;
+}
+
+void PathQuestion::onOk(Kv::EvEvent&)
+{
+    std::string const path = _handler.getBrowser()->getInputFocusPath().toString();
+    std::error_code error;
+    if (path.empty() || std::filesystem::is_directory(path, error))
+        return;
+    _path = path;
+    _handler.hide();
+}
+
+} // namespace Velmora
