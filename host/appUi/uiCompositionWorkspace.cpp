@@ -29,7 +29,7 @@ RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::open(OsFile
     OsFilePath const canonical = path.getCanonical();
     if (auto const known = find(canonical); known != _compositions.end())
     {
-        RCWeakPtr<const PiCompositionGraphInterface> const composition = *known;
+        RCWeakPtr<const PiCompositionGraphInterface> composition = *known;
         setCurrent(*known);
         return composition;
     }

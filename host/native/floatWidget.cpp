@@ -50,7 +50,13 @@ FloatWidget::FloatWidget(QWidget* parent, QtListenerHandle<NtFloatListener> cons
     setAutoFillBackground(true);
     // Of no size of its own: that comes with the content.
     _area->setWidget(new QWidget);
-    connect(qApp, &QApplication::focusChanged, this, [this](QWidget* from, QWidget* to) { onFocusChanged(from, to); });
+    // Who is given the keyboard wants to be seen.
+    connect(qApp, &QApplication::focusChanged, this,
+            [this](QWidget* from, QWidget* to)
+            {
+                if (to && isAncestorOf(to) && !(from && isAncestorOf(from)))
+                    raise();
+            });
     QTimer::singleShot(0, this, [handle] { handle.tell(&NtFloatListener::onFirstTurn); });
 }
 
@@ -88,24 +94,16 @@ void FloatWidget::askIntoView(QWidget const& widget) const
         _handle.tell(&NtFloatListener::onMoveWanted, right, down);
 }
 
-QWidget* FloatWidget::findEarlierHolder() const
+QEvent::Type FloatWidget::getHiddenEvent()
 {
-    QWidget* const holder = _earlierHolder;
-    if (!holder)
-        return nullptr;
-    if (holder->isEnabled() && holder->isVisibleTo(window()))
-        return holder;
-    FloatWidget const* const around = findAround(*holder);
-    return around && around != this ? around->findEarlierHolder() : nullptr;
+    static auto const type = static_cast<QEvent::Type>(QEvent::registerEventType());
+    return type;
 }
 
 void FloatWidget::showEvent(QShowEvent* event)
 {
     QWidget::showEvent(event);
-    if (event->spontaneous())
-        return;
-    noteHolder(window()->focusWidget());
-    if (_area)
+    if (!event->spontaneous() && _area)
         _area->tellRoom();
 }
 
@@ -116,10 +114,8 @@ void FloatWidget::hideEvent(QHideEvent* event)
         return;
     if (_area)
         _area->forgetRoom();
-    if (!holds(window()->focusWidget()))
-        return;
-    if (QWidget* const holder = findEarlierHolder())
-        holder->setFocus(Qt::OtherFocusReason);
+    QEvent hidden(getHiddenEvent());
+    QCoreApplication::sendEvent(window(), &hidden);
 }
 
 void FloatWidget::resizeEvent(QResizeEvent* event)
@@ -146,26 +142,6 @@ void FloatWidget::keyPressEvent(QKeyEvent* event)
 bool FloatWidget::focusNextPrevChild(bool next)
 {
     return QtFocusOrder(*this).step(next);
-}
-
-bool FloatWidget::holds(QWidget const* widget) const
-{
-    return widget && (widget == this || isAncestorOf(widget));
-}
-
-void FloatWidget::noteHolder(QWidget* holder)
-{
-    if (holder && !holds(holder))
-        _earlierHolder = holder;
-}
-
-void FloatWidget::onFocusChanged(QWidget* from, QWidget* to)
-{
-    if (!holds(to) || holds(from))
-        return;
-    if (from && from->window() == window())
-        noteHolder(from);
-    raise();
 }
 
 } // namespace Kv

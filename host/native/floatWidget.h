@@ -5,6 +5,7 @@
 #include "native/qtListenerHandle.h"
 #include "native/qtStage.h"
 
+#include <QEvent>
 #include <QPointer>
 #include <QWidget>
 
@@ -12,7 +13,7 @@ namespace Kv
 {
 
 /// The toolkit's side of a floating container: has a ground and an edge of its own, walks the keyboard through the
-/// widgets in it, passes on Escape, and gives the keyboard back when it is hidden.
+/// widgets in it, passes on Escape, and tells its window when it is hidden.
 class FloatWidget final : public QWidget, public QtStage
 {
 public:
@@ -30,8 +31,8 @@ public:
     /// Asks to be moved so that a widget in it is seen.
     void askIntoView(QWidget const& widget) const;
 
-    /// The widget that had the keyboard before and can have it again; null if there is none.
-    QWidget* findEarlierHolder() const;
+    /// The type of the event that a window gets when a float in it has been hidden.
+    static QEvent::Type getHiddenEvent();
 
 protected:
     void showEvent(QShowEvent* event) override;
@@ -41,16 +42,10 @@ protected:
     bool focusNextPrevChild(bool next) override;
 
 private:
-    bool holds(QWidget const* widget) const;
-    /// Remembers from whom the keyboard comes.
-    void noteHolder(QWidget* holder);
-    void onFocusChanged(QWidget* from, QWidget* to);
-
     QtListenerHandle<NtFloatListener> _handle;
     /// Natively children, which others can delete.
     QPointer<ContentArea> _area;
     QPointer<QWidget> _edge;
-    QPointer<QWidget> _earlierHolder;
 };
 
 } // namespace Kv

@@ -3,8 +3,8 @@
 #include "native/floatWidget.h"
 #include "native/qtInputDrop.h"
 
+#include <QApplication>
 #include <QEvent>
-#include <QGuiApplication>
 
 #include <utility>
 
@@ -16,6 +16,7 @@ QtMainWindow::QtMainWindow(NtForeignWidget window, std::function<void(bool)> ena
 {
     if (QWidget* const native = _content.getNative())
         native->installEventFilter(this);
+    connect(qApp, &QApplication::focusChanged, this, [this](QWidget*, QWidget* to) { onFocusChanged(to); });
 }
 
 QtMainWindow::~QtMainWindow()
@@ -65,23 +66,36 @@ void QtMainWindow::refuseInput()
 void QtMainWindow::admitInput()
 {
     QPointer<QWidget> const holder = _holders.back();
-    _holders.pop_back();
-    if (_content.getNative() && _holders.empty())
+    if (_content.getNative() && _holders.size() == 1)
         _enableOwn(true);
-    if (!holder)
-        return;
-    if (holder->isEnabled() && holder->isVisibleTo(holder->window()))
-        holder->setFocus(Qt::OtherFocusReason);
-    else if (FloatWidget const* const around = FloatWidget::findAround(*holder))
-        if (QWidget* const earlier = around->findEarlierHolder())
-            earlier->setFocus(Qt::OtherFocusReason);
+    _holders.pop_back();
+    giveKeyboard(holder);
 }
 
 bool QtMainWindow::eventFilter(QObject* watched, QEvent* event)
 {
     if (event->type() == QEvent::Resize)
         tellSize();
+    else if (event->type() == FloatWidget::getHiddenEvent())
+        giveKeyboard(static_cast<QWidget*>(watched)->focusWidget());
     return QObject::eventFilter(watched, event);
+}
+
+void QtMainWindow::onFocusChanged(QWidget* to)
+{
+    // While input is refused the toolkit moves the keyboard on its own.
+    if (to && _holders.empty() && to->window() == _content.getNative() && !FloatWidget::findAround(*to))
+        _home = to;
+}
+
+void QtMainWindow::giveKeyboard(QWidget* holder) const
+{
+    for (QWidget* const candidate : {holder, _home.data()})
+        if (candidate && candidate->isEnabled() && candidate->isVisibleTo(candidate->window()))
+        {
+            candidate->setFocus(Qt::OtherFocusReason);
+            return;
+        }
 }
 
 void QtMainWindow::tellSize() const

@@ -34,10 +34,16 @@ public:
 
 private:
     void tellSize() const;
+    void onFocusChanged(QWidget* to);
+    /// Gives the keyboard to one who can have it.
+    void giveKeyboard(QWidget* holder) const;
 
     QtListenerHandle<NtWindowListener> _handle;
     QtAdoptedContainer _content;
     std::function<void(bool)> _enableOwn;
+
+    /// Who of the application's own had the keyboard last.
+    QPointer<QWidget> _home;
 
     /// Who had the keyboard each time that input was refused.
     std::vector<QPointer<QWidget>> _holders;

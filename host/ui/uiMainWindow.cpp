@@ -96,7 +96,7 @@ void UiMainWindow::blockWidgetsIn(UiContainer const& container) const
         if (auto const* const panel = dynamic_cast<UiPanel const*>(child.get()))
             blockWidgetsIn(*panel);
         else if (auto* const floating = dynamic_cast<UiMoveContainer*>(child.get()))
-            floating->setBlocked(floating->getInputLevel() < _inputLevel);
+            floating->followInputLevel(_inputLevel);
         else
             child->setBlocked(_inputLevel > 0);
     }

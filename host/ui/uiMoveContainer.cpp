@@ -102,6 +102,12 @@ void UiMoveContainer::disarm(EvPointerButtonUpEvent const&)
     _drag.reset();
 }
 
+void UiMoveContainer::followInputLevel(int level)
+{
+    _inputLevel = std::min(_inputLevel, level);
+    setBlocked(_inputLevel < level);
+}
+
 std::unique_ptr<NtPeer> UiMoveContainer::createPeer(NtPlatform& platform, NtContainer& parent)
 {
     std::unique_ptr<NtFloat> peer = platform.createFloat(parent, getName(), *this);

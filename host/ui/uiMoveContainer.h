@@ -40,8 +40,9 @@ public:
     void mmove(EvPointerMoveEvent const& event) override;
     void disarm(EvPointerButtonUpEvent const& event) override;
 
-    /// How many refusals of input were in force in the window when it came to the front last: a later one stops it.
-    int getInputLevel() const { return _inputLevel; }
+    /// Keeps input from it if it came to the front last while fewer than `level` refusals of input were in force.
+    /// Those above `level` are over.
+    void followInputLevel(int level);
 
 protected:
     explicit UiMoveContainer(char const* name);
@@ -78,6 +79,7 @@ private:
     UiEventCallback<UiMoveContainer> _downCb;
     UiEventCallback<UiMoveContainer> _upCb;
     std::optional<Drag> _drag;
+    /// How many refusals of input were in force when it came to the front last, as far as they still are.
     int _inputLevel = 0;
 
     /// What the screen leaves for the content, beside scroll bars, in pixels; unknown while it is on none.

@@ -3,6 +3,11 @@
 #include "base/inBase.h"
 #include "base/inBuildInfoUtil.h"
 #include "base/inLibraryBuildInfo.h"
+#include "internalAPI/inInternalApi.h"
+#include "pluginAPI/inPluginApi.h"
+#include "pyinit/inPyextInit.h"
+#include "resmgt/inResmgt.h"
+#include "scriptingAPI/inScriptingApi.h"
 
 #include <memory>
 
@@ -17,6 +22,11 @@ template <> std::type_info const* InInit<KvInit::pyextGraph>::getType()
 template <> InInit<KvInit::pyextGraph>::InInit() : InPackageInit("pyextGraph")
 {
     registerPackage();
+    addDependency(InInit<KvInit::pyextInit>::getType());
+    addDependency(InInit<KvInit::scriptingAPI>::getType());
+    addDependency(InInit<KvInit::internalAPI>::getType());
+    addDependency(InInit<KvInit::pluginAPI>::getType());
+    addDependency(InInit<KvInit::resmgt>::getType());
     addDependency(InInit<KvInit::base>::getType());
 }
 

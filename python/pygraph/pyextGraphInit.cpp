@@ -1,6 +1,68 @@
 #include <boost/python.hpp>
 
+#include "pygraph/pyGraphError.h"
+#include "pygraph/pyManagedGraph.h"
+#include "pygraph/pyextGraphDocs.h"
+#include "pyinit/pySharedClass.h"
+
+namespace bp = boost::python;
+
+namespace Kv::PyextGraph
+{
+
+namespace
+{
+
+bool isEqual(Graph const& graph, bp::object const& other)
+{
+    bp::extract<Graph const&> const otherGraph(other);
+    return otherGraph.check() && graph.isSameGraph(otherGraph());
+}
+
+bool isUnequal(Graph const& graph, bp::object const& other)
+{
+    return !isEqual(graph, other);
+}
+
+void registerGraph()
+{
+    if (PyextInit::shareClass<Graph>("Graph"))
+        return;
+    bp::class_<Graph, RCShdPtr<ManagedGraph>, boost::noncopyable>("Graph", Docs::graph, bp::no_init)
+        .def("getName", &Graph::getName, Docs::getName)
+        .def("getPath", &Graph::getPath, Docs::getPath)
+        .def("isWritable", &Graph::isWritable, Docs::isWritable)
+        .def("getNodes", &Graph::getNodes, Docs::getNodes)
+        .def("getNodeType", &Graph::getNodeType, Docs::getNodeType)
+        .def("getNodeInputs", &Graph::getNodeInputs, Docs::getNodeInputs)
+        .def("getNodeValues", &Graph::getNodeValues, Docs::getNodeValues)
+        .def("setNodeValue", &Graph::setNodeValue, Docs::setNodeValue)
+        .def("save", &Graph::save, Docs::save)
+        .def("__eq__", &isEqual)
+        .def("__ne__", &isUnequal)
+        .def("__hash__", &Graph::getHash)
+        .def("__repr__", &Graph::describe);
+}
+
+void registerException()
+{
+    GraphError::initialize("graph", "GraphError");
+    bp::register_exception_translator<GraphError>(&GraphError::exceptionTranslator);
+}
+
+void moduleBody()
+{
+    bp::docstring_options const options(true, false, false);
+    registerGraph();
+    registerException();
+    bp::scope().attr("__doc__") = Docs::module;
+}
+
+} // namespace
+
+} // namespace Kv::PyextGraph
+
 BOOST_PYTHON_MODULE(libKVpyextGraph)
 {
-    boost::python::scope().attr("__doc__") = "Quorvane Velmora internal graph extension module.";
+    Kv::PyextGraph::moduleBody();
 }

@@ -18,7 +18,7 @@ def pytest_configure(config):
 
 def pytest_collection_modifyitems(config, items):
     """Each test belongs to both settings unless it is marked as one of a single setting."""
-    other = 'inside' if stage.application() is None else 'standalone'
+    other = 'standalone' if stage.APPLICATION else 'inside'
     left = [item for item in items if item.get_closest_marker(other)]
     items[:] = [item for item in items if item not in left]
     config.hook.pytest_deselected(items=left)

@@ -2,32 +2,36 @@
 
 from PyQt6.QtWidgets import QApplication, QLabel, QWidget
 
+# The application's window; None in an interpreter on its own.
+APPLICATION = next((window for window in QApplication.topLevelWidgets() if window.objectName() == 'Velmora'), None)
 
-def application():
-    """The application's window; None in an interpreter on its own."""
-    return next((window for window in QApplication.topLevelWidgets() if window.objectName() == 'Velmora'), None)
+# What a dialog has above its content, in pixels.
+TITLE_HEIGHT = 25 if APPLICATION else 24
 
-
-# The names that floating containers go by.
+# The names that dialogs and browsers in the application go by.
 FLOATING = ('Whatever', 'BrowserWindow')
+
+
+def floating():
+    return [widget for widget in APPLICATION.findChildren(QWidget)
+            if widget.objectName() in FLOATING and widget.isVisible()]
 
 
 def dialogs():
     """The dialogs on the screen, the uppermost last."""
-    main = application()
-    if main is None:
-        return [window for window in QApplication.topLevelWidgets() if window.isVisible()]
-    return [widget for widget in main.findChildren(QWidget) if widget.objectName() in FLOATING and widget.isVisible()]
+    QApplication.processEvents()  # a dialog that could not be built goes with the next turn
+    if APPLICATION:
+        return floating()
+    return [window for window in QApplication.topLevelWidgets() if window.isVisible()]
 
 
 def active():
     """The dialog that takes input while the rest does not; None if there is none."""
-    main = application()
-    if main is None:
+    if not APPLICATION:
         return QApplication.activeModalWidget()
-    if main.menuBar().isEnabled():
+    if APPLICATION.menuBar().isEnabled():
         return None
-    return next((dialog for dialog in reversed(dialogs()) if dialog.isEnabled()), None)
+    return next((dialog for dialog in reversed(floating()) if dialog.isEnabled()), None)
 
 
 def title_of(dialog):

@@ -2,6 +2,7 @@
 
 import pytest
 
+import stage
 from descriptions import close_button, container
 from quorvane_velmora import ui
 from PyQt6.QtCore import QPoint
@@ -50,7 +51,7 @@ GOOD = '''<?xml version="1.0" encoding="UTF-8"?>
 
 
 def test_a_complete_description_builds_widgets_where_their_siblings_put_them(user):
-    dialog = ui.createDialog('Hand-written', GOOD, 500, 300, {'note': 'hello'})
+    dialog = ui.createDialog('Hand-written', GOOD, 500, 324 - stage.TITLE_HEIGHT, {'note': 'hello'})
     assert dialog.getValues() == {'right': 'two', 'note': 'hello'}
     seen = {}
 

@@ -6,6 +6,7 @@ import traceback
 
 import pytest
 
+import stage
 from callback_tools import listen, make_dialog, no_wait_is_endless, patient  # noqa: F401
 from quorvane_velmora import ui
 from PyQt6.QtCore import QEventLoop, QTimer, Qt
@@ -104,7 +105,7 @@ def test_the_window_of_a_run_that_failed_goes_with_its_dialog(user):
     del dialog
     gc.collect()
     assert set(QApplication.allWidgets()) <= before
-    assert QApplication.activeModalWidget() is None
+    assert stage.active() is None
 
 
 @pytest.mark.parametrize('kept', [True, False], ids=['kept', 'dropped'])
@@ -122,7 +123,7 @@ def test_a_dialog_goes_on_when_it_catches_what_the_run_of_an_inner_one_raised(pa
             inner.clear()
 
     outer.addCallback('Button', ACTIVATE, run_inner)
-    patient.plan(click('Button'), click('Button'), lambda user: seen.append(user.window().windowTitle()),
+    patient.plan(click('Button'), click('Button'), lambda user: seen.append(user.title()),
                  click('Toggle'), close)
     assert outer.launch() == 'CloseButton_OK'
     assert seen == ['of the script', 'outer']
@@ -145,7 +146,7 @@ def test_what_is_not_caught_between_comes_out_of_every_launch_in_turn(patient):
 
 
 def press(name):
-    QTest.mouseClick(QApplication.activeModalWidget().findChild(QPushButton, name), Qt.MouseButton.LeftButton)
+    QTest.mouseClick(stage.active().findChild(QPushButton, name), Qt.MouseButton.LeftButton)
 
 
 def press_in_an_event_of_its_own(name, dispatch):
@@ -159,7 +160,7 @@ DRIVERS = {
     'qWait': lambda name: press_in_an_event_of_its_own(name, lambda: QTest.qWait(20)),
     'event loop': lambda name: press_in_an_event_of_its_own(
         name, lambda: QEventLoop().processEvents(QEventLoop.ProcessEventsFlag.AllEvents)),
-    'click': lambda name: QApplication.activeModalWidget().findChild(QPushButton, name).click(),
+    'click': lambda name: stage.active().findChild(QPushButton, name).click(),
 }
 
 
@@ -245,7 +246,7 @@ def test_with_no_dialog_running_an_exception_is_reported_and_the_process_goes_on
     dialog.addCallback('Button', ACTIVATE, lambda *_: heard.append('heard'))
     dialog.addCallback('Button', ACTIVATE, raising(exception))
     gc.collect()
-    window, = (window for window in QApplication.topLevelWidgets() if window.windowTitle() == title)
+    window, = (window for window in stage.dialogs() if stage.title_of(window) == title)
     for drive in (lambda: QTest.mouseClick(window.findChild(QPushButton, 'Button'), Qt.MouseButton.LeftButton),
                   lambda: window.findChild(QPushButton, 'Button').click()):
         drive()
@@ -270,11 +271,12 @@ def test_the_last_reference_to_a_dialog_with_a_left_window_goes_while_its_other_
     held[0].addCallback(name, ACTIVATE, lambda *_: (heard.append('first'), held.clear()))
     held[0].addCallback(name, ACTIVATE, lambda *_: heard.append('second'))
     gc.collect()
-    window, = (window for window in QApplication.topLevelWidgets() if window.windowTitle() == 'left')
+    window, = (window for window in stage.dialogs() if stage.title_of(window) == 'left')
     QTest.mouseClick(window.findChild(QPushButton, name), Qt.MouseButton.LeftButton)
     assert heard == ['first'] and not held
 
 
+@pytest.mark.standalone
 def test_an_exception_survives_what_others_do_when_the_windows_go(user):
     exception = ValueError('of the script')
     changes = []

@@ -16,13 +16,10 @@ from callback_tools import SAME_SCREEN
 PRELUDE = '''
 import gc, time
 from callback_tools import PatientUser, make_dialog, ui
-from PyQt6.QtWidgets import QApplication
+from stage import titles as visible
 
 def ready(user):
     print('ready', flush=True)
-
-def visible():
-    return [window.windowTitle() for window in QApplication.topLevelWidgets() if window.isVisible()]
 
 def interrupted(launch):
     try:

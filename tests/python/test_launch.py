@@ -7,6 +7,7 @@ import threading
 
 import pytest
 
+import stage
 from descriptions import close_button, container, text, widget
 from quorvane_velmora import ui
 from scripts import run_script
@@ -23,18 +24,15 @@ def make(*close_buttons, widgets=FORM, width=400, height=196):
     return ui.createDialog('Launched', ui.makeXmlFromWidgetList(widgets, list(close_buttons)), width, height)
 
 
-def windows_on_screen():
-    return [window for window in QApplication.topLevelWidgets() if window.isVisible()]
-
-
 def launch(user, dialog, look):
     """What `look` gives while the dialog is open; it is then closed."""
     seen = []
-    user.plan(lambda user: seen.append(look(user)), lambda user: user.window().close())
+    user.plan(lambda user: seen.append(look(user)), lambda user: user.dismiss())
     dialog.launch()
     return seen[0]
 
 
+@pytest.mark.standalone
 @pytest.mark.parametrize('size, content', [
     ({'width': 400, 'height': 300}, (400, 300)), ({'width': 401, 'height': 301}, (401, 301)), ({}, (640, 640)),
     ({'width': 400}, (400, 640)), ({'width': -1, 'height': 300}, (640, 300)), ({'width': 0, 'height': 0}, (640, 640)),
@@ -50,12 +48,14 @@ def test_a_window_is_centred_by_its_content_and_has_24_pixels_more(user, size, c
     assert frame == QRect((800 - width) // 2, 800 - bottom - height - 24, width, height + 24)
 
 
+@pytest.mark.standalone
 def test_a_window_larger_than_the_screen_is_cut_to_it(user):
     size = launch(user, make('OK', width=5000, height=4000), lambda user: user.window().size())
     assert size.width() == 800
     assert 700 < size.height() < 800, 'there is room for a title bar'
 
 
+@pytest.mark.standalone
 def test_a_window_bears_its_title_and_keeps_the_others_from_input(user):
     def look(user):
         window = user.window()
@@ -71,7 +71,7 @@ def test_a_message_box_is_as_large_as_its_buttons_and_lines(user, lines, buttons
     frames = []
     user.plan(lambda user: frames.append(user.window().size()), lambda user: user.close((buttons or ['OK'])[-1]))
     assert ui.showMessageBox('Box', lines, buttons) == buttons[-1]
-    assert [(frame.width(), frame.height()) for frame in frames] == [(7 * width, height + 24)]
+    assert [(frame.width(), frame.height()) for frame in frames] == [(7 * width, height + stage.TITLE_HEIGHT)]
 
 
 @pytest.mark.parametrize('line', ['W' * 30, 'i' * 61, 'fj' * 20, 'é𝄞ñ' * 9, '\ttab\tbed\t out',
@@ -111,7 +111,7 @@ def test_a_bad_file_is_an_error_and_the_next_one_works(user, tmp_path, make_path
     path = str(make_path(tmp_path))
     with pytest.raises(failure, match=words.format(path)) as caught:
         ui.showDialog('t', path)
-    assert caught.type is failure and not windows_on_screen()
+    assert caught.type is failure and not stage.dialogs()
     user.plan(lambda user: user.close())
     assert ui.showDialog('t', str(tmp_path / 'good')) == {'CloseButtonClicked': 'CloseButton_OK'}
 
@@ -141,11 +141,12 @@ os.seteuid(os.getuid())
                                               (['Cancel', 'A', 'B'], 'CloseButton_Cancel')])
 def test_escape_and_the_window_manager_press_cancel_or_the_only_button(user, buttons, pressed):
     dialog = make(*buttons, widgets=FORM[:1])
-    for how in lambda user: user.press(Qt.Key.Key_Escape), lambda user: user.window().close():
+    for how in lambda user: user.press(Qt.Key.Key_Escape), lambda user: user.dismiss():
         user.plan(how)
         assert dialog.launch() == pressed
 
 
+@pytest.mark.standalone
 def test_with_nothing_to_press_escape_does_nothing_and_a_close_request_ends_the_dialog(user):
     dialog = make('Yes', 'No')
     user.plan(lambda user: user.press(Qt.Key.Key_Escape), lambda user: user.window().close())
@@ -153,7 +154,7 @@ def test_with_nothing_to_press_escape_does_nothing_and_a_close_request_ends_the_
     user.plan(lambda user: user.window().close())
     with pytest.raises(IndexError):
         ui.showMessageBox('t', ['?'], ['Yes', 'No'])
-    assert not windows_on_screen()
+    assert not stage.dialogs()
 
 
 def test_enter_in_a_text_field_closes_nothing_and_keeps_the_keyboard_there(user):
@@ -194,7 +195,7 @@ def test_tab_goes_as_the_eye_does_and_past_what_takes_no_input(user):
 def test_a_dialog_can_be_launched_again_with_what_was_left_in_it(user):
     dialog = make('OK', 'Cancel')
     user.plan(lambda user: user.type('kept'), lambda user: user.close())
-    assert dialog.launch() == 'CloseButton_OK' and not windows_on_screen()
+    assert dialog.launch() == 'CloseButton_OK' and not stage.dialogs()
     user.plan(lambda user: texts.append(user.find('Show').text()), lambda user: user.close('Cancel'))
     texts = []
     assert dialog.launch() == 'CloseButton_Cancel' and texts == ['kept']
@@ -217,9 +218,10 @@ def test_a_dialog_without_close_button_is_built_but_not_shown():
         with pytest.raises(ui.UiError) as caught:
             dialog.launch()
         assert str(caught.value) == 'Cannot close dialog: there must be at least one close button'
-        assert not windows_on_screen() and dialog.getValues() == {'CloseButton_X': False}
+        assert stage.active() is None and dialog.getValues() == {'CloseButton_X': False}
 
 
+@pytest.mark.standalone
 def test_a_dialog_opened_from_a_timer_has_its_own_window_and_those_beneath_take_no_input(user):
     outer = make('OK', 'Cancel')
     answers = []
@@ -241,9 +243,10 @@ def test_a_dialog_opened_from_a_timer_has_its_own_window_and_those_beneath_take_
     user.plan(open_box, lambda user: user.find('Show').setFocus(), lambda user: user.type('heard'),
               lambda user: user.close())
     assert outer.launch() == 'CloseButton_OK' and answers == ['No']
-    assert outer.getValues()['Show'] == 'heard' and not windows_on_screen()
+    assert outer.getValues()['Show'] == 'heard' and not stage.dialogs()
 
 
+@pytest.mark.standalone
 def test_a_form_taller_than_the_screen_can_be_scrolled_to_its_buttons(user):
     def reach(user):
         button = user.find('CloseButton_OK')
@@ -288,7 +291,7 @@ def test_a_call_from_another_thread_is_an_error_and_does_no_harm(user, call):
     dialog = make('OK')
     failures = in_another_thread(lambda: call(dialog))
     assert [type(failure) for failure in failures] == [RuntimeError] and 'thread' in str(failures[0])
-    assert dialog.getValue('Show') == '' and not windows_on_screen()
+    assert dialog.getValue('Show') == '' and stage.active() is None
     user.plan(lambda user: user.close())
     assert dialog.launch() == 'CloseButton_OK'
 

@@ -18,13 +18,16 @@ def test_both_names_of_the_module_work_side_by_side_in_one_process():
 import sys, warnings
 warnings.simplefilter('error')
 from quorvane_velmora import ui
-from quorvane_velmora.libs import libKVpyextUi
-assert libKVpyextUi is ui
+from quorvane_velmora import graph
+from quorvane_velmora.libs import libKVpyextGraph, libKVpyextUi
+assert libKVpyextUi is ui and libKVpyextGraph is graph
 xml = ui.makeXmlFromWidgetList([('TextField', 'a')])
 first = ui.createDialog('first', xml)
 sys.path.insert(0, sys.argv[1])
 import libKVpyextUi as bare
-assert bare is not ui and bare.UiError is ui.UiError
+import libKVpyextGraph as bare_graph
+assert bare is not ui and bare.UiError is ui.UiError and bare.Workspace is ui.Workspace
+assert bare_graph is not graph and bare_graph.GraphError is graph.GraphError and bare_graph.Graph is graph.Graph
 second = bare.createDialog('second', xml)
 for dialog, module in (first, bare), (second, ui), (first, ui), (second, bare):
     dialog.setValue('a', 'x', False)
@@ -94,6 +97,10 @@ METHODS = {
     'isDisplayed': 'widgetName', 'enableWidget': 'widgetName enable', 'isEnabled': 'widgetName',
     'disableNextClose': '',
 }
+WORKSPACE_METHODS = {
+    'getCurrentComposition': '', 'getCompositions': '', 'getNbCompositions': '', 'openComposition': 'path',
+    'isCompositionOpened': 'path', 'getBrowserSelection': '',
+}
 # A value of the right type for each; with them no call gets as far as showing a window.
 VALUES = {'title': 't', 'xmlFile': '/missing', 'width': 1, 'height': 1, 'initialValues': {}, 'list': [()],
           'cancelButton': True, 'messages': [1], 'closeButtons': [], 'widgets': [], 'xmlString': XML,
@@ -112,8 +119,10 @@ def test_names_stand_in_the_order_of_their_registration():
         return [name for name in vars(scope) if not name.startswith('_')]
 
     functions = list(FUNCTIONS)
-    assert public(ui) == functions[:6] + ['EventType', 'Dialog', 'CursorGuard', 'BrowserScheme'] + functions[6:] + ['UiError']
+    assert public(ui) == functions[:6] + [
+        'EventType', 'Dialog', 'CursorGuard', 'BrowserScheme', 'Workspace'] + functions[6:] + ['UiError']
     assert public(ui.Dialog) == list(METHODS)
+    assert public(ui.Workspace) == list(WORKSPACE_METHODS)
     assert [(name, int(value)) for name, value in ui.EventType.names.items()] == [
         ('ENABLE', 1), ('DISABLE', 2), ('STATE', 22), ('ACTIVATE', 23), ('VALUE_CHANGED', 24)]
 
@@ -166,6 +175,7 @@ def test_the_module_has_one_exception_whose_text_is_the_reason():
     assert str(caught.value) == 'Error opening file: /no/such file'
 
 
+TABLES = {ui: FUNCTIONS, ui.Dialog: METHODS, ui.Workspace: WORKSPACE_METHODS}
 DEFAULTS = {'width': 'Defaults to -1', 'height': 'Defaults to -1', 'initialValues': 'Defaults to {}',
             'closeButtons': 'Defaults to []', 'cancelButton': 'Default is C{False}',
             'invokeCallback': 'Defaults to C{True}', 'initialPath': 'Defaults to ""',
@@ -175,16 +185,39 @@ FAIL_ON_UNKNOWN_NAME = ['addCallback', 'removeCallback', 'setWidgetResourceName'
 
 
 @pytest.mark.parametrize('owner, name', [(ui, name) for name in FUNCTIONS if name != 'instantiateAppMgr'] +
-                         [(ui.Dialog, name) for name in METHODS])
+                         [(ui.Dialog, name) for name in METHODS] +
+                         [(ui.Workspace, name) for name in WORKSPACE_METHODS])
 def test_docstrings_tell_of_every_parameter_and_its_default_without_signatures(owner, name):
     text = getattr(owner, name).__doc__.strip()
     assert text[0].isupper() and 'signature' not in text and '->' not in text
-    parameters, required = parameters_of(name, METHODS if owner is ui.Dialog else FUNCTIONS)
+    parameters, required = parameters_of(name, TABLES[owner])
     told = dict(re.findall(r'@param (\w+):(.*?)(?=\n@|\Z)', text, re.DOTALL))
     assert list(told) == parameters
     for parameter in parameters[required:] + ['invokeCallback'] * ('invokeCallback' in told):
         assert DEFAULTS[parameter] in told[parameter].replace('\n', ' ')
     assert ('@raise UiError: If the widget does not exist.' in text) == (name in FAIL_ON_UNKNOWN_NAME)
+
+
+def test_the_workspace_says_what_it_is_and_gives():
+    def told(name):
+        return getattr(ui.Workspace, name).__doc__.replace('\n', ' ')
+
+    assert 'only makes sense when scripts are executed in the embedded interpreter' in ' '.join(
+        ui.Workspace.__doc__.split())
+    assert ui.Workspace.__init__.__doc__ is None
+    for name, words in (
+            ('getCurrentComposition', 'Composition that is currently opened in the Velmora UI workspace.'),
+            ('getCurrentComposition', 'or if there is no current composition in the workspace.'),
+            ('getCompositions', 'The list of compositions that are opened in the Velmora UI workspace.'),
+            ('getNbCompositions', 'The number of compositions that are opened in the Velmora UI workspace.'),
+            ('openComposition', 'Opens the given composition in the Velmora UI workspace.'),
+            ('isCompositionOpened', 'Indicates whether the composition at the specified path is currently opened in '
+                                    'the Velmora UI workspace.'),
+            ('getBrowserSelection', 'Gets the paths of elements selected in the Velmora browser in focus.'),
+            ('getBrowserSelection', "is empty if there's no selection or if there's no browser in focus.")):
+        assert words in told(name)
+    for name in 'getCompositions', 'getNbCompositions', 'isCompositionOpened':
+        assert '@raise UiError: If this method is not used within the embedded interpreter.' in told(name)
 
 
 def test_the_module_and_the_dialog_say_what_they_are():

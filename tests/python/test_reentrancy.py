@@ -4,6 +4,7 @@ import gc
 
 import pytest
 
+import stage
 from callback_tools import listen, make_dialog, no_wait_is_endless, patient, run_script  # noqa: F401
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
@@ -18,10 +19,6 @@ def click(name):
 
 def close(user):
     user.close()
-
-
-def open_windows():
-    return [window.windowTitle() for window in QApplication.topLevelWidgets() if window.isVisible()]
 
 
 def test_a_callback_removes_itself(user):
@@ -185,14 +182,14 @@ def test_a_callback_launches_a_dialog_from_which_another_is_launched(patient):
     for level in (1, 2):
         dialogs[level - 1].addCallback('Button', ACTIVATE, open_next(level))
     patient.plan(click('Button'), click('Button'),
-                 lambda someone: order.append(someone.window().windowTitle()),
+                 lambda someone: order.append(someone.title()),
                  lambda someone: someone.close('Cancel'),
-                 lambda someone: order.append(someone.window().windowTitle()), close,
+                 lambda someone: order.append(someone.title()), close,
                  click('Toggle'), lambda someone: someone.close('Cancel'))
     assert dialogs[0].launch() == 'CloseButton_Cancel'
     assert order == ['three', (2, 'CloseButton_Cancel'), 'two', (1, 'CloseButton_OK')]
     assert [dialog.getValue('Toggle') for dialog in dialogs] == [True, False, False]
-    assert open_windows() == []
+    assert stage.titles() == []
 
 
 def test_a_callback_launches_its_own_dialog_again(patient):
@@ -214,7 +211,7 @@ def test_a_dialog_that_is_launched_again_from_one_above_it_comes_to_the_front(pa
     above.addCallback('Button', ACTIVATE, lambda *_: fronts.append(below.launch()))
 
     def close_front(user):
-        fronts.append(user.window().windowTitle())
+        fronts.append(user.title())
         user.close()
 
     patient.plan(*[lambda user: user.click('Button')] * 2, close_front, close_front)

@@ -75,10 +75,8 @@ class User:
         except BaseException as failure:
             self.failures.append(''.join(traceback.format_exception(failure)))
 
-    @staticmethod
-    def window():
-        """The dialog that takes input now."""
-        return stage.active()
+    # The dialog that takes input now.
+    window = staticmethod(stage.active)
 
     def find(self, name, kind=QWidget):
         found = [widget for widget in self.window().findChildren(kind) if widget.objectName() == name]

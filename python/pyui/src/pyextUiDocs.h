@@ -329,4 +329,59 @@ constexpr char const* browserScheme =
     R"(The constants of this class define the various browser schemes, that is the types of entity that can be browsed. There
 are no instances of it.)";
 
+constexpr char const* workspace =
+    R"(The compositions that the running application has open, and what is selected in its browsers. This class only makes
+sense when scripts are executed in the embedded interpreter. All of its methods are static. Example::
+
+    if ui.Workspace.getNbCompositions() > 0:
+        print( ui.Workspace.getCurrentComposition().getPath() ))";
+
+constexpr char const* getCurrentComposition =
+    R"(Gets the current composition. Each call gives an object of its own for it.
+
+@return: Composition that is currently opened in the Velmora UI workspace.
+@rtype: L{Graph}
+@raise UiError: If this method is not used within the embedded interpreter, or if there is no current composition in the
+workspace.)";
+
+constexpr char const* getCompositions =
+    R"(Gets all compositions, in the order in which they were opened.
+
+@return: The list of compositions that are opened in the Velmora UI workspace.
+@rtype: C{list} of L{Graph}
+@raise UiError: If this method is not used within the embedded interpreter.)";
+
+constexpr char const* getNbCompositions =
+    R"(Counts the compositions.
+
+@return: The number of compositions that are opened in the Velmora UI workspace.
+@rtype: C{int}
+@raise UiError: If this method is not used within the embedded interpreter.)";
+
+constexpr char const* openComposition =
+    R"(Opens the given composition in the Velmora UI workspace.
+
+@param path: Composition to open.
+@type path: L{Graph}
+@raise UiError: If this method is not used within the embedded interpreter.
+@raise RuntimeError: If the composition has been closed.)";
+
+constexpr char const* isCompositionOpened =
+    R"(Indicates whether the composition at the specified path is currently opened in the Velmora UI workspace.
+
+@param path: The path of the composition's file, with the extension C{vmcomposition}. It is the file that counts, by
+whatever path it was opened.
+@type path: C{str}
+@return: C{True} if it is.
+@rtype: C{bool}
+@raise UiError: If this method is not used within the embedded interpreter.)";
+
+constexpr char const* getBrowserSelection =
+    R"(Gets the paths of elements selected in the Velmora browser in focus. The browser need not be a file system browser:
+the paths are what its elements are called in the scheme that it shows (see L{BrowserScheme}).
+
+@return: The paths. The list is empty if there's no selection or if there's no browser in focus.
+@rtype: C{list} of C{str}
+@raise UiError: If this method is not used within the embedded interpreter.)";
+
 } // namespace Kv::PyextUi::Docs

@@ -14,9 +14,11 @@
 #include "pyConvenienceFunctions.h"
 #include "pyManagedDialog.h"
 #include "pyUiError.h"
+#include "pyWorkspace.h"
 #include "pyextUiDocs.h"
 #include "pygraph/inPyextGraph.h"
 #include "pyinit/inPyextInit.h"
+#include "pyinit/pySharedClass.h"
 #include "resmgt/inResmgt.h"
 #include "scriptingAPI/inScriptingApi.h"
 #include "ui/inUi.h"
@@ -131,17 +133,6 @@ bp::handle<> importGraphModule()
     return bp::handle<>(module);
 }
 
-/// The package and the bare name are two modules of one process, and the body runs for each. They share one class for
-/// each type, so that what a script has from the one is good for the other. True if the class is there already.
-template <typename T> bool shareClass(char const* name)
-{
-    bp::converter::registration const* const known = bp::converter::registry::query(bp::type_id<T>());
-    if (!known || !known->m_class_object)
-        return false;
-    bp::scope().attr(name) = bp::object(bp::handle<>(bp::borrowed(known->m_class_object)));
-    return true;
-}
-
 void defineFunctions()
 {
     using bp::arg;
@@ -165,7 +156,7 @@ void defineFunctions()
 
 void registerEventType()
 {
-    if (shareClass<PiWidget::EventType>("EventType"))
+    if (PyextInit::shareClass<PiWidget::EventType>("EventType"))
         return;
     bp::enum_<PiWidget::EventType>("EventType")
         .value("ENABLE", PiWidget::Enable)
@@ -181,7 +172,7 @@ void registerDialog()
     using SetValueNotifying = void (Dialog::*)(std::string const&, bp::object const&, bool);
     using SetValues = void (Dialog::*)(bp::dict const&);
     using SetValuesNotifying = void (Dialog::*)(bp::dict const&, bool);
-    if (shareClass<Dialog>("Dialog"))
+    if (PyextInit::shareClass<Dialog>("Dialog"))
         return;
     bp::class_<Dialog, RCShdPtr<ManagedDialog>, boost::noncopyable> dialog("Dialog", Docs::dialog, bp::no_init);
     supportGarbageCollection(reinterpret_cast<PyTypeObject*>(dialog.ptr()));
@@ -206,7 +197,7 @@ void registerDialog()
 
 void registerCursorGuard()
 {
-    if (shareClass<UiCursorGuard>("CursorGuard"))
+    if (PyextInit::shareClass<UiCursorGuard>("CursorGuard"))
         return;
     bp::class_<UiCursorGuard, boost::noncopyable>("CursorGuard", Docs::cursorGuard,
                                                   bp::init<std::string>(Docs::cursorGuardInit));
@@ -214,7 +205,7 @@ void registerCursorGuard()
 
 void registerBrowserScheme()
 {
-    if (shareClass<PiBrowserSchemes>("BrowserScheme"))
+    if (PyextInit::shareClass<PiBrowserSchemes>("BrowserScheme"))
         return;
     bp::class_<PiBrowserSchemes> scheme("BrowserScheme", Docs::browserScheme, bp::no_init);
     scheme.attr("FILE_SYSTEM") = PiBrowserSchemes::FsScheme.toString();
@@ -223,6 +214,25 @@ void registerBrowserScheme()
     scheme.attr("VIEWS") = PiBrowserSchemes::PluginViewScheme.toString();
     scheme.attr("PICK_LIST") = PiBrowserSchemes::PicklistScheme.toString();
     scheme.attr("BOOKMARKS") = PiBrowserSchemes::BookmarkScheme.toString();
+}
+
+void registerWorkspace()
+{
+    if (PyextInit::shareClass<Workspace>("Workspace"))
+        return;
+    bp::class_<Workspace, boost::noncopyable>("Workspace", Docs::workspace, bp::init<>())
+        .def("getCurrentComposition", &Workspace::getCurrentComposition, Docs::getCurrentComposition)
+        .staticmethod("getCurrentComposition")
+        .def("getCompositions", &Workspace::getCompositions, Docs::getCompositions)
+        .staticmethod("getCompositions")
+        .def("getNbCompositions", &Workspace::getNbCompositions, Docs::getNbCompositions)
+        .staticmethod("getNbCompositions")
+        .def("openComposition", &Workspace::openComposition, Docs::openComposition)
+        .staticmethod("openComposition")
+        .def("isCompositionOpened", &Workspace::isCompositionOpened, Docs::isCompositionOpened)
+        .staticmethod("isCompositionOpened")
+        .def("getBrowserSelection", &Workspace::getBrowserSelection, Docs::getBrowserSelection)
+        .staticmethod("getBrowserSelection");
 }
 
 void registerExceptions()
@@ -240,6 +250,7 @@ void moduleBody()
     registerDialog();
     registerCursorGuard();
     registerBrowserScheme();
+    registerWorkspace();
     bp::def("instantiateAppMgr", &instantiateAppMgr);
     registerExceptions();
     bp::scope().attr("__doc__") = Docs::module;

@@ -1,0 +1,44 @@
+#pragma once
+
+#include "pygraph/pyGraphRo.h"
+
+#include <string>
+
+namespace Kv::PyextGraph
+{
+
+/// A composition as a script has it: to be read, and if it was made writable, to be changed.
+class KVPYEXTGRAPH_API Graph : public GraphRO
+{
+public:
+    /// Writable.
+    explicit Graph(RCShdPtr<PiGraph> const& graph);
+
+    /// Read-only.
+    explicit Graph(RCShdPtr<const PiGraph> const& graph);
+
+    ~Graph() override;
+
+    /// Whether this object was made writable, and the composition's file can be written now.
+    bool isWritable() const;
+
+    /// Sets a value of a node, or adds it. Throws `GraphError` and changes nothing where this object is read-only, the
+    /// file cannot be written now, there is no such node, or the texts cannot be stored.
+    void setNodeValue(std::string const& nodeName, std::string const& key, std::string const& value);
+
+    /// Writes the composition's file. Throws `GraphError` where this object is read-only or the file cannot be written,
+    /// which leaves the file as it was.
+    void save();
+
+    /// What `repr` shows: name, path, and whether it can be changed, or that it is closed.
+    boost::python::object describe() const;
+
+private:
+    /// Throws `GraphError` where the composition has been closed, or this object is read-only.
+    PiGraph& requireWritable() const;
+
+    /// Null if read-only.
+    RCShdPtr<PiGraph> _writableGraph;
+};
+
+} // namespace Kv::PyextGraph

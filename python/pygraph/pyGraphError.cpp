@@ -1,0 +1,8 @@
+#include "pygraph/pyGraphError.h"
+
+namespace Kv::PyextInit
+{
+
+template class ModError<PyextGraph::GraphModule>;
+
+} // namespace Kv::PyextInit

@@ -1,0 +1,21 @@
+#pragma once
+
+#include <boost/python.hpp>
+
+namespace Kv::PyextInit
+{
+
+/// The package and the bare name of an extension module are two modules of one process, and its body runs for each.
+/// They share one class for each type, so that what a script has from the one is good for the other. True if the class
+/// of `T` is there already; it has then become the attribute `name` of the module whose body runs.
+template <typename T> bool shareClass(char const* name)
+{
+    namespace bp = boost::python;
+    bp::converter::registration const* const known = bp::converter::registry::query(bp::type_id<T>());
+    if (!known || !known->m_class_object)
+        return false;
+    bp::scope().attr(name) = bp::object(bp::handle<>(bp::borrowed(known->m_class_object)));
+    return true;
+}
+
+} // namespace Kv::PyextInit

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <boost/python/list.hpp>
+
+#include "base/rcShdPtr.h"
+#include "pygraph/pyManagedGraph.h"
+#include "resmgt/osFilePath.h"
+
+namespace Kv
+{
+
+/// What a script sees of the running application. Nothing is stored: every call asks the current workspace anew. Where
+/// there is no application, each throws `UiError`.
+class Workspace
+{
+public:
+    /// Throws `UiError` where there is none.
+    static RCShdPtr<ManagedGraph> getCurrentComposition();
+
+    /// All open ones, in the order in which they were opened.
+    static boost::python::list getCompositions();
+
+    static unsigned int getNbCompositions();
+
+    /// Makes the composition the current one.
+    static void openComposition(RCShdPtr<ManagedGraph> const& graph);
+
+    static bool isCompositionOpened(OsFilePath const& path);
+
+    /// The paths of what is selected in the browser that has the keyboard; empty where none has.
+    static boost::python::list getBrowserSelection();
+};
+
+} // namespace Kv
