@@ -8,13 +8,13 @@ APPLICATION = next((window for window in QApplication.topLevelWidgets() if windo
 # What a dialog has above its content, in pixels.
 TITLE_HEIGHT = 25 if APPLICATION else 24
 
-# The names that dialogs and browsers in the application go by.
+
+# The names that floating containers go by.
 FLOATING = ('Whatever', 'BrowserWindow')
 
 
 def floating():
-    return [widget for widget in APPLICATION.findChildren(QWidget)
-            if widget.objectName() in FLOATING and widget.isVisible()]
+    return [widget for widget in APPLICATION.findChildren(QWidget) if widget.objectName() in FLOATING and widget.isVisible()]
 
 
 def dialogs():
