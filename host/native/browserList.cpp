@@ -83,9 +83,7 @@ void BrowserList::keyPressEvent(QKeyEvent* event)
         event->ignore();
     else if (event->key() == Qt::Key_Backspace)
         _wishes.goUp();
-    else if (isEnter && event->isAutoRepeat())
-        event->accept();
-    else if ((isEnter || isArrow) && selectFirst())
+    else if ((isEnter && event->isAutoRepeat()) || ((isEnter || isArrow) && selectFirst()))
         event->accept();
     else if (isEnter)
         _wishes.activate();

@@ -2,6 +2,7 @@
 #include "base/inBuildInfoUtil.h"
 #include "base/inInit.h"
 #include "base/inLibraryBuildInfo.h"
+#include "resmgt/inResmgt.h"
 
 #include <memory>
 
@@ -19,6 +20,7 @@ namespace Kv
 template <> InInit<KvInit::native>::InInit() : InPackageInit("native")
 {
     registerPackage();
+    addDependency(InInit<KvInit::resmgt>::getType());
     addDependency(InInit<KvInit::base>::getType());
 }
 

@@ -174,3 +174,16 @@ def test_a_typed_path_that_leads_nowhere_is_told_and_given_to_nobody(user, files
 
     assert browse(user, enter('nothing'), ok, look, cancel, initialPath=files, pathValidationCb=validate) == ''
     assert told == ["There is no '%s/nothing'" % files, 'nothing'] and not calls
+
+
+@pytest.mark.inside
+def test_the_workspace_knows_what_is_selected_in_it(user, files):
+    seen = []
+
+    def look(*_):
+        seen.append(ui.Workspace.getBrowserSelection())
+        return files
+
+    browse(user, pick('notes', Qt.Key.Key_Return), initialPath=files, pathValidationCb=look)
+    browse(user, lambda user: user.find('Browser.list').setFocus(), lambda user: look(), ok, initialPath=files)
+    assert seen == [[files + '/notes.txt'], []]
