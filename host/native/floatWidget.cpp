@@ -6,7 +6,6 @@
 #include <QKeyEvent>
 #include <QLabel>
 #include <QPainter>
-#include <QTimer>
 
 #include <algorithm>
 
@@ -57,7 +56,9 @@ FloatWidget::FloatWidget(QWidget* parent, QtListenerHandle<NtFloatListener> cons
                 if (to && isAncestorOf(to) && !(from && isAncestorOf(from)))
                     raise();
             });
-    QTimer::singleShot(0, this, [handle] { handle.tell(&NtFloatListener::onFirstTurn); });
+    // A timer would stay until it fires, also when this is gone.
+    QMetaObject::invokeMethod(
+        this, [handle] { handle.tell(&NtFloatListener::onFirstTurn); }, Qt::QueuedConnection);
 }
 
 FloatWidget* FloatWidget::findAround(QWidget& widget)

@@ -3,7 +3,10 @@
 import os
 import subprocess
 import sys
+import tempfile
 
+PROGRAM = os.readlink('/proc/self/exe')
+INSIDE = os.path.basename(PROGRAM) == 'velmora'
 HERE = os.path.dirname(os.path.abspath(__file__))
 CHOOSES_DISPLAY = ('DISPLAY', 'QT_QPA_PLATFORM', 'WAYLAND_DISPLAY', 'WAYLAND_SOCKET', 'XDG_SESSION_TYPE')
 
@@ -16,8 +19,15 @@ def environment(**changes):
 
 
 def run_script(text, *arguments, **changes):
-    """Runs a script to its end, which must be a good one, and gives what it printed."""
-    done = subprocess.run([sys.executable, '-c', text, *arguments], env=environment(**changes), capture_output=True,
-                          text=True, timeout=300)
+    """Runs a script to its end, which must be a good one, and gives what it printed. The tests of the application run
+    it in an application of its own."""
+    if INSIDE and 'DISPLAY' not in changes:
+        changes['QT_QPA_PLATFORM'] = 'offscreen'
+    with tempfile.NamedTemporaryFile('w', suffix='.py') as file:
+        file.write(text)
+        file.flush()
+        command = [PROGRAM, '--exit', file.name] if INSIDE else [sys.executable, '-c', text]
+        done = subprocess.run([*command, *arguments], env=environment(**changes), capture_output=True, text=True,
+                              timeout=300)
     assert done.returncode == 0, 'status %d\n%s%s' % (done.returncode, done.stdout, done.stderr)
     return done.stdout

@@ -5,14 +5,16 @@ from scripts import run_script
 SCRIPT = '''
 import gc, os, subprocess
 from quorvane_velmora import ui
-from PyQt6.QtCore import QTimer
+from PyQt6.QtCore import QEvent, QTimer
+from PyQt6.QtGui import QPixmapCache
 from PyQt6.QtWidgets import QApplication, QPushButton
+import stage
 
 FORM = [('TextField', 'a', 'A', 'text'), ('ToggleButton', 'b', 'B', True), ('Menu', 'c', 'C', (['x', 'y'], 1)),
         ('PushButton', 'd', 'D'), ('Label', 'e', 'E', 'text')]
 
 def close():
-    window = QApplication.activeModalWidget()
+    window = stage.active()
     if window is not None:
         window.findChild(QPushButton, 'CloseButton_OK').click()
 
@@ -22,6 +24,9 @@ def show(times):
 
 def take_stock():
     gc.collect()
+    # What the toolkit keeps up to a bound, and what it lets go when the loop of the application itself comes around.
+    QPixmapCache.clear()
+    QApplication.sendPostedEvents(None, QEvent.Type.DeferredDelete.value)
     windows = 0
     if QApplication.platformName() == 'xcb':
         QApplication.processEvents()

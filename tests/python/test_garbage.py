@@ -214,6 +214,7 @@ assert len(QApplication.allWidgets()) == widgets
 '''
 
 
+@pytest.mark.standalone
 @pytest.mark.parametrize('script', [NEVER_SHOWN, LAUNCHED], ids=['never shown', 'launched'])
 def test_many_rounds_leave_no_object_and_no_memory_behind(script):
     printed = run_script(script).split()

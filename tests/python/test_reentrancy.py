@@ -122,6 +122,7 @@ assert not user.failures, user.failures
     assert printed.split() == ['answered', 'True'] * 2 + ['answered', 'CloseButton_OK']
 
 
+@pytest.mark.standalone
 def test_launches_that_open_launches_end_with_the_recursion_error_of_python():
     printed = run_script('''
 import sys

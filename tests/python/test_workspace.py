@@ -7,6 +7,7 @@ from quorvane_velmora import graph, ui
 REFUSED = 'Ui workspace access only available within interactive application.'
 
 
+@pytest.mark.standalone
 def test_there_is_no_workspace_outside_the_application():
     workspace = ui.Workspace()
     for owner in ui.Workspace, workspace:
