@@ -35,7 +35,9 @@ QString toText(std::string const& bytes)
 Kv::UiConstraint makeFilling()
 {
     using Kv::UiConstraint;
-    auto const edge = [](UiConstraint::Target target) { return UiConstraint::Edge{0, UiConstraint::Pixels, target, {}}; };
+    auto const edge = [](UiConstraint::Target target) {
+        return UiConstraint::Edge{0, UiConstraint::Pixels, target, {}};
+    };
     return UiConstraint({edge(UiConstraint::ParentLow), edge(UiConstraint::ParentLow), edge(UiConstraint::ParentHigh),
                          edge(UiConstraint::ParentHigh)});
 }
@@ -50,9 +52,12 @@ Kv::RCShdPtr<Kv::UiView> findView(Kv::UiWidget const& widget)
 
 } // namespace
 
-Application::Application() : _window(makeCommands()), _loadCb(this, &Application::loadFocused)
+Application::Application()
+    : _window(makeCommands()), _loadCb(this, &Application::loadFocused), _fileCb(this, &Application::refuseFocused)
 {
     makeHost();
+    _showTimer.setSingleShot(true);
+    QObject::connect(&_showTimer, &QTimer::timeout, &_window, [this] { showCompositions(); });
     QObject::connect(&_signalTimer, &QTimer::timeout, &_window, [this] { checkSignals(); });
     showCompositions();
 }
@@ -86,6 +91,8 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
     _signalTimer.start(signalInterval);
     int const status = QApplication::exec();
     _signalTimer.stop();
+    // What scripts have left for their end can open no dialog any more: nobody would see it.
+    Kv::WsNative::getPlatform().closeLoops();
     return _interpreter.finish(status);
 }
 
@@ -111,14 +118,16 @@ void Application::makeHost()
                                        [this](bool enabled) { _window.setOwnEnabled(enabled); });
     RCShdPtr<UiContainer> const root = _hostWindow->getRootContainer();
     _panel = UiPanel::create(root, "mainPanel", NtForeignWidget{_window.getPanel()});
-    RCShdPtr<UiPanel> const place =
-        UiPanel::create(root, "browserPanel", NtForeignWidget{_window.getBrowserPlace()});
+    RCShdPtr<UiPanel> const place = UiPanel::create(root, "browserPanel", NtForeignWidget{_window.getBrowserPlace()});
     _browser = BrBrowser::create(place, "Browser", nullptr);
     _browser->setConstraint(makeFilling());
     _browser->setMultiple(true);
     _browser->setLoadCb(&_loadCb);
+    _browser->getPiWidget()->addCallback(PiWidget::Activate, &_fileCb);
     _browser->setKeyboardFocusable(true);
-    _browser->setURL(std::filesystem::current_path().string(), HistoryEnum(0), UpdateEnum(0));
+    // Where that is gone the browser stays at the root.
+    std::error_code nowhere;
+    _browser->setURL(std::filesystem::current_path(nowhere).string(), HistoryEnum(0), UpdateEnum(0));
     _workspace = makeShd<UiCompositionWorkspace>([this] { return _hostWindow->findKeyboardHolder(); });
     _workspace->setListener(this);
     UiWorkspace::setCurrentWorkspace(_workspace);
@@ -148,6 +157,7 @@ int Application::runScript(ScriptCall const& script)
     _lastScript = script;
     QString const name = QFileInfo(toText(script.target)).fileName();
     _window.tell(QObject::tr("%1 is running").arg(name));
+    _window.paintNow();
     int const status = _interpreter.run(script);
     _scriptRuns = false;
     _window.setRunAgainEnabled(true);
@@ -163,22 +173,39 @@ void Application::checkSignals()
 {
     // A script that runs hears of its signals itself.
     if (!_scriptRuns && _interpreter.isInterrupted())
-        QApplication::exit(interruptedStatus);
+        interrupt();
 }
 
 std::string Application::askPath(QString const& title)
 {
     std::string path;
-    auto const ask = [&]
-    { path = PathQuestion(title.toUtf8().constData(), _browser->getPath().toString()).ask(); };
-    if (!_interpreter.attempt(ask))
-        QApplication::exit(interruptedStatus);
+    auto const ask = [&] { path = PathQuestion(title.toUtf8().constData(), _browser->getPath().toString()).ask(); };
+    bool answered = true;
+    attempt([&] { answered = _interpreter.attempt(ask); });
+    if (!answered)
+        interrupt();
     return path;
+}
+
+void Application::interrupt()
+{
+    // Who presses it again while asked about changes means it.
+    if (QApplication::activeModalWidget() || confirmLoss(getCompositions()))
+        QApplication::exit(interruptedStatus);
 }
 
 void Application::loadFocused(Kv::EvEvent&)
 {
-    attempt([this] { openComposition(_browser->getInputFocusPath().toString()); });
+    // Later: what goes wrong is told in a box, for which nobody shall wait.
+    QMetaObject::invokeMethod(
+        &_window, [this] { attempt([this] { openComposition(_browser->getInputFocusPath().toString()); }); },
+        Qt::QueuedConnection);
+}
+
+void Application::refuseFocused(Kv::EvEvent&)
+{
+    QString const name = QFileInfo(toText(_browser->getInputFocusPath().toString())).fileName();
+    _window.tell(QObject::tr("%1 is no composition. File > Run Script runs scripts.").arg(name));
 }
 
 void Application::askComposition()
@@ -192,12 +219,20 @@ void Application::askScript()
 {
     std::string const path = askPath(QObject::tr("Run Script"));
     if (!path.empty())
-        startScript({ScriptCall::Kind::File, path, {}});
+        startScript(ScriptCall::makeFile(path, {}));
 }
 
 void Application::saveComposition()
 {
-    attempt([this] { _workspace->save(_workspace->getCurrentComposition()); });
+    Composition const current = _workspace->getCurrentComposition();
+    Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const composition(current);
+    if (composition.isNull())
+        return;
+    QString const name = toText(composition->getGraph()->getName());
+    if (!composition->isModified())
+        _window.tell(QObject::tr("%1 has no changes to save").arg(name));
+    else if (attempt([&] { _workspace->save(current); }))
+        _window.tell(QObject::tr("%1 is saved").arg(name));
 }
 
 void Application::closeComposition()
@@ -229,10 +264,7 @@ void Application::showBuildInfo()
 {
     std::ostringstream text;
     writeBuildInfo(text);
-    QMessageBox box(QMessageBox::Information, QObject::tr("Build Information"), QObject::tr("Quorvane Velmora"),
-                    QMessageBox::Close, &_window);
-    box.setDetailedText(toText(text.str()));
-    box.exec();
+    _window.showText(QObject::tr("Build Information"), toText(text.str()));
 }
 
 bool Application::confirmLoss(std::vector<Composition> const& compositions)
@@ -247,10 +279,11 @@ bool Application::confirmLoss(std::vector<Composition> const& compositions)
                         QObject::tr("%1 has changes that are not saved.").arg(name),
                         QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, &_window);
         box.setDefaultButton(QMessageBox::Save);
+        box.setTextFormat(Qt::PlainText);
         int const answer = box.exec();
-        if (answer == QMessageBox::Cancel)
-            return false;
-        if (answer == QMessageBox::Save && !attempt([&] { _workspace->save(composition); }))
+        _window.activateWindow();
+        bool const isSaved = answer == QMessageBox::Save && attempt([&] { _workspace->save(composition); });
+        if (!isSaved && answer != QMessageBox::Discard)
             return false;
     }
     return true;
@@ -263,9 +296,8 @@ bool Application::quit()
     _closing = true;
     _window.hide();
     // A script that runs comes to its end first, with its dialogs ended.
-    if (_scriptRuns)
-        Kv::WsNative::getPlatform().closeLoops();
-    else
+    Kv::WsNative::getPlatform().closeLoops();
+    if (!_scriptRuns)
         QApplication::exit(0);
     return true;
 }
@@ -277,9 +309,13 @@ bool Application::attempt(std::function<void()> const& action)
         action();
         return true;
     }
-    catch (Kv::ExBase const& error)
+    catch (std::exception const& error)
     {
-        QMessageBox::warning(&_window, QObject::tr("Velmora"), toText(error.getReason()));
+        QMessageBox box(QMessageBox::Warning, QObject::tr("Velmora"), toText(error.what()), QMessageBox::Close,
+                        &_window);
+        box.setTextFormat(Qt::PlainText);
+        box.exec();
+        _window.activateWindow();
         return false;
     }
 }
@@ -309,24 +345,31 @@ void Application::showCompositions()
     _window.showGraph(accessor.isNull() ? nullptr : accessor->getGraph());
 }
 
+void Application::showCompositionsLater()
+{
+    // Once for all that a script does at a stretch.
+    if (!_showTimer.isActive())
+        _showTimer.start(0);
+}
+
 void Application::compositionOpened(Composition const&)
 {
-    showCompositions();
+    showCompositionsLater();
 }
 
 void Application::compositionClosed(Composition const&)
 {
-    showCompositions();
+    showCompositionsLater();
 }
 
 void Application::currentCompositionChanged()
 {
-    showCompositions();
+    showCompositionsLater();
 }
 
 void Application::compositionChanged(Composition const&)
 {
-    showCompositions();
+    showCompositionsLater();
 }
 
 } // namespace Velmora

@@ -30,8 +30,8 @@ public:
     /// Throws `Kv::ExBase` with words for a file that is no composition.
     void openComposition(std::string const& path);
 
-    /// Shows the window and runs until the user ends it, or until the script ends it where `exit` is set. Gives the exit
-    /// status.
+    /// Shows the window and runs until the user ends it, or until the script ends it where `exit` is set. Gives the
+    /// exit status.
     int run(std::optional<ScriptCall> const& script, bool exit);
 
 private:
@@ -43,10 +43,13 @@ private:
     void startScript(ScriptCall const& script);
     int runScript(ScriptCall const& script);
     void checkSignals();
+    /// Ctrl-C: the application ends, unless the user wants to keep changes.
+    void interrupt();
 
     /// Asks for a file; empty if none was chosen.
     std::string askPath(QString const& title);
     void loadFocused(Kv::EvEvent& event);
+    void refuseFocused(Kv::EvEvent& event);
     void askComposition();
     void askScript();
     void saveComposition();
@@ -64,6 +67,7 @@ private:
 
     std::vector<Composition> getCompositions() const;
     void showCompositions();
+    void showCompositionsLater();
 
     void compositionOpened(Composition const& composition) override;
     void compositionClosed(Composition const& composition) override;
@@ -76,8 +80,10 @@ private:
     Kv::RCShdPtr<Kv::UiPanel> _panel;
     Kv::RCShdPtr<Kv::BrBrowser> _browser;
     Kv::UiEventCallback<Application> _loadCb;
+    Kv::UiEventCallback<Application> _fileCb;
     Kv::RCShdPtr<Kv::UiCompositionWorkspace> _workspace;
     QTimer _signalTimer;
+    QTimer _showTimer;
     std::optional<ScriptCall> _lastScript;
     bool _scriptRuns = false;
     bool _closing = false;

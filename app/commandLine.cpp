@@ -1,6 +1,8 @@
 #include "commandLine.h"
 
+#include <filesystem>
 #include <getopt.h>
+#include <utility>
 
 namespace Velmora
 {
@@ -21,12 +23,14 @@ std::string describeFault(char const* argument, int option)
     return shown + (option == Open || option == 'm' ? " needs an argument" : " is no option");
 }
 
-ScriptCall readScript(ScriptCall::Kind kind, std::string const& target, int next, int argc, char** argv)
-{
-    return {kind, target, std::vector<std::string>(argv + next, argv + argc)};
-}
-
 } // namespace
+
+ScriptCall ScriptCall::makeFile(std::string const& path, std::vector<std::string> arguments)
+{
+    std::error_code nowhere;
+    std::filesystem::path const absolute = std::filesystem::absolute(path, nowhere);
+    return {Kind::File, path, nowhere ? path : absolute.string(), std::move(arguments)};
+}
 
 CommandLine readCommandLine(int argc, char** argv)
 {
@@ -54,13 +58,14 @@ CommandLine readCommandLine(int argc, char** argv)
             line.help = true;
             break;
         case 'm':
-            line.script = readScript(ScriptCall::Kind::Module, optarg, optind, argc, argv);
+            line.script = ScriptCall{ScriptCall::Kind::Module, optarg, optarg,
+                                     std::vector<std::string>(argv + optind, argv + argc)};
             break;
         default:
             throw UsageError(describeFault(argv[optind - 1], optopt));
         }
     if (!line.script && optind < argc)
-        line.script = readScript(ScriptCall::Kind::File, argv[optind], optind + 1, argc, argv);
+        line.script = ScriptCall::makeFile(argv[optind], std::vector<std::string>(argv + optind + 1, argv + argc));
     if (line.exit && !line.script)
         throw UsageError("--exit needs a script to end with");
     return line;

@@ -17,8 +17,13 @@ struct ScriptCall
         Module,
     };
 
+    /// A script is found again by its absolute path, wherever the process goes meanwhile.
+    static ScriptCall makeFile(std::string const& path, std::vector<std::string> arguments);
+
     Kind kind = Kind::File;
-    /// The script's path, or the module's name.
+    /// The script as it was named, or the module.
+    std::string name;
+    /// The script's absolute path, or the module's name.
     std::string target;
     std::vector<std::string> arguments;
 };

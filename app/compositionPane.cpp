@@ -4,6 +4,7 @@
 
 #include <QHeaderView>
 #include <QLabel>
+#include <QTextDocument>
 #include <QVBoxLayout>
 
 #include <utility>
@@ -57,7 +58,8 @@ CompositionPane::CompositionPane(QWidget* parent, std::function<void(int)> onCho
     auto const choose = [this](QListWidgetItem* item)
     {
         int const place = _list->row(item);
-        QMetaObject::invokeMethod(this, [this, place] { _onChosen(place); }, Qt::QueuedConnection);
+        QMetaObject::invokeMethod(
+            this, [this, place] { _onChosen(place); }, Qt::QueuedConnection);
     };
     connect(_list, &QListWidget::itemActivated, this, choose);
     connect(_list, &QListWidget::itemClicked, this, choose);
@@ -69,7 +71,7 @@ void CompositionPane::showCompositions(std::vector<CompositionEntry> const& entr
     for (CompositionEntry const& entry : entries)
     {
         auto* const item = new QListWidgetItem(describe(entry), _list);
-        item->setToolTip(entry.path);
+        item->setToolTip(Qt::convertFromPlainText(entry.path, Qt::WhiteSpaceNormal));
         QFont font = item->font();
         font.setBold(entry.isCurrent);
         item->setFont(font);

@@ -77,7 +77,9 @@ bp::dict makeMain()
     bp::object const module(bp::handle<>(PyModule_New("__main__")));
     bp::dict names = bp::extract<bp::dict>(module.attr("__dict__"));
     names["__builtins__"] = bp::import("builtins");
-    getSys().attr("modules")["__main__"] = module;
+    // A script can have put anything in the place of `sys.modules`.
+    if (PyDict_SetItemString(PyImport_GetModuleDict(), "__main__", module.ptr()) != 0)
+        bp::throw_error_already_set();
     return names;
 }
 
@@ -109,16 +111,15 @@ void runModule(std::string const& name, bool isNamed)
 
 void runFile(std::string const& path)
 {
-    std::string const absolute = std::filesystem::absolute(path);
-    std::unique_ptr<std::FILE, FileCloser> const file(std::fopen(absolute.c_str(), "rb"));
+    std::unique_ptr<std::FILE, FileCloser> const file(std::fopen(path.c_str(), "rb"));
     if (!file)
         failToOpen(path, errno);
-    bp::object const name = toPython(absolute);
+    bp::object const name = toPython(path);
     bp::dict names = makeMain();
     names["__file__"] = name;
     names["__cached__"] = bp::object();
     names["__loader__"] = bp::import("importlib.machinery").attr("SourceFileLoader")("__main__", name);
-    bp::handle<>(PyRun_FileExFlags(file.get(), absolute.c_str(), Py_file_input, names.ptr(), names.ptr(), 0, nullptr));
+    bp::handle<>(PyRun_FileExFlags(file.get(), path.c_str(), Py_file_input, names.ptr(), names.ptr(), 0, nullptr));
 }
 
 /// A folder or an archive with a module `__main__` in it is a script too.
@@ -143,11 +144,12 @@ void runCall(ScriptCall const& call)
     if (call.kind == ScriptCall::Kind::Module)
     {
         setArguments("-m", call.arguments);
-        setFirstPath(toPython(fs::current_path()));
+        std::error_code nowhere;
+        setFirstPath(toPython(fs::current_path(nowhere)));
         runModule(call.target, true);
         return;
     }
-    setArguments(call.target, call.arguments);
+    setArguments(call.name, call.arguments);
     if (holdsModules(call.target))
     {
         setFirstPath(toPython(call.target));
@@ -156,7 +158,7 @@ void runCall(ScriptCall const& call)
     }
     std::error_code unresolved;
     fs::path const real = fs::canonical(call.target, unresolved);
-    setFirstPath(toPython((unresolved ? fs::absolute(call.target) : real).parent_path()));
+    setFirstPath(toPython((unresolved ? fs::path(call.target) : real).parent_path()));
     runFile(call.target);
 }
 
@@ -187,7 +189,11 @@ int readExit(PyObject* value)
     if (!code || code.get() == Py_None)
         return 0;
     if (PyLong_Check(code.get()))
-        return static_cast<int>(PyLong_AsLong(code.get()) & 0xff);
+    {
+        auto const status = static_cast<int>(PyLong_AsLong(code.get()) & 0xff);
+        PyErr_Clear();
+        return status;
+    }
     PyObject* const stream = PySys_GetObject("stderr");
     if (stream && stream != Py_None)
     {
@@ -198,6 +204,33 @@ int readExit(PyObject* value)
     return 1;
 }
 
+/// As the interpreter itself would, but that nothing of it is kept, where a dialog could live on in it, and that a hook
+/// which raises `SystemExit` ends nothing.
+void print(PyObject* type, PyObject* value, PyObject* traceback)
+{
+    if (traceback)
+        PyException_SetTraceback(value, traceback);
+    PyObject* const hook = PySys_GetObject("excepthook");
+    if (!hook || hook == Py_None)
+    {
+        PyErr_Display(type, value, traceback);
+        return;
+    }
+    bp::handle<> const held(bp::borrowed(hook));
+    bp::handle<> const printed(
+        bp::allow_null(PyObject_CallFunctionObjArgs(hook, type, value, traceback ? traceback : Py_None, nullptr)));
+    if (!printed)
+        PyErr_WriteUnraisable(hook);
+}
+
+/// What the Python binding of the toolkit takes for a hook of the script's own: with the interpreter's it ends the
+/// process for an exception in a slot.
+void setExceptionHook()
+{
+    bp::object const original = getSys().attr("__excepthook__");
+    getSys().attr("excepthook") = bp::import("functools").attr("partial")(original);
+}
+
 } // namespace
 
 Interpreter::Interpreter()
@@ -205,6 +238,7 @@ Interpreter::Interpreter()
     start();
     bp::list path = bp::extract<bp::list>(getSys().attr("path"));
     path.append(toPython(getModuleFolder()));
+    setExceptionHook();
     _threadState = PyEval_SaveThread();
 }
 
@@ -225,8 +259,21 @@ int Interpreter::run(ScriptCall const& call)
     catch (bp::error_already_set const&)
     {
         status = takeError();
-        makeMain();
     }
+    catch (std::exception const& error)
+    {
+        status = 1;
+        _failure = error.what();
+        PySys_FormatStderr("%s\n", error.what());
+    }
+    if (status != 0)
+        attempt(
+            []
+            {
+                makeMain();
+                // A dialog and the functions that hear of its events hold each other.
+                PyGC_Collect();
+            });
     flushOutput();
     return status;
 }
@@ -245,7 +292,8 @@ bool Interpreter::attempt(std::function<void()> const& action)
         if (interrupted)
             PyErr_Clear();
         else
-            PyErr_PrintEx(0);
+            // Not as other errors are printed, which ends the process for `SystemExit`.
+            PyErr_WriteUnraisable(nullptr);
         return !interrupted;
     }
 }
@@ -301,9 +349,10 @@ int Interpreter::takeError()
     }
     _failure = describe(value);
     bool const interrupted = PyErr_GivenExceptionMatches(value, PyExc_KeyboardInterrupt);
-    PyErr_Restore(type, value, traceback);
-    // Nothing of it is kept: a dialog in it would stay open.
-    PyErr_PrintEx(0);
+    print(type, value, traceback);
+    Py_XDECREF(type);
+    Py_XDECREF(value);
+    Py_XDECREF(traceback);
     return interrupted ? interruptedStatus : 1;
 }
 

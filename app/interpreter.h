@@ -8,8 +8,8 @@
 namespace Velmora
 {
 
-/// The Python interpreter of the process. Its lock is held only while Python runs, so that the threads of scripts go on
-/// meanwhile.
+/// The Python interpreter of the process. Its lock is free while the application waits for the user, so that the
+/// threads of scripts go on, and held while a script runs, its dialogs included.
 class Interpreter
 {
 public:
@@ -27,7 +27,7 @@ public:
     /// The last line of the traceback of the script that ran last; empty if it did not fail.
     std::string const& getFailure() const { return _failure; }
 
-    /// Runs what may run Python on its way. What that raises is printed. False if it was Ctrl-C.
+    /// Runs what may run Python on its way, with the lock held. What that raises is printed. False if it was Ctrl-C.
     bool attempt(std::function<void()> const& action);
 
     /// Runs what is pending for the interpreter. True if that is Ctrl-C.

@@ -8,7 +8,7 @@
 #include "base/inBuildInfoUtil.h"
 #include "gfx/wsNative.h"
 
-#include <cstdio>
+#include <fcntl.h>
 #include <filesystem>
 #include <iostream>
 
@@ -24,7 +24,7 @@ void requireScript(ScriptCall const& script)
 {
     std::error_code error;
     if (script.kind == ScriptCall::Kind::File && !std::filesystem::exists(script.target, error))
-        throw UsageError("there is no script \"" + script.target + "\"");
+        throw UsageError("there is no script \"" + script.name + "\"");
 }
 
 int run(CommandLine const& line)
@@ -52,10 +52,19 @@ int run(CommandLine const& line)
     return application.run(line.script, line.exit);
 }
 
+/// What is closed of the standard streams must not become the number of another file, which is then written to.
+void openStandardStreams()
+{
+    for (int stream = 0; stream <= 2; ++stream)
+        if (fcntl(stream, F_GETFD) == -1)
+            static_cast<void>(open("/dev/null", O_RDWR));
+}
+
 } // namespace
 
 int main(int argc, char** argv)
 {
+    openStandardStreams();
     try
     {
         return run(readCommandLine(argc, argv));

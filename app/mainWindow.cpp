@@ -2,12 +2,20 @@
 
 #include "nodeView.h"
 
+#include <QApplication>
 #include <QCloseEvent>
-#include <QLabel>
+#include <QDialog>
+#include <QDialogButtonBox>
+#include <QElapsedTimer>
+#include <QFontDatabase>
 #include <QMenuBar>
+#include <QPlainTextEdit>
+#include <QScreen>
 #include <QSplitter>
 #include <QStatusBar>
+#include <QTextDocument>
 #include <QVBoxLayout>
+#include <QWindow>
 
 #include <algorithm>
 #include <utility>
@@ -18,8 +26,10 @@ namespace Velmora
 namespace
 {
 
-/// The window manager's frame and the panels of a desktop leave at least so much of a small screen.
 constexpr QSize windowSize(1180, 720);
+
+/// What a window manager adds, which is known only when it is too late.
+constexpr QSize windowFrame(8, 40);
 
 QAction* addCommand(QMenu& menu, QString const& text, QKeySequence const& keys, std::function<void()> const& run)
 {
@@ -34,9 +44,14 @@ MainWindow::MainWindow(Commands commands) : _commands(std::move(commands))
 {
     setObjectName(QStringLiteral("Velmora"));
     setWindowTitle(QStringLiteral("Velmora"));
-    resize(windowSize);
+    resize(windowSize.boundedTo(screen()->availableGeometry().size() - windowFrame));
     makePanes();
     makeMenus();
+    _message = new QLabel;
+    _message->setTextFormat(Qt::PlainText);
+    // As wide as there is room, whatever it says.
+    _message->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
+    statusBar()->addWidget(_message, 1);
     tell(tr("Ready"));
 }
 
@@ -51,10 +66,13 @@ void MainWindow::setOwnEnabled(bool enabled)
 
 void MainWindow::showCompositions(std::vector<CompositionEntry> const& entries)
 {
-    auto const current = std::find_if(entries.begin(), entries.end(),
-                                      [](CompositionEntry const& entry) { return entry.isCurrent; });
+    auto const current =
+        std::find_if(entries.begin(), entries.end(), [](CompositionEntry const& entry) { return entry.isCurrent; });
     bool const isOpen = current != entries.end();
-    setWindowTitle(isOpen ? current->name + QStringLiteral("[*] – Velmora") : QStringLiteral("Velmora"));
+    // The mark of changes, which a name can hold as well.
+    QString const mark = QStringLiteral("[*]");
+    QString const name = isOpen ? QString(current->name).replace(mark, mark + mark) : QString();
+    setWindowTitle(isOpen ? name + mark + QStringLiteral(" – Velmora") : QStringLiteral("Velmora"));
     setWindowModified(isOpen && current->isModified);
     _compositions->showCompositions(entries);
     _onComposition->setEnabled(isOpen);
@@ -69,7 +87,38 @@ void MainWindow::showGraph(Kv::RCShdPtr<const Kv::PiGraph> const& graph)
 
 void MainWindow::tell(QString const& text)
 {
-    statusBar()->showMessage(text);
+    _message->setText(text);
+    _message->setToolTip(Qt::convertFromPlainText(text, Qt::WhiteSpaceNormal));
+}
+
+void MainWindow::showText(QString const& title, QString const& text)
+{
+    QDialog dialog(this);
+    dialog.setWindowTitle(title);
+    auto* const view = new QPlainTextEdit(text);
+    view->setReadOnly(true);
+    view->setLineWrapMode(QPlainTextEdit::NoWrap);
+    view->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+    auto* const buttons = new QDialogButtonBox(QDialogButtonBox::Close);
+    connect(buttons, &QDialogButtonBox::rejected, &dialog, &QDialog::reject);
+    auto* const column = new QVBoxLayout(&dialog);
+    column->addWidget(view);
+    column->addWidget(buttons);
+    constexpr QSize size(860, 320);
+    dialog.resize(size.boundedTo(this->size()));
+    dialog.exec();
+    activateWindow();
+}
+
+void MainWindow::paintNow()
+{
+    // A window that has just been opened comes onto the screen a little later.
+    constexpr int patience = 500;
+    QElapsedTimer waited;
+    waited.start();
+    do
+        QApplication::processEvents(QEventLoop::ExcludeUserInputEvents);
+    while (isVisible() && !windowHandle()->isExposed() && !waited.hasExpired(patience));
 }
 
 void MainWindow::closeEvent(QCloseEvent* event)
@@ -93,7 +142,7 @@ void MainWindow::makePanes()
     for (QWidget* const pane : {_browserPlace, _panel, static_cast<QWidget*>(_compositions)})
         panes->addWidget(pane);
     constexpr int sideWidth = 300;
-    constexpr int leastWidth = 200;
+    constexpr int leastWidth = 160;
     _browserPlace->setMinimumWidth(leastWidth);
     _compositions->setMinimumWidth(leastWidth);
     _panel->setMinimumSize(leastWidth, leastWidth);

@@ -3,6 +3,7 @@
 #include "compositionPane.h"
 
 #include <QActionGroup>
+#include <QLabel>
 #include <QMainWindow>
 
 #include <functional>
@@ -54,6 +55,12 @@ public:
     /// Says something in the line at the bottom, until the next.
     void tell(QString const& text);
 
+    /// Shows lines of text in a window of their own, until the user closes it.
+    void showText(QString const& title, QString const& text);
+
+    /// Brings the window up to date on the screen, before something that takes its time.
+    void paintNow();
+
 protected:
     void closeEvent(QCloseEvent* event) override;
 
@@ -69,6 +76,7 @@ private:
     CompositionPane* _compositions = nullptr;
     QMenu* _compositionMenu = nullptr;
     QAction* _runAgain = nullptr;
+    QLabel* _message = nullptr;
     /// Those that need a composition.
     QActionGroup* _onComposition = nullptr;
     QActionGroup* _openOnes = nullptr;

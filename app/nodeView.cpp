@@ -76,8 +76,8 @@ void NodeView::show(Kv::RCShdPtr<const Kv::PiGraph> const& graph)
         auto const column = static_cast<double>(depths[i]);
         auto const row = static_cast<double>(rows[depths[i]]++);
         QRectF const place(column * (boxWidth + columnGap), row * (boxHeight + rowGap), boxWidth, boxHeight);
-        _boxes.push_back(
-            {QString::fromStdString(nodes[i]->getName()), QString::fromStdString(nodes[i]->getType()), place, inputs[i]});
+        _boxes.push_back({QString::fromStdString(nodes[i]->getName()), QString::fromStdString(nodes[i]->getType()),
+                          place, inputs[i]});
         _extent = _extent.expandedTo(QSizeF(place.right(), place.bottom()));
     }
 }
@@ -106,13 +106,14 @@ void NodeView::paintEvent(QPaintEvent*)
 void NodeView::paintHint(QPainter& painter) const
 {
     painter.setPen(palette().color(isEnabled() ? QPalette::Active : QPalette::Disabled, QPalette::PlaceholderText));
-    QString const hint = _hasGraph ? tr("The composition has no nodes") : tr("No composition is open\nCtrl+O opens one");
+    QString const hint =
+        _hasGraph ? tr("The composition has no nodes") : tr("No composition is open\nCtrl+O opens one");
     painter.drawText(rect(), Qt::AlignCenter, hint);
 }
 
 void NodeView::paintLinks(QPainter& painter, Box const& box) const
 {
-    painter.setPen(QPen(palette().color(QPalette::Mid).lighter(150), 2));
+    painter.setPen(QPen(palette().color(QPalette::PlaceholderText), 2));
     painter.setBrush(Qt::NoBrush);
     for (std::size_t const input : box.inputs)
     {

@@ -5,7 +5,7 @@
 namespace Kv
 {
 
-UiAppDisabler::UiAppDisabler() : _window(UiAppMgr::getInstance().getMainWindow())
+UiAppDisabler::UiAppDisabler() : _window(dynamicCast<UiMainWindow>(UiAppMgr::getInstance().getMainWindow()))
 {
     if (_window)
         _window->refuseInput();

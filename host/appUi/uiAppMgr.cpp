@@ -16,7 +16,7 @@ RCShdPtr<UiTopLevel> UiAppMgr::getTopLevel() const
     return _mainWindow;
 }
 
-RCShdPtr<UiMainWindow> UiAppMgr::getMainWindow() const
+RCShdPtr<UiTopLevel> UiAppMgr::getMainWindow() const
 {
     return _mainWindow;
 }

@@ -21,8 +21,8 @@ public:
     /// The application's window. Null in a standalone interpreter, also while a window of a script's own is told.
     RCShdPtr<UiTopLevel> getTopLevel() const;
 
-    /// The application's window under its own class; null in a standalone interpreter.
-    RCShdPtr<UiMainWindow> getMainWindow() const;
+    /// The window in whose root the application's own floating containers stand; null in a standalone interpreter.
+    RCShdPtr<UiTopLevel> getMainWindow() const;
 
     /// The panel of the application's window in which dialogs float; null in a standalone interpreter.
     RCShdPtr<UiPanel> getMainPanel() const;

@@ -1,5 +1,7 @@
 #include "appUi/uiWorkspace.h"
 
+#include "gfx/wsThread.h"
+
 namespace Kv
 {
 
@@ -18,6 +20,8 @@ UiWorkspace::~UiWorkspace() = default;
 
 RCShdPtr<UiWorkspace> UiWorkspace::getCurrentWorkspace()
 {
+    if (getCurrent())
+        WsThread::require("Workspace");
     return getCurrent();
 }
 

@@ -14,7 +14,8 @@ class KVAPPUI_API UiWorkspace : public RCBase<LkCounter<int>>
 public:
     ~UiWorkspace() override;
 
-    /// Null where there is no interactive application.
+    /// Null where there is no interactive application. Throws an `ExBase` on any other thread than that of the user
+    /// interface.
     static RCShdPtr<UiWorkspace> getCurrentWorkspace();
 
     /// For the application: null when it ends.

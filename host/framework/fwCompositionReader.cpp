@@ -7,6 +7,7 @@
 #include "resmgt/xmlError.h"
 
 #include <algorithm>
+#include <cstdint>
 #include <initializer_list>
 
 namespace Kv
@@ -66,7 +67,9 @@ std::string readName(XmlElement const& element, std::set<std::string>& names)
 
 std::vector<FwNode::Description> FwCompositionReader::read(OsFilePath const& path)
 {
-    std::string const text = OsFile(path).read();
+    // Far above any composition. What is larger was hardly meant, and would take the memory that all else needs.
+    constexpr std::uint64_t maxSize = std::uint64_t(256) << 20;
+    std::string const text = OsFile(path).read(maxSize);
     try
     {
         return FwCompositionReader(text)._nodes;

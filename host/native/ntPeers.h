@@ -25,8 +25,8 @@ struct NtColor
     float blue = 0;
 };
 
-/// A widget that the application has made with the toolkit itself: a `QWidget`. Borrowed; it may go before the peer that
-/// adopts it.
+/// A widget that the application has made with the toolkit itself: a `QWidget`. Borrowed; it may go before the peer
+/// that adopts it.
 struct NtForeignWidget
 {
     void* widget = nullptr;

@@ -93,7 +93,7 @@ std::uint64_t OsFile::getSize() const
     return size;
 }
 
-std::string OsFile::read() const
+std::string OsFile::read(std::uint64_t maxSize) const
 {
     // A pipe that nobody writes to would never be open otherwise.
     OsFileDescriptor const file(open(_path.getChars(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
@@ -102,6 +102,8 @@ std::string OsFile::read() const
         fail("read", _path, getSystemWords());
     if (!S_ISREG(status.st_mode))
         fail("read", _path, getNoFileWords(status));
+    if (static_cast<std::uint64_t>(status.st_size) > maxSize)
+        fail("read", _path, "it is larger than " + std::to_string(maxSize) + " bytes");
     std::string content;
     std::array<char, 1 << 16> buffer{};
     for (;;)

@@ -34,8 +34,9 @@ public:
     /// what is there is a directory or something else without a size.
     std::uint64_t getSize() const;
 
-    /// The whole content. Throws `ExBase`, naming the path, where there is no regular file that can be read.
-    std::string read() const;
+    /// The whole content. Throws `ExBase`, naming the path, where there is no regular file that can be read, and for
+    /// one of more than `maxSize` bytes.
+    std::string read(std::uint64_t maxSize) const;
 
     /// Whether `replace` would find what it needs: a regular file that can be written, or none, in a folder that can be
     /// written. A file that nobody may write, by its permissions, cannot be written by the superuser either.

@@ -23,8 +23,8 @@ public:
         std::string words;
     };
 
-    /// By how much the widgets in a container, at any depth, stand out of it as they are placed now, or lack of width, in
-    /// pixels.
+    /// By how much the widgets in a container, at any depth, stand out of it as they are placed now, or lack of width,
+    /// in pixels.
     static GeVector2<int> measureOverflow(UiContainer const& container);
 
     explicit UiLayout(UiContainer const& container);

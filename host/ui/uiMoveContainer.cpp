@@ -20,8 +20,8 @@ constexpr int gripHeight = 24;
 } // namespace
 
 UiMoveContainer::UiMoveContainer(char const* name)
-    : UiContainer(name), _moveCb(this, &UiMoveContainer::onPointerMoved), _downCb(this, &UiMoveContainer::onPointerDown),
-      _upCb(this, &UiMoveContainer::onPointerUp)
+    : UiContainer(name), _moveCb(this, &UiMoveContainer::onPointerMoved),
+      _downCb(this, &UiMoveContainer::onPointerDown), _upCb(this, &UiMoveContainer::onPointerUp)
 {
     setPointerMoveCb(&_moveCb);
     setPointerDownCb(&_downCb);

@@ -3,6 +3,7 @@
 #include "base/inBase.h"
 #include "base/inBuildInfoUtil.h"
 #include "base/inLibraryBuildInfo.h"
+#include "gfx/inGfx.h"
 #include "internalAPI/inInternalApi.h"
 #include "pluginAPI/inPluginApi.h"
 #include "pyinit/inPyextInit.h"
@@ -26,6 +27,7 @@ template <> InInit<KvInit::pyextGraph>::InInit() : InPackageInit("pyextGraph")
     addDependency(InInit<KvInit::scriptingAPI>::getType());
     addDependency(InInit<KvInit::internalAPI>::getType());
     addDependency(InInit<KvInit::pluginAPI>::getType());
+    addDependency(InInit<KvInit::gfx>::getType());
     addDependency(InInit<KvInit::resmgt>::getType());
     addDependency(InInit<KvInit::base>::getType());
 }

@@ -3,6 +3,7 @@
 #include "pygraph/pyGraph.h"
 
 #include "pygraph/pyGraphError.h"
+#include "pygraph/pyManagedGraph.h"
 #include "resmgt/liStringUtil.h"
 
 namespace bp = boost::python;
@@ -75,3 +76,10 @@ PiGraph& Graph::requireWritable() const
 }
 
 } // namespace Kv::PyextGraph
+
+namespace Kv
+{
+
+template class PyManagedObject<RCShdPtr<PyextGraph::Graph>>;
+
+} // namespace Kv

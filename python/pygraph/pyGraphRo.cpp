@@ -2,6 +2,7 @@
 
 #include "pygraph/pyGraphRo.h"
 
+#include "gfx/wsThread.h"
 #include "pygraph/pyGraphError.h"
 #include "resmgt/liStringUtil.h"
 
@@ -92,6 +93,15 @@ GraphRO::Composition GraphRO::findComposition() const
 
 GraphRO::Composition GraphRO::requireComposition() const
 {
+    try
+    {
+        // Whoever shows the composition hears of changes on the thread that they come on.
+        WsThread::require("Graph");
+    }
+    catch (ExBase const& failure)
+    {
+        throw GraphError(__FILE__, __LINE__, failure.getReason());
+    }
     Composition composition = findComposition();
     if (composition.isNull())
         throw GraphError(

@@ -8,6 +8,8 @@
 namespace Kv
 {
 
+extern template class KVPYEXTGRAPH_API PyManagedObject<RCShdPtr<PyextGraph::Graph>>;
+
 /// What Python objects keep of a graph.
 using ManagedGraph = PyManagedObject<RCShdPtr<PyextGraph::Graph>>;
 

@@ -8,7 +8,7 @@ import stage
 from callback_tools import listen, make_dialog, no_wait_is_endless, patient, run_script  # noqa: F401
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
-from PyQt6.QtWidgets import QApplication
+from PyQt6.QtWidgets import QApplication, QPushButton
 
 ACTIVATE, STATE, VALUE_CHANGED = ui.EventType.ACTIVATE, ui.EventType.STATE, ui.EventType.VALUE_CHANGED
 
@@ -279,3 +279,8 @@ def test_close_buttons_of_one_name_close_every_run(user):
     dialog.disableNextClose()
     user.plan(press_one(1), press_one(2))
     assert dialog.launch() == 'CloseButton_OK'
+    namesake = ui.createDialog('Names', ui.makeXmlFromWidgetList(
+        [('ToggleButton', 'CloseButton_X'), ('PushButton', 'CloseButton_X')], ['OK']), 400, 112)
+    for _ in range(2):
+        user.plan(lambda someone: someone.find('CloseButton_X', QPushButton).click())
+        assert namesake.launch() == 'CloseButton_X'

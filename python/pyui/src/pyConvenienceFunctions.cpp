@@ -80,7 +80,7 @@ public:
     /// OK was pressed.
     void onActivate(EvEvent&);
 
-    BrBrowserFloatingHandler& getHandler() const { return *_handler; }
+    BrBrowserFloatingHandler& getHandler() { return *_handler; }
 
     /// What was picked; empty if nothing was.
     OsFilePath const& getPath() const { return _path; }
@@ -202,7 +202,7 @@ OsFilePath showBrowser(std::string const& title, OsFilePath const& initialPath, 
 {
     if (InBuildInfoUtil::getApplicationMode() == ApplicationModes(1))
         throw UiError(__FILE__, __LINE__, "ui.showBrowser() can only be used within Velmora.");
-    PyBrowser const browser(title, initialPath, pathValidationCb);
+    PyBrowser browser(title, initialPath, pathValidationCb);
     BrBrowserFloatingHandler& handler = browser.getHandler();
     UiAppDisabler const disabler;
     RCShdPtr<UiMoveContainer> const container = handler.getContainer();

@@ -31,22 +31,6 @@ namespace Kv::PyextUi
 namespace
 {
 
-/// Takes the Python error that is set off the interpreter for as long as it lives. Windows that go can make others run
-/// Python code, while an exception is on its way through the one who held the dialog.
-class ErrorAside
-{
-public:
-    ErrorAside() { PyErr_Fetch(&_type, &_value, &_traceback); }
-    ErrorAside(ErrorAside const&) = delete;
-    ErrorAside& operator=(ErrorAside const&) = delete;
-    ~ErrorAside() { PyErr_Restore(_type, _value, _traceback); }
-
-private:
-    PyObject* _type = nullptr;
-    PyObject* _value = nullptr;
-    PyObject* _traceback = nullptr;
-};
-
 // In pixels: what the title takes of a window of its own, and of a floating container.
 constexpr int titleHeight = 24;
 constexpr int floatingTitleHeight = 25;
@@ -135,14 +119,12 @@ Dialog::Dialog(std::string const& title, std::string const& xmlString, int width
 
 Dialog::~Dialog()
 {
-    ErrorAside const aside;
+    _errorAside.emplace();
     _container->hide();
     _container->clearParent();
     WidgetCbs::releaseAll(_callbacks);
     WidgetCbs::releaseAll(_closeCallbacks);
     _widgetCbs.reset();
-    _container.reset();
-    _topLevel.reset();
 }
 
 void Dialog::createUi(Positionner const& position)
@@ -153,16 +135,16 @@ void Dialog::createUi(Positionner const& position)
         _width = sizeOnScreen(_width, screen.x);
         _height = sizeOnScreen(_height, screen.y);
     }
-    _width = std::min(_width, maxSize);
-    _height = std::min(_height, maxSize);
+    int const width = std::min(_width, maxSize);
+    int const height = std::min(_height, maxSize);
     if (_topLevel.isNull())
     {
         GeVector2<int> const screen = WsScreen::getInstance().getSize();
         GeRectangle<int> frame;
-        frame.xMin = (screen.x - _width) / 2;
-        frame.yMin = (screen.y - _height) / 2;
-        frame.xMax = frame.xMin + _width;
-        frame.yMax = frame.yMin + _height + titleHeight;
+        frame.xMin = (screen.x - width) / 2;
+        frame.yMin = (screen.y - height) / 2;
+        frame.xMax = frame.xMin + width;
+        frame.yMax = frame.yMin + height + titleHeight;
         RCShdPtr<WsWindowStyle> const style = WsWindowStyleUtils::getNormalWindowStyle(
             frame, 0, BorderStyle(0), TitleBarStyle(0), TaskBarStyle(0), StackingStyle(0), CloseButtonStyle(1));
         _topLevel = UiTopLevel::create(_title.c_str(), _title.c_str(), style, nullptr);
@@ -170,7 +152,7 @@ void Dialog::createUi(Positionner const& position)
         _container = createTopLevelPanel(_topLevel);
     }
     else
-        _container = createFloatingContainer(_width, _height, position.divisions, position.position, _title);
+        _container = createFloatingContainer(width, height, position.divisions, position.position, _title);
     XmlDocument const document(_xml);
     RCShdPtr<XmlElement> const root = document.getRoot();
     UiWidgetFactory::createWidget(_container, *root);
@@ -308,9 +290,11 @@ PyCallables& Dialog::getCallables()
 void Dialog::clearCloseCallbacks()
 {
     for (RCStrongPtr<CallbackSet> const& set : _closeCallbacks)
-        if (RCShdPtr<UiPushButton> const button = dynamicCast<UiPushButton>(getWidget(set->widgetName)))
-            if (!button->getPiWidget()->removeCallback(set->eventType, set->handler.get()))
-                unwireNamesake(*set);
+    {
+        RCShdPtr<UiPushButton> const button = dynamicCast<UiPushButton>(getWidget(set->widgetName));
+        if (!button || !button->getPiWidget()->removeCallback(set->eventType, set->handler.get()))
+            unwireNamesake(*set);
+    }
     WidgetCbs::releaseAll(_closeCallbacks);
 }
 

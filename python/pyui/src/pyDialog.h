@@ -9,11 +9,13 @@
 #include "base/rcStrongPtr.h"
 #include "kvPyextUiExport.h"
 #include "pyCallables.h"
+#include "pyErrorAside.h"
 #include "pyWidgetCbs.h"
 #include "ui/uiContainer.h"
 #include "ui/uiEventCallback.h"
 #include "ui/uiTopLevel.h"
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -43,8 +45,9 @@ public:
         int position;
     };
 
-    /// Builds the dialog. Inside the application it is seen from here on, otherwise from `launch` on. `xmlString` is the description itself, `width` and
-    /// `height` are the size of the content in pixels, where anything below 1 stands for 80 % of the screen.
+    /// Builds the dialog. Inside the application it is seen from here on, otherwise from `launch` on. `xmlString` is
+    /// the description itself, `width` and `height` are the size of the content in pixels, where anything below 1
+    /// stands for 80 % of the screen.
     Dialog(std::string const& title, std::string const& xmlString, int width, int height, Positionner const& position);
     Dialog(Dialog const&) = delete;
     Dialog& operator=(Dialog const&) = delete;
@@ -108,7 +111,7 @@ public:
     bool isEnabled(std::string const& widgetName) const;
 
     /// The callables of the scripts' callbacks, whose references the wrappers of the dialog share.
-    PyCallables& getCallables();
+    KVPYEXTUI_LOCAL PyCallables& getCallables();
 
 protected:
     KVPYEXTUI_LOCAL virtual boost::python::object getWidgetValue(RCShdPtr<UiContainer> container,
@@ -144,6 +147,8 @@ private:
 
     KVPYEXTUI_LOCAL static std::string const _closeButtonClickedKey;
 
+    /// Filled by the destructor, and the last to go.
+    std::optional<ErrorAside> _errorAside;
     std::string _xml;
     std::string _title;
     int _width;

@@ -12,7 +12,10 @@
 #include "internalAPI/piCompositionGraphInterface.h"
 #include "internalAPI/snSelection.h"
 #include "pluginAPI/piNode.h"
+#include "pyCompat.h"
 #include "pyUiError.h"
+
+#include <cstring>
 
 namespace bp = boost::python;
 
@@ -91,7 +94,9 @@ RCShdPtr<UiView> findView(UiWidget const& widget)
 /// In the bytes of the file system, as all paths cross.
 bp::object toPythonPath(LiString const& path)
 {
-    return bp::object(OsFilePath(std::string(path.getChars())));
+    char const* const text = path.getChars();
+    return bp::object(
+        bp::handle<>(PyextUi::PyCompat::pathFromStringAndSize(text, static_cast<Py_ssize_t>(std::strlen(text)))));
 }
 
 } // namespace
@@ -157,5 +162,7 @@ bp::list Workspace::getBrowserSelection()
         paths.append(toPythonPath(Convert::get(item)->getPath()));
     return paths;
 }
+
+template class PyManagedObject<RCShdPtr<PyextGraph::Graph>>;
 
 } // namespace Kv

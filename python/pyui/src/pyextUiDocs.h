@@ -64,6 +64,7 @@ is no display to show the dialog on.)";
 
 constexpr char const* showMessageBox =
     R"(Shows lines of text, and blocks until one of the close buttons is pressed. The box is as wide as its longest line.
+There is no C{showMessage} beside it: a message without a choice is a box without C{closeButtons}.
 
 @param title: The title of the box.
 @type title: C{str}
@@ -327,11 +328,11 @@ constexpr char const* cursorGuardInit =
 
 constexpr char const* browserScheme =
     R"(The constants of this class define the various browser schemes, that is the types of entity that can be browsed. There
-are no instances of it.)";
+are no instances of it. No function of this module takes a scheme or, as C{getBrowserScheme} would, gives one.)";
 
 constexpr char const* workspace =
-    R"(The compositions that the running application has open, and what is selected in its browsers. This class only makes
-sense when scripts are executed in the embedded interpreter. All of its methods are static. Example::
+    R"(The compositions that the running application has open, and what is selected in its browsers. This class
+only makes sense when scripts are executed in the embedded interpreter. All of its methods are static. Example::
 
     if ui.Workspace.getNbCompositions() > 0:
         print( ui.Workspace.getCurrentComposition().getPath() ))";
@@ -341,8 +342,8 @@ constexpr char const* getCurrentComposition =
 
 @return: Composition that is currently opened in the Velmora UI workspace.
 @rtype: L{Graph}
-@raise UiError: If this method is not used within the embedded interpreter, or if there is no current composition in the
-workspace.)";
+@raise UiError: If this method is not used within the embedded interpreter,
+or if there is no current composition in the workspace.)";
 
 constexpr char const* getCompositions =
     R"(Gets all compositions, in the order in which they were opened.
