@@ -141,12 +141,12 @@ void MainWindow::makePanes()
     panes->setChildrenCollapsible(false);
     for (QWidget* const pane : {_browserPlace, _panel, static_cast<QWidget*>(_compositions)})
         panes->addWidget(pane);
-    constexpr int sideWidth = 300;
     constexpr int leastWidth = 160;
     _browserPlace->setMinimumWidth(leastWidth);
     _compositions->setMinimumWidth(leastWidth);
     _panel->setMinimumSize(leastWidth, leastWidth);
-    panes->setSizes({sideWidth, windowSize.width() - 2 * sideWidth + 40, sideWidth - 40});
+    // In shares of the whole.
+    panes->setSizes({width() * 25 / 100, width() * 53 / 100, width() * 22 / 100});
     panes->setStretchFactor(0, 0);
     panes->setStretchFactor(1, 1);
     panes->setStretchFactor(2, 0);
