@@ -81,13 +81,7 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
     _hostWindow->show();
     _hostWindow->getRootContainer()->setFocusWidget(_browser);
     if (script)
-        QTimer::singleShot(0, &_window,
-                           [this, script = *script, exit]
-                           {
-                               int const status = runScript(script);
-                               if (exit || _closing)
-                                   QApplication::exit(status);
-                           });
+        startScript(*script, exit);
     _signalTimer.start(signalInterval);
     int const status = QApplication::exec();
     _signalTimer.stop();
@@ -103,7 +97,7 @@ Commands Application::makeCommands()
     commands.saveComposition = [this] { saveComposition(); };
     commands.closeComposition = [this] { closeComposition(); };
     commands.runScript = [this] { askScript(); };
-    commands.runScriptAgain = [this] { startScript(*_lastScript); };
+    commands.runScriptAgain = [this] { startScript(*_lastScript, false); };
     commands.showBuildInfo = [this] { showBuildInfo(); };
     commands.makeCurrent = [this](int place) { makeCurrent(place); };
     commands.step = [this](int places) { step(places); };
@@ -134,14 +128,14 @@ void Application::makeHost()
     UiAppMgr::getInstance().setApplication(_hostWindow, _panel, findView(*_browser));
 }
 
-void Application::startScript(ScriptCall const& script)
+void Application::startScript(ScriptCall const& script, bool exit)
 {
     // Later: what asked for it, a menu for one, has first to give the keyboard back.
     QTimer::singleShot(0, &_window,
-                       [this, script]
+                       [this, script, exit]
                        {
                            int const status = runScript(script);
-                           if (_closing)
+                           if (exit || _closing)
                                QApplication::exit(status);
                        });
 }
@@ -219,7 +213,7 @@ void Application::askScript()
 {
     std::string const path = askPath(QObject::tr("Run Script"));
     if (!path.empty())
-        startScript(ScriptCall::makeFile(path, {}));
+        startScript(ScriptCall::makeFile(path, {}), false);
 }
 
 void Application::saveComposition()
@@ -231,8 +225,24 @@ void Application::saveComposition()
     QString const name = toText(composition->getGraph()->getName());
     if (!composition->isModified())
         _window.tell(QObject::tr("%1 has no changes to save").arg(name));
-    else if (attempt([&] { _workspace->save(current); }))
+    else if (save(current))
         _window.tell(QObject::tr("%1 is saved").arg(name));
+}
+
+bool Application::save(Composition const& composition)
+{
+    Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const accessor(composition);
+    if (!accessor->isChangedOnDisk())
+        return attempt([&] { _workspace->save(composition); });
+    QMessageBox box(QMessageBox::Warning, QObject::tr("Velmora"),
+                    QObject::tr("%1 has been changed on disk since it was opened. Save over these changes?")
+                        .arg(toText(accessor->getGraph()->getName())),
+                    QMessageBox::Save | QMessageBox::Cancel, &_window);
+    box.setDefaultButton(QMessageBox::Cancel);
+    box.setTextFormat(Qt::PlainText);
+    int const answer = box.exec();
+    _window.activateWindow();
+    return answer == QMessageBox::Save && attempt([&] { _workspace->saveOver(composition); });
 }
 
 void Application::closeComposition()
@@ -282,7 +292,7 @@ bool Application::confirmLoss(std::vector<Composition> const& compositions)
         box.setTextFormat(Qt::PlainText);
         int const answer = box.exec();
         _window.activateWindow();
-        bool const isSaved = answer == QMessageBox::Save && attempt([&] { _workspace->save(composition); });
+        bool const isSaved = answer == QMessageBox::Save && save(composition);
         if (!isSaved && answer != QMessageBox::Discard)
             return false;
     }

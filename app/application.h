@@ -40,7 +40,8 @@ private:
     Commands makeCommands();
     void makeHost();
 
-    void startScript(ScriptCall const& script);
+    /// Runs a script once the loop has come around, and then ends the application where `exit` is set.
+    void startScript(ScriptCall const& script, bool exit);
     int runScript(ScriptCall const& script);
     void checkSignals();
     /// Ctrl-C: the application ends, unless the user wants to keep changes.
@@ -53,6 +54,8 @@ private:
     void askComposition();
     void askScript();
     void saveComposition();
+    /// Asks first if that would undo what others have written. True if it is saved.
+    bool save(Composition const& composition);
     void closeComposition();
     void makeCurrent(int place);
     void step(int places);

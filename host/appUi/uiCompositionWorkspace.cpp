@@ -64,6 +64,11 @@ void UiCompositionWorkspace::save(RCWeakPtr<const PiCompositionGraphInterface> c
     require(composition)->save();
 }
 
+void UiCompositionWorkspace::saveOver(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
+{
+    require(composition)->saveOver();
+}
+
 void UiCompositionWorkspace::makeCurrent(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
 {
     setCurrent(require(composition));

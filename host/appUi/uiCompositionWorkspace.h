@@ -43,8 +43,11 @@ public:
     void close(RCWeakPtr<const PiCompositionGraphInterface> const& composition);
 
     /// Writes the file of the composition. Throws `ExBase` for one that has been closed, and where it cannot be
-    /// written.
+    /// written or is changed on disk.
     void save(RCWeakPtr<const PiCompositionGraphInterface> const& composition);
+
+    /// The same, also where the file is changed on disk.
+    void saveOver(RCWeakPtr<const PiCompositionGraphInterface> const& composition);
 
     /// Throws `ExBase` for a composition that has been closed.
     void makeCurrent(RCWeakPtr<const PiCompositionGraphInterface> const& composition);

@@ -6,6 +6,7 @@
 #include "framework/fwCompositionWriter.h"
 #include "framework/fwGraph.h"
 #include "framework/fwNode.h"
+#include "resmgt/liStringUtil.h"
 #include "resmgt/osFile.h"
 
 #include <utility>
@@ -32,8 +33,11 @@ std::string getCompositionName(OsFilePath const& path)
 RCStrongPtr<FwComposition> FwComposition::open(OsFilePath const& path)
 {
     OsFilePath const canonical = path.getCanonical();
+    // Before it is read: what comes in between counts as a change.
+    std::string const version = OsFile(canonical).getVersion();
     std::vector<FwNode::Description> nodes = FwCompositionReader::read(canonical);
     RCStrongPtr<FwComposition> composition(std::shared_ptr<FwComposition>(new FwComposition(canonical)));
+    composition->_version = version;
     std::string const name = getCompositionName(canonical);
     composition->_node =
         makeShd<FwNode>(composition, FwNode::Description{name, FwCompositionFormat::composition, {}, {}});
@@ -75,9 +79,26 @@ bool FwComposition::isModified() const
     return _isModified;
 }
 
+bool FwComposition::isChangedOnDisk() const
+{
+    std::string const version = OsFile(_path).getVersion();
+    return !version.empty() && version != _version;
+}
+
 void FwComposition::save()
 {
-    OsFile(_path).replace(FwCompositionWriter::write(*_graph));
+    if (isChangedOnDisk())
+        throw ExBase(__FILE__, __LINE__,
+                     "Cannot save " + LiStringUtil::getPrintable(_path.toString()) +
+                         ": the file has been changed on disk since it was opened");
+    saveOver();
+}
+
+void FwComposition::saveOver()
+{
+    OsFile const file(_path);
+    file.replace(FwCompositionWriter::write(*_graph));
+    _version = file.getVersion();
     _isModified = false;
     if (_listener)
         _listener->compositionSaved(*this);

@@ -35,7 +35,9 @@ public:
     OsFilePath const& getPath() const override;
     bool isEditable() const override;
     bool isModified() const override;
+    bool isChangedOnDisk() const override;
     void save() override;
+    void saveOver() override;
 
     /// Borrowed; null for none. Takes the place of the one before.
     void setListener(FwCompositionListener* listener);
@@ -48,6 +50,8 @@ private:
     void noteChange();
 
     OsFilePath _path;
+    /// That of the file as it was read or written last.
+    std::string _version;
     RCShdPtr<FwNode> _node;
     RCShdPtr<FwGraph> _graph;
     bool _isModified = false;

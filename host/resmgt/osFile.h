@@ -38,6 +38,9 @@ public:
     /// one of more than `maxSize` bytes.
     std::string read(std::uint64_t maxSize) const;
 
+    /// A text that is another one once the file has been written or replaced; empty where there is no regular file.
+    std::string getVersion() const;
+
     /// Whether `replace` would find what it needs: a regular file that can be written, or none, in a folder that can be
     /// written. A file that nobody may write, by its permissions, cannot be written by the superuser either.
     bool isWritable() const;

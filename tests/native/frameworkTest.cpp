@@ -213,6 +213,22 @@ TEST_F(Compositions, CanBeEditedWhereTheDiskCanBeWrittenNow)
     expectContains(wordsOf([&] { composition->save(); }), "it is a folder");
 }
 
+TEST_F(Compositions, AreNotSavedOverWhatOthersHaveWrittenUnlessToldTo)
+{
+    write("shot.vmcomposition", grade);
+    RCStrongPtr<FwComposition> const composition = open("shot.vmcomposition");
+    composition->getGraph()->setNodeValue("Read", "file", "mine");
+    EXPECT_FALSE(composition->isChangedOnDisk());
+    write("shot.vmcomposition", "of another, and longer than before" + std::string(grade));
+    EXPECT_TRUE(composition->isChangedOnDisk());
+    expectContains(wordsOf([&] { composition->save(); }), "changed on disk");
+    expectContains(read("shot.vmcomposition"), "of another");
+    EXPECT_TRUE(composition->isModified());
+    composition->saveOver();
+    expectContains(read("shot.vmcomposition"), "mine");
+    EXPECT_FALSE(composition->isChangedOnDisk() || composition->isModified());
+}
+
 TEST_F(Compositions, AreSavedWhereTheirLinksLead)
 {
     fs::create_directory("versions");
