@@ -216,8 +216,7 @@ def test_the_workspace_knows_what_is_selected_in_it(user, files):
 
 @pytest.mark.inside
 def test_the_workspace_knows_of_no_selection_where_a_field_has_the_keyboard(user, files):
-    dialog = ui.createDialog('Form', ui.makeXmlFromWidgetList([('TextField', 'Text', 'Text', ''), ('PushButton', 'Look')]),
-                             300, 200)
+    dialog = ui.createDialog('Form', ui.makeXmlFromWidgetList([('TextField', 'Text')]), 300, 200)
     seen = []
     dialog.addCallback('Text', ui.EventType.VALUE_CHANGED, lambda *_: seen.append(
         (user.focus(), ui.Workspace.getBrowserSelection())))
