@@ -8,6 +8,7 @@ import traceback
 import pytest
 
 import stage
+from desk import Desk
 from user import User
 
 
@@ -44,6 +45,13 @@ def screen():
     yield ':' + number
     server.terminate()
     server.wait()
+
+
+@pytest.fixture
+def desk(screen):
+    someone = Desk(screen)
+    yield someone
+    someone.close()
 
 
 @pytest.fixture(autouse=True)

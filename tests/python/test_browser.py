@@ -1,5 +1,6 @@
 """Scripts ask the user for a path, and the user walks through the files to it."""
 
+import itertools
 import os
 
 import pytest
@@ -138,14 +139,38 @@ def test_a_path_that_is_refused_keeps_it_open_and_one_that_is_given_comes_back_a
 
 
 @pytest.mark.inside
+def test_what_is_refused_for_ever_can_be_cancelled(user, files):
+    calls = []
+
+    def refuse(*paths):
+        calls.append(paths)
+        return ''
+
+    assert browse(user, ok, last, ok, ok, cancel, initialPath=files, pathValidationCb=refuse) == ''
+    assert [os.path.basename(path) for path, _ in calls] == ['', '\udcff.txt', '\udcff.txt']
+
+
+@pytest.mark.inside
+def test_the_last_of_very_many_files_is_picked_with_keys(user, tmp_path):
+    for letters in itertools.product('abcdefghij', repeat=4):
+        (tmp_path / ''.join(letters)).touch()
+
+    def count(user):
+        assert len(rows(user)) == 10000
+
+    assert browse(user, count, last, ok, initialPath=str(tmp_path)) == str(tmp_path / 'jjjj')
+
+
+@pytest.mark.inside
 def test_what_the_callback_does_wrong_comes_out_and_leaves_nothing_behind(user, files):
     def fail(*_):
         raise KeyError('mine')
 
     with pytest.raises(KeyError, match='mine'):
         browse(user, ok, initialPath=files, pathValidationCb=fail)
-    with pytest.raises(TypeError):
-        browse(user, ok, initialPath=files, pathValidationCb=lambda *_: 5)
+    for no_path in 5, None:
+        with pytest.raises(TypeError):
+            browse(user, ok, initialPath=files, pathValidationCb=lambda *_: no_path)
     assert user.window() is None and browse(user, ok, initialPath=files) == files
 
 
@@ -187,3 +212,19 @@ def test_the_workspace_knows_what_is_selected_in_it(user, files):
     browse(user, pick('notes', Qt.Key.Key_Return), initialPath=files, pathValidationCb=look)
     browse(user, lambda user: user.find('Browser.list').setFocus(), lambda user: look(), ok, initialPath=files)
     assert seen == [[files + '/notes.txt'], []]
+
+
+@pytest.mark.inside
+def test_the_workspace_knows_of_no_selection_where_a_field_has_the_keyboard(user, files):
+    dialog = ui.createDialog('Form', ui.makeXmlFromWidgetList([('TextField', 'Text')]), 300, 200)
+    seen = []
+    dialog.addCallback('Text', ui.EventType.VALUE_CHANGED, lambda *_: seen.append(
+        (user.focus(), ui.Workspace.getBrowserSelection())))
+
+    def end_edit(user):
+        user.type('typed')
+        user.press(Qt.Key.Key_Return)
+
+    user.plan(end_edit, lambda user: user.close())
+    dialog.launch()
+    assert seen == [('Text', [])]

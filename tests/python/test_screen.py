@@ -1,72 +1,16 @@
 """A script on a real display, without a window manager, in front of a user who has nothing but keys and a mouse."""
 
-import subprocess
 import sys
-import threading
-import time
-
-import pytest
-
-from scripts import environment
-
-PATIENCE = 30  # seconds
-
-
-class Desk:
-    """The keyboard and the mouse of a display, and what stands on it."""
-
-    def __init__(self, display):
-        self._environment = environment(DISPLAY=display)
-        self._scripts = []
-
-    def start(self, script):
-        process = subprocess.Popen([sys.executable, '-u', '-c', script], env=self._environment, text=True,
-                                   stdout=subprocess.PIPE)
-        limit = threading.Timer(PATIENCE, process.kill)
-        limit.start()
-        self._scripts.append((process, limit))
-        return process
-
-    def run(self, *arguments):
-        done = subprocess.run(['xdotool', *map(str, arguments)], env=self._environment, capture_output=True, text=True,
-                              timeout=PATIENCE)
-        return done.stdout.split()
-
-    def wait_for_window(self, title):
-        """Waits until a window of that title has the keyboard, and gives its identity."""
-        end = time.monotonic() + PATIENCE
-        while time.monotonic() < end:
-            found = self.run('search', '--onlyvisible', '--name', '^%s$' % title)
-            if found and found == self.run('getwindowfocus', '-f'):
-                return found[0]
-            time.sleep(0.02)
-        raise AssertionError('no window "%s" has the keyboard' % title)
-
-    def click(self, window, x, from_bottom):
-        geometry = dict(line.split('=') for line in self.run('getwindowgeometry', '--shell', window))
-        self.run('mousemove', int(geometry['X']) + x, int(geometry['Y']) + int(geometry['HEIGHT']) - from_bottom)
-        self.run('click', 1)
-
-    def close(self):
-        for process, limit in self._scripts:
-            limit.cancel()
-            process.kill()
-            process.wait()
-            process.stdout.close()
-
-
-@pytest.fixture
-def desk(screen):
-    someone = Desk(screen)
-    yield someone
-    someone.close()
-
 
 OK_BUTTON = 49, 21  # from the left and from the bottom edge of a window
 
 
+def start(desk, script):
+    return desk.start(sys.executable, '-u', '-c', script)
+
+
 def test_a_form_is_filled_in_by_keys_and_closed_by_the_mouse(desk):
-    script = desk.start('''
+    script = start(desk, '''
 from quorvane_velmora import ui
 values = ui.showSimpleDialog('Awards 1', [('TextField', 'Show', 'Show'), ('ToggleButton', 'Win', 'Win'),
                                           ('TextField', 'Speech', 'Speech'),
@@ -78,7 +22,7 @@ print(sorted(values.items()))
     desk.run('key', 'Tab', 'space', 'Tab')
     desk.run('type', 'Thank you')
     desk.run('key', 'Return', 'Tab', 'Down')
-    desk.click(window, *OK_BUTTON)
+    desk.click_in(window, *OK_BUTTON)
     assert script.communicate()[0] == (
         "[('CloseButtonClicked', 'CloseButton_OK'), ('Prize', 'two'), ('Show', 'Oscars'), ('Speech', 'Thank you'), "
         "('Win', True)]\n")
@@ -86,7 +30,7 @@ print(sorted(values.items()))
 
 
 def test_a_dialog_gets_the_keys_each_time_it_opens_and_again_after_a_box_above_it(desk):
-    script = desk.start('''
+    script = start(desk, '''
 from quorvane_velmora import ui
 dialog = ui.createDialog('Again', ui.makeXmlFromWidgetList([('TextField', 'a'), ('PushButton', 'Ask')],
                                                            ['OK', 'Cancel']), 300, 120)

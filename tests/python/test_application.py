@@ -1,0 +1,368 @@
+"""The application as a whole, in a process of its own, as it is started from a terminal."""
+
+import os
+import pathlib
+import re
+import subprocess
+import sys
+import textwrap
+import zipfile
+
+import pytest
+
+from quorvane_velmora import ui
+from scripts import environment
+
+PROGRAM = str(pathlib.Path(ui.__file__).parents[3] / 'bin' / 'velmora')
+PACKAGES = {'base', 'resmgt', 'pluginAPI', 'internalAPI', 'framework', 'gfx', 'ui', 'appUi', 'scriptingAPI',
+            'pyextInit', 'pyextGraph', 'pyextUi'}
+COMPOSITION = '''<composition>
+  <node name="Plate" type="Read">
+    <value name="file" text="a.exr"/>
+  </node>
+</composition>
+'''
+
+# A user inside the process who does each step at the end of a run, given by its number and what the bottom line says.
+WATCHING = '''
+import stage
+from PyQt6.QtCore import QTimer
+from PyQt6.QtGui import QAction
+from PyQt6.QtWidgets import QApplication, QPushButton
+
+runs, plan = 0, []
+
+def trigger(label):
+    action, = (one for one in stage.APPLICATION.findChildren(QAction) if one.text().replace('&', '') == label)
+    assert action.isEnabled(), label
+    action.trigger()
+
+def answer(label):
+    box = QApplication.activeModalWidget()
+    buttons = box.findChildren(QPushButton) if box else []
+    if not buttons:
+        QTimer.singleShot(5, lambda: answer(label))
+    for button in buttons:
+        if button.text().replace('&', '') == label:
+            button.click()
+
+def proceed():
+    if plan and plan[0][0] == runs and plan[0][1] in stage.APPLICATION.statusBar().currentMessage():
+        plan.pop(0)[2]()
+
+timer = QTimer(stage.APPLICATION)
+timer.timeout.connect(proceed)
+timer.start(5)
+'''
+
+
+def write(folder, **texts):
+    for name, text in texts.items():
+        (folder / (name + '.py')).write_text(textwrap.dedent(text))
+
+
+def run(folder, *command, platform='offscreen', **options):
+    """Runs a program to its end, and gives its status, as a shell tells it, and what it said."""
+    chosen = {'QT_QPA_PLATFORM': platform} if platform else {}
+    settings = environment(QT_LOGGING_RULES='default.warning=false', **chosen)
+    done = subprocess.run(command, cwd=folder, env=settings, capture_output=True, timeout=60, **options)
+    status = done.returncode if done.returncode >= 0 else 128 - done.returncode
+    return status, done.stdout.decode(), done.stderr.decode()
+
+
+def run_inside(folder, script, *options, plan=''):
+    """Runs a script in the application until that ends, and gives its status, the lines that it printed, and what it
+    said of errors."""
+    write(folder, script=script, watching=WATCHING + textwrap.dedent(plan))
+    status, printed, errors = run(folder, PROGRAM, *options, 'script.py')
+    return status, printed.splitlines(), errors
+
+
+def test_it_tells_how_it_is_used_and_what_it_is_made_of(tmp_path):
+    status, usage, errors = run(tmp_path, PROGRAM, '--help', platform=None)
+    assert (status, errors) == (0, '') and all(option in usage for option in ('--open', '--exit', '-m', '--build-info'))
+    status, table, errors = run(tmp_path, PROGRAM, '--build-info', platform=None)
+    rows = [row.split(None, 2) for row in table.splitlines()]
+    assert (status, errors) == (0, '') and {row[0] for row in rows} == PACKAGES and len(rows) == 12
+    for package, library, details in rows:
+        assert library == ('libKvpyextUi' if package == 'pyextUi' else 'libKV' + package)
+        assert re.fullmatch(r'Quorvane Velmora Library 8\.0 \(2013\), '
+                            r'build 2600 of [A-Z][a-z]{2} [ \d]\d \d{4}, [\w.]+', details), details
+
+
+@pytest.mark.parametrize('arguments, status, words', [
+    (['--nonsense'], 2, '--nonsense is no option'), (['-x'], 2, '-x is no option'),
+    (['--open'], 2, '--open needs an argument'), (['-m'], 2, '-m needs an argument'),
+    (['--exit'], 2, '--exit needs a script'), (['nothing.py'], 2, 'there is no script "nothing.py"'),
+    (['script.py'], 1, 'there is no display: DISPLAY is not set'),
+])
+def test_what_it_cannot_do_without_a_display_it_says_and_ends(tmp_path, arguments, status, words):
+    write(tmp_path, script='print("has run")')
+    ended, printed, errors = run(tmp_path, PROGRAM, *arguments, platform=None)
+    assert (ended, printed) == (status, '') and words in errors
+
+
+@pytest.mark.parametrize('name, words', [('none', 'No such file'), ('bad', 'is no composition: line 3')])
+def test_a_composition_that_cannot_be_opened_is_told_before_the_script_runs(tmp_path, name, words):
+    (tmp_path / 'good.vmcomposition').write_text(COMPOSITION)
+    (tmp_path / 'bad.vmcomposition').write_text('<composition>\n  <node name="Plate" type="Read">\n</composition>\n')
+    write(tmp_path, script='print("has run")')
+    status, printed, errors = run(tmp_path, PROGRAM, '--open', 'good.vmcomposition', '--open', name + '.vmcomposition',
+                                  '--exit', 'script.py')
+    assert (status, printed) == (1, '') and name + '.vmcomposition' in errors and words in errors
+
+
+SHOW = '''
+import os, sys, __main__
+print(ascii([__name__, __file__, sys.argv, sys.path[0], __package__, __spec__ and __spec__.name, type(__loader__)]))
+print(__main__.__dict__ is globals(), sys.executable, type(__builtins__), sys.flags, sys.stdout.encoding)
+'''
+FAILING = '''
+class Unwilling(Exception): pass
+def fail():
+    raise Unwilling('\u00fc', b'\\xff')
+try:
+    fail()
+except Unwilling as failure:
+    raise KeyError('why') from failure
+'''
+ENDING = '''
+import atexit, sys, threading, time
+class Kept:
+    def __del__(self): print('gone')
+kept = Kept()
+atexit.register(print, 'at exit')
+threading.Thread(target=lambda: (time.sleep(0.1), print('thread'))).start()
+print('no end of line', end='')
+'''
+
+
+@pytest.fixture
+def scripts(tmp_path):
+    write(tmp_path, show=SHOW, failing=FAILING, ending=ENDING, names='print(sorted(globals()))', syntax='x = = 1',
+          three='import sys; sys.exit(3)', words='import sys; sys.exit("w\\udc80rds")', none='raise SystemExit',
+          huge='raise SystemExit(-2 ** 70)', pair='raise SystemExit((1, 2))', interrupt='raise KeyboardInterrupt',
+          control_c='import os, signal; os.kill(os.getpid(), signal.SIGINT); input()', hook='''
+              import sys
+              sys.excepthook = lambda kind, *_: print('hooked', kind)
+              nonsense''', imports='import failing', full='import sys; sys.stdout = open("/dev/full", "w"); print(1)')
+    for folder in 'package', 'folder', 'empty':
+        (tmp_path / folder).mkdir()
+    (tmp_path / 'package' / '__init__.py').write_text('')
+    for path in ('package/__main__.py', 'package/module.py', 'folder/__main__.py', 'sk\u00fc\u6f22 x.py',
+                 os.fsdecode(b'\xff.py')):
+        (tmp_path / path).write_text(SHOW)
+    (tmp_path / 'link.py').symlink_to('package/module.py')
+    with zipfile.ZipFile(tmp_path / 'archive.zip', 'w') as archive:
+        archive.writestr('__main__.py', SHOW)
+    return tmp_path
+
+
+@pytest.mark.parametrize('arguments', [
+    ['show.py', 'a', '--open', '', '-m', '--exit'], ['package/../show.py'], ['link.py'], ['--', 'show.py', '--'],
+    ['sk\u00fc\u6f22 x.py', '\u00fc'], [b'\xff.py', b'\xfe'], ['-m', 'package.module', 'a', '--exit'],
+    ['-m', 'package'], ['-m', 'nothing'], ['folder', 'a'], ['archive.zip', 'a'], ['empty'], ['three.py'], ['words.py'],
+    ['none.py'], ['huge.py'], ['pair.py'], ['failing.py'], ['syntax.py'], ['imports.py'], ['-m', 'failing'],
+    ['hook.py'], ['interrupt.py'], ['control_c.py'], ['ending.py'], ['full.py'], ['names.py'],
+], ids=ascii)
+def test_a_script_runs_and_ends_as_in_the_interpreter_itself(scripts, arguments):
+    assert run(scripts, PROGRAM, '--exit', *arguments) == run(scripts, sys.executable, *arguments)
+
+
+def test_a_script_that_fails_leaves_the_application_running_and_can_be_run_again(tmp_path):
+    status, printed, errors = run_inside(tmp_path, '''
+        import watching
+        from quorvane_velmora import ui
+
+        def fail(*_):
+            raise ValueError('out of a callback')
+
+        watching.runs += 1
+        description = ui.makeXmlFromWidgetList([('PushButton', 'Fails')])
+        dialog = ui.createDialog('run %d' % watching.runs, description, 300, 200)
+        dialog.addCallback('Fails', ui.EventType.ACTIVATE, fail)
+        if watching.runs == 1:
+            raise KeyError('mine')
+        ''', plan='''
+        def run_again():
+            print(stage.titles())
+            trigger('Run Script Again')
+
+        def press_and_close():
+            stage.dialogs()[0].findChild(QPushButton, 'Fails').click()
+            print(stage.titles(), stage.APPLICATION.close())
+
+        plan += [(1, 'script.py has failed: KeyError', run_again), (2, 'script.py has ended', run_again),
+                 (3, 'script.py has ended', press_and_close)]
+        ''')
+    assert (status, printed) == (0, ['[]', "['run 2']", "['run 3'] True"]), errors
+    assert "KeyError: 'mine'" in errors and errors.endswith('ValueError: out of a callback\n')
+
+
+@pytest.mark.parametrize('exit', [[], ['--exit']])
+@pytest.mark.parametrize('inner', ['inner.launch()', 'ui.showBrowser("Pick")',
+                                   'ui.showBrowser("Pick", "/", lambda *_: inner.launch())'])
+def test_its_window_can_be_closed_under_dialogs_and_the_script_comes_to_its_own_end(tmp_path, inner, exit):
+    status, printed, errors = run_inside(tmp_path, '''
+        import stage, sys
+        from callback_tools import PatientUser, make_dialog, ui
+        outer, inner = make_dialog('outer'), make_dialog('inner')
+        outer.addCallback('Button', ui.EventType.ACTIVATE, lambda *_: print(repr(%s)))
+        user = PatientUser()
+        user.plan(lambda user: user.click('Button'), *[lambda user: user.click('OK')] * %d,
+                  lambda user: stage.APPLICATION.close())
+        print(repr(outer.launch()))
+        user.stop()
+        assert not user.failures, user.failures
+        for show in outer.launch, lambda: ui.showMessageBox('Box', ['text']), lambda: ui.showBrowser('Pick'):
+            try:
+                show()
+            except RuntimeError as refusal:
+                print(refusal)
+        assert outer.getValue('Text') == 'old'
+        sys.exit(7)
+        ''' % (inner, inner.count('lambda')), *exit)
+    assert status == 7 and printed[:2] == ["''", "''"], errors
+    assert len(printed) == 5 and len(set(printed[2:])) == 1 and 'clos' in printed[2], printed
+
+
+WORKSPACE = '''
+    import os, stage, watching
+    from quorvane_velmora import graph, ui
+    from xml.etree import ElementTree
+    workspace = ui.Workspace
+
+    def refused(call, *arguments):
+        try:
+            call(*arguments)
+        except (RuntimeError, graph.GraphError, ui.UiError) as refusal:
+            print(refusal)
+        else:
+            raise AssertionError('not refused')
+'''
+
+
+def run_in_workspace(folder, script):
+    for name in 'shot', 'locked':
+        (folder / (name + '.vmcomposition')).write_text(COMPOSITION)
+    (folder / 'locked.vmcomposition').chmod(0o444)
+    (folder / 'link').symlink_to('shot.vmcomposition')
+    status, printed, errors = run_inside(folder, textwrap.dedent(WORKSPACE) + textwrap.dedent(script), '--open',
+                                         'shot.vmcomposition', '--open', 'locked.vmcomposition', '--exit')
+    assert status == 0, errors
+    return printed
+
+
+def test_scripts_find_the_open_compositions_and_change_those_that_can_be_written(tmp_path):
+    printed = run_in_workspace(tmp_path, '''
+        shot, locked = workspace.getCompositions()
+        assert (shot.getName(), locked.getName(), workspace.getNbCompositions()) == ('shot', 'locked', 2)
+        assert shot.isWritable() and not locked.isWritable() and workspace.getCurrentComposition() == locked
+        for path in 'shot.vmcomposition', os.path.abspath('link'), locked.getPath():
+            assert workspace.isCompositionOpened(path), path
+        assert not workspace.isCompositionOpened('none.vmcomposition')
+        refused(locked.setNodeValue, 'Plate', 'file', 'b.exr')
+        refused(locked.save)
+        workspace.openComposition(shot)
+        assert workspace.getCurrentComposition() == shot and stage.APPLICATION.windowTitle().startswith('shot')
+        shot.setNodeValue('Plate', 'file', 'b & <c>"\u00fc.exr')
+        assert stage.APPLICATION.isWindowModified()
+        shot.save()
+        assert not stage.APPLICATION.isWindowModified()
+        value, = ElementTree.parse('shot.vmcomposition').iter('value')
+        assert value.get('text') == 'b & <c>"\u00fc.exr'
+        os.chmod('locked.vmcomposition', 0o644)
+        assert workspace.getCompositions()[1].isWritable()
+        shot.setNodeValue('Plate', 'file', 'd.exr')
+        os.chmod('shot.vmcomposition', 0o444)
+        refused(shot.setNodeValue, 'Plate', 'file', 'e.exr')
+        refused(shot.save)
+        os.remove('shot.vmcomposition')
+        assert workspace.isCompositionOpened('shot.vmcomposition') and workspace.getCompositions()[0] == shot
+        assert shot.getNodeValues('Plate') == {'file': 'd.exr'}
+        shot.save()
+        assert 'd.exr' in open('shot.vmcomposition').read()
+        ''')
+    expected = 'read-only', 'read-only', 'cannot be written', 'permissions'
+    assert len(printed) == 4 and all(words in line for words, line in zip(expected, printed)), printed
+
+
+def test_a_composition_that_the_user_closes_is_lost_to_the_script_that_has_it(tmp_path):
+    printed = run_in_workspace(tmp_path, '''
+        shot, locked = workspace.getCompositions()
+        workspace.openComposition(shot)
+        shot.setNodeValue('Plate', 'file', 'b.exr')
+        for label, count in ('Cancel', 2), ('Discard', 1):
+            watching.answer(label)
+            watching.trigger('Close Composition')
+            assert workspace.getNbCompositions() == count, label
+        for call in shot.getNodes, shot.save, lambda: workspace.openComposition(shot):
+            refused(call)
+        assert workspace.getCurrentComposition() == locked and 'closed' in repr(shot)
+        watching.trigger('Close Composition')
+        assert workspace.getCompositions() == [] and not workspace.isCompositionOpened('locked.vmcomposition')
+        refused(workspace.getCurrentComposition)
+        assert 'a.exr' in open('shot.vmcomposition').read()
+        ''')
+    assert len(printed) == 4 and all('closed' in words for words in printed[:3])
+    assert printed[3] == 'There is no current composition.'
+
+
+def test_a_script_that_is_picked_with_keys_alone_learns_what_is_selected(desk, tmp_path):
+    files = tmp_path / 'files'
+    files.mkdir()
+    for name in 'alpha.exr', 'notes.txt', 'zebra.exr':
+        (files / name).write_text('')
+    write(tmp_path, look='''
+        import stage
+        from quorvane_velmora import ui
+        from PyQt6.QtWidgets import QApplication, QTreeView
+        while stage.APPLICATION.findChild(QTreeView, 'Browser.list').model().rowCount() < 3:
+            QApplication.processEvents()
+        print(ui.Workspace.getBrowserSelection(), flush=True)
+        ''')
+
+    def run_script():
+        desk.run('key', 'alt+f', 'r', 'ctrl+l')
+        desk.run('type', str(tmp_path / 'look.py'))
+        desk.run('key', 'Return', 'Tab', 'space')  # the list, OK
+        return application.stdout.readline()
+
+    application = desk.start(PROGRAM, cwd=files)
+    desk.wait_for_window('Velmora')
+    assert run_script() == '[]\n'
+    desk.run('type', 'notes')
+    assert run_script() == "['%s/notes.txt']\n" % files
+    desk.run('key', 'shift+Down', 'ctrl+shift+r')
+    assert application.stdout.readline() == "['{0}/notes.txt', '{0}/zebra.exr']\n".format(files)
+    desk.run('key', 'ctrl+q')
+    assert application.wait() == 0
+
+
+def test_a_dialog_is_dragged_by_its_title_filled_in_by_keys_and_closed_where_it_stands(desk, tmp_path):
+    write(tmp_path, form='''
+        import stage
+        from quorvane_velmora import ui
+        from PyQt6.QtCore import QPoint
+        from PyQt6.QtWidgets import QWidget
+        panel = stage.APPLICATION.findChild(QWidget, 'mainPanel')
+        place = panel.mapToGlobal(QPoint(0, 0))
+        print(place.x(), place.y(), panel.width(), panel.height(), flush=True)
+        values = ui.showSimpleDialog('Form', [('TextField', 'Show', 'Show'), ('ToggleButton', 'Win', 'Win')], 400, True)
+        print(sorted(values.items()))
+        ''')
+    application = desk.start(PROGRAM, '--exit', str(tmp_path / 'form.py'))
+    left, top, width, height = map(int, application.stdout.readline().split())
+    desk.wait_for_window('Velmora')
+    dialog_left, dialog_bottom = left + width // 2 - 200, top + height - (height // 2 - 112 // 2)
+    title = dialog_left + 200, dialog_bottom - 112 - 13
+    button = dialog_left + 49, dialog_bottom - 21
+    desk.run('type', 'Os')
+    desk.drag(title, (title[0] - 150, title[1] + 130))
+    desk.click(*button)  # where it is no more
+    desk.run('type', 'cars')
+    desk.run('key', 'Tab', 'space')
+    desk.click(button[0] - 150, button[1] + 130)
+    assert application.communicate()[0] == (
+        "[('CloseButtonClicked', 'CloseButton_OK'), ('Show', 'Oscars'), ('Win', True)]\n")
+    assert application.returncode == 0
