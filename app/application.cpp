@@ -45,7 +45,7 @@ Kv::UiConstraint makeFilling()
 Kv::RCShdPtr<Kv::UiView> findView(Kv::UiWidget const& widget)
 {
     for (int i = 0; i < widget.getClientDataListSize(); ++i)
-        if (Kv::RCShdPtr<Kv::UiView> const view = Kv::dynamicCast<Kv::UiView>(widget.getClientDataListPtr()[i]))
+        if (Kv::RCShdPtr<Kv::UiView> view = Kv::dynamicCast<Kv::UiView>(widget.getClientDataListPtr()[i]))
             return view;
     return nullptr;
 }

@@ -1,5 +1,6 @@
 #include "commandLine.h"
 
+#include <array>
 #include <filesystem>
 #include <getopt.h>
 #include <utility>
@@ -34,15 +35,15 @@ ScriptCall ScriptCall::makeFile(std::string const& path, std::vector<std::string
 
 CommandLine readCommandLine(int argc, char** argv)
 {
-    static option const options[] = {{"open", required_argument, nullptr, Open},
-                                     {"exit", no_argument, nullptr, Exit},
-                                     {"build-info", no_argument, nullptr, BuildInfo},
-                                     {"help", no_argument, nullptr, 'h'},
-                                     {nullptr, 0, nullptr, 0}};
+    static constexpr std::array<option, 5> options{{{"open", required_argument, nullptr, Open},
+                                                    {"exit", no_argument, nullptr, Exit},
+                                                    {"build-info", no_argument, nullptr, BuildInfo},
+                                                    {"help", no_argument, nullptr, 'h'},
+                                                    {nullptr, 0, nullptr, 0}}};
     CommandLine line;
     optind = 1;
     // The plus: options end where the script begins. The colon: what is wrong is told from here.
-    for (int found = 0; !line.script && (found = getopt_long(argc, argv, "+:hm:", options, nullptr)) != -1;)
+    for (int found = 0; !line.script && (found = getopt_long(argc, argv, "+:hm:", options.data(), nullptr)) != -1;)
         switch (found)
         {
         case Open:

@@ -77,9 +77,12 @@ bp::dict makeMain()
     bp::object const module(bp::handle<>(PyModule_New("__main__")));
     bp::dict names = bp::extract<bp::dict>(module.attr("__dict__"));
     names["__builtins__"] = bp::import("builtins");
+    names["__annotations__"] = bp::dict();
     // A script can have put anything in the place of `sys.modules`.
     if (PyDict_SetItemString(PyImport_GetModuleDict(), "__main__", module.ptr()) != 0)
         bp::throw_error_already_set();
+    // A dialog of the one before, and the functions that hear of its events, hold each other.
+    PyGC_Collect();
     return names;
 }
 
@@ -267,13 +270,7 @@ int Interpreter::run(ScriptCall const& call)
         PySys_FormatStderr("%s\n", error.what());
     }
     if (status != 0)
-        attempt(
-            []
-            {
-                makeMain();
-                // A dialog and the functions that hear of its events hold each other.
-                PyGC_Collect();
-            });
+        attempt([] { makeMain(); });
     flushOutput();
     return status;
 }

@@ -48,6 +48,7 @@ MainWindow::MainWindow(Commands commands) : _commands(std::move(commands))
     makePanes();
     makeMenus();
     _message = new QLabel;
+    _message->setObjectName(QStringLiteral("message"));
     _message->setTextFormat(Qt::PlainText);
     // As wide as there is room, whatever it says.
     _message->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);

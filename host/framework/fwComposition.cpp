@@ -89,7 +89,7 @@ void FwComposition::save()
 {
     if (isChangedOnDisk())
         throw ExBase(__FILE__, __LINE__,
-                     "Cannot save " + LiStringUtil::getPrintable(_path.toString()) +
+                     "Cannot save " + LiStringUtil::getPrintablePath(_path.toString()) +
                          ": the file has been changed on disk since it was opened");
     saveOver();
 }

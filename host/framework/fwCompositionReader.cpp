@@ -77,7 +77,7 @@ std::vector<FwNode::Description> FwCompositionReader::read(OsFilePath const& pat
     catch (XmlError const& error)
     {
         throw ExBase(__FILE__, __LINE__,
-                     LiStringUtil::getPrintable(path.toString()) + " is no composition: " + error.getReason());
+                     LiStringUtil::getPrintablePath(path.toString()) + " is no composition: " + error.getReason());
     }
 }
 

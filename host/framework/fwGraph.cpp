@@ -68,7 +68,7 @@ void FwGraph::setNodeValue(std::string const& nodeName, std::string const& value
              LiStringUtil::getPrintable(nodeName));
     if (!composition->isEditable())
         fail("Composition " + LiStringUtil::getPrintable(_name) + " cannot be changed: " +
-             LiStringUtil::getPrintable(composition->getPath().toString()) + " cannot be written");
+             LiStringUtil::getPrintablePath(composition->getPath().toString()) + " cannot be written");
     FwCompositionWriter::requireValue(valueName, text);
     if (node->second->setValue(valueName, text))
         composition->noteChange();

@@ -56,6 +56,19 @@ std::string_view firstCharacter(std::string_view text)
     return text.substr(0, 1);
 }
 
+/// The first characters of a text, which it loses.
+std::string takePrintable(std::string_view& text, int count)
+{
+    std::string printable;
+    for (int taken = 0; taken < count && !text.empty(); ++taken)
+    {
+        std::string_view const character = firstCharacter(text);
+        printable += printableCharacter(character);
+        text.remove_prefix(character.size());
+    }
+    return printable;
+}
+
 } // namespace
 
 std::string LiStringUtil::convertNb(int number)
@@ -86,15 +99,17 @@ std::string LiStringUtil::getPrintable(std::string_view text, std::size_t offset
     char const* const begin =
         std::find_if_not(place - std::min(place - text.data(), shownBefore), place, isContinuation);
 
-    std::string printable = begin == text.data() ? "'" : "'...";
     std::string_view rest = text.substr(begin - text.data());
-    for (int shown = 0; shown < shownCharacters && !rest.empty(); ++shown)
-    {
-        std::string_view const character = firstCharacter(rest);
-        printable += printableCharacter(character);
-        rest.remove_prefix(character.size());
-    }
-    return printable + (rest.empty() ? "'" : "...'");
+    std::string const printable = takePrintable(rest, shownCharacters);
+    return (begin == text.data() ? "'" : "'...") + printable + (rest.empty() ? "'" : "...'");
+}
+
+std::string LiStringUtil::getPrintablePath(std::string_view path)
+{
+    // No system takes a longer one.
+    constexpr int longest = 4096;
+    std::string const printable = takePrintable(path, longest);
+    return "'" + printable + (path.empty() ? "'" : "...'");
 }
 
 } // namespace Kv

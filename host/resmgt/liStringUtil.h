@@ -26,6 +26,9 @@ public:
     /// The text in quotes on one line of valid UTF-8, whatever its bytes are: what cannot be printed stands as an
     /// escape. Of a long text only the surroundings of the byte at `offset` are shown.
     static std::string getPrintable(std::string_view text, std::size_t offset = 0);
+
+    /// The same for a path, of which every part counts: all of it is shown.
+    static std::string getPrintablePath(std::string_view path);
 };
 
 } // namespace Kv

@@ -29,7 +29,8 @@ std::recursive_mutex& getDescriptorMutex()
 [[noreturn]] void fail(char const* action, OsFilePath const& path, std::string const& words)
 {
     throw ExBase(__FILE__, __LINE__,
-                 std::string("Cannot ") + action + " " + LiStringUtil::getPrintable(path.toString()) + ": " + words);
+                 std::string("Cannot ") + action + " " + LiStringUtil::getPrintablePath(path.toString()) + ": " +
+                     words);
 }
 
 std::string getSystemWords()
@@ -88,7 +89,7 @@ std::uint64_t OsFile::getSize() const
     std::uint64_t const size = std::filesystem::file_size(_path.toString(), error);
     if (error)
         throw ExBase(__FILE__, __LINE__,
-                     "Cannot tell the size of " + LiStringUtil::getPrintable(_path.toString()) + ": " +
+                     "Cannot tell the size of " + LiStringUtil::getPrintablePath(_path.toString()) + ": " +
                          error.message());
     return size;
 }

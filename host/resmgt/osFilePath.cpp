@@ -33,7 +33,7 @@ fs::path getWorkingFolder(fs::path const& path)
     fs::path folder = fs::current_path(error);
     if (error)
         throw ExBase(__FILE__, __LINE__,
-                     "Cannot tell where " + LiStringUtil::getPrintable(path.native()) +
+                     "Cannot tell where " + LiStringUtil::getPrintablePath(path.native()) +
                          " is: there is no current folder: " + error.message());
     return folder;
 }

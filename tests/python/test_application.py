@@ -28,7 +28,7 @@ WATCHING = '''
 import stage
 from PyQt6.QtCore import QTimer
 from PyQt6.QtGui import QAction
-from PyQt6.QtWidgets import QApplication, QPushButton
+from PyQt6.QtWidgets import QApplication, QLabel, QPushButton
 
 runs, plan = 0, []
 
@@ -47,7 +47,7 @@ def answer(label):
             button.click()
 
 def proceed():
-    if plan and plan[0][0] == runs and plan[0][1] in stage.APPLICATION.statusBar().currentMessage():
+    if plan and plan[0][0] == runs and plan[0][1] in stage.APPLICATION.findChild(QLabel, 'message').text():
         plan.pop(0)[2]()
 
 timer = QTimer(stage.APPLICATION)
@@ -264,11 +264,14 @@ def test_scripts_find_the_open_compositions_and_change_those_that_can_be_written
         refused(locked.setNodeValue, 'Plate', 'file', 'b.exr')
         refused(locked.save)
         workspace.openComposition(shot)
-        assert workspace.getCurrentComposition() == shot and stage.APPLICATION.windowTitle().startswith('shot')
+        def shown():
+            stage.dialogs()  # lets the loop come around
+            return stage.APPLICATION.windowTitle(), stage.APPLICATION.isWindowModified()
+        assert workspace.getCurrentComposition() == shot and shown()[0].startswith('shot')
         shot.setNodeValue('Plate', 'file', 'b & <c>"\u00fc.exr')
-        assert stage.APPLICATION.isWindowModified()
+        assert shown()[1]
         shot.save()
-        assert not stage.APPLICATION.isWindowModified()
+        assert not shown()[1]
         value, = ElementTree.parse('shot.vmcomposition').iter('value')
         assert value.get('text') == 'b & <c>"\u00fc.exr'
         os.chmod('locked.vmcomposition', 0o644)

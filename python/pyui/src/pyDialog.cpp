@@ -175,7 +175,7 @@ RCShdPtr<UiContainer> Dialog::createFloatingContainer(int width, int height, int
 {
     RCShdPtr<UiPanel> const panel = UiAppMgr::getInstance().getMainPanel();
     GeRectangle<int> const size = panel->getRect();
-    RCShdPtr<UiContainer> const container = UiMoveContainer::create(panel, "Whatever", nullptr);
+    RCShdPtr<UiContainer> container = UiMoveContainer::create(panel, "Whatever", nullptr);
     GeRectangle<int> const place = panel->getRect();
     GeRectangle<int> rect;
     rect.xMin = size.getWidth() / 2 - width / 2 + place.xMin;
