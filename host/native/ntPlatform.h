@@ -46,6 +46,9 @@ public:
 
     /// Runs what is pending for the interpreter, Ctrl-C for one, and throws what comes of it.
     virtual void checkSignals() = 0;
+
+    /// Makes Ctrl-C pending for the interpreter.
+    virtual void interrupt() noexcept = 0;
 };
 
 /// The one face of the window system. All of it is for the thread of the user interface, but that peers and windows may
@@ -110,7 +113,8 @@ public:
     /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.
     virtual void endLoop() = 0;
 
-    /// The application closes: ends all loops, each by setting its `*end`. One that begins later throws an `ExBase`.
+    /// The application closes: ends all loops, each by setting its `*end`. One that begins later throws an `ExBase`; a
+    /// script that goes on trying is interrupted.
     virtual void closeLoops() = 0;
 };
 

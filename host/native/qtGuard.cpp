@@ -89,6 +89,12 @@ void QtGuard::checkSignals() noexcept
         run([hook = _hook] { hook->checkSignals(); });
 }
 
+void QtGuard::interrupt() const noexcept
+{
+    if (_hook)
+        _hook->interrupt();
+}
+
 void QtGuard::rethrow(std::exception_ptr const& error) const
 {
     if (_hook)

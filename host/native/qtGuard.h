@@ -31,6 +31,9 @@ public:
     /// Runs what is pending for the interpreter, guarded.
     void checkSignals() noexcept;
 
+    /// Interrupts the script that runs, as Ctrl-C would.
+    void interrupt() const noexcept;
+
     /// Throws on what a loop has carried out.
     [[noreturn]] void rethrow(std::exception_ptr const& error) const;
 

@@ -190,7 +190,7 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
         return;
     _application.requireLoop();
     if (_closed)
-        throw ExBase(__FILE__, __LINE__, "The application is closing: no dialog can be run any more");
+        refuseLoop();
     QPointer<QWidget> const window = QApplication::activeModalWidget();
     std::exception_ptr const error = QtLoop(until, end).run();
     QtGuard::getInstance().destroyWaiting();
@@ -199,6 +199,15 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     if (auto* const left = dynamic_cast<WindowWidget*>(window.data()))
         left->stopWaiting();
     QtGuard::getInstance().rethrow(error);
+}
+
+void QtPlatform::refuseLoop()
+{
+    // A script that asks until it gets an answer would go on for ever, with no window to end it by.
+    constexpr int patience = 10;
+    if (++_refusedLoops > patience)
+        QtGuard::getInstance().interrupt();
+    throw ExBase(__FILE__, __LINE__, "The application is closing: no dialog can be run any more");
 }
 
 void QtPlatform::endLoop()

@@ -45,11 +45,14 @@ public:
     void closeLoops() override;
 
 private:
+    [[noreturn]] void refuseLoop();
+
     QtApplication _application;
 
     /// The application that has our busy cursor, if one has.
     QPointer<QCoreApplication> _busyApplication;
     bool _closed = false;
+    int _refusedLoops = 0;
 };
 
 } // namespace Kv

@@ -91,6 +91,8 @@ public:
             boost::python::throw_error_already_set();
     }
 
+    void interrupt() noexcept override { PyErr_SetInterrupt(); }
+
 private:
     static std::optional<PythonError> find(std::exception_ptr const& error) noexcept
     {

@@ -226,6 +226,21 @@ def test_its_window_can_be_closed_under_dialogs_and_the_script_comes_to_its_own_
     assert len(printed) == 5 and len(set(printed[2:])) == 1 and 'clos' in printed[2], printed
 
 
+def test_a_script_that_asks_until_it_is_answered_ends_when_its_window_is_closed(tmp_path):
+    status, _, errors = run_inside(tmp_path, '''
+        import stage
+        from callback_tools import QTimer, make_dialog
+        dialog = make_dialog()
+        QTimer.singleShot(50, stage.APPLICATION.close)
+        while True:
+            try:
+                dialog.launch()
+            except Exception:
+                pass
+        ''')
+    assert status == 130 and errors.endswith('KeyboardInterrupt\n')
+
+
 WORKSPACE = '''
     import os, stage, watching
     from quorvane_velmora import graph, ui
