@@ -1,5 +1,6 @@
 #include "native/floatWidget.h"
 
+#include "native/floatStack.h"
 #include "native/qtFocusOrder.h"
 
 #include <QApplication>
@@ -54,11 +55,17 @@ FloatWidget::FloatWidget(QWidget* parent, QtListenerHandle<NtFloatListener> cons
             [this](QWidget* from, QWidget* to)
             {
                 if (to && isAncestorOf(to) && !(from && isAncestorOf(from)))
-                    raise();
+                    FloatStack::getInstance().bringToFront(*this);
             });
     // A timer would stay until it fires, also when this is gone.
     QMetaObject::invokeMethod(
         this, [handle] { handle.tell(&NtFloatListener::onFirstTurn); }, Qt::QueuedConnection);
+    FloatStack::getInstance().bringToFront(*this);
+}
+
+FloatWidget::~FloatWidget()
+{
+    FloatStack::getInstance().remove(*this);
 }
 
 FloatWidget* FloatWidget::findAround(QWidget& widget)
@@ -104,6 +111,7 @@ QEvent::Type FloatWidget::getHiddenEvent()
 void FloatWidget::showEvent(QShowEvent* event)
 {
     QWidget::showEvent(event);
+    FloatStack::getInstance().cutHoles();
     if (!event->spontaneous() && _area)
         _area->tellRoom();
 }
@@ -111,6 +119,7 @@ void FloatWidget::showEvent(QShowEvent* event)
 void FloatWidget::hideEvent(QHideEvent* event)
 {
     QWidget::hideEvent(event);
+    FloatStack::getInstance().cutHoles();
     if (event->spontaneous())
         return;
     if (_area)
@@ -119,9 +128,16 @@ void FloatWidget::hideEvent(QHideEvent* event)
     QCoreApplication::sendEvent(window(), &hidden);
 }
 
+void FloatWidget::moveEvent(QMoveEvent* event)
+{
+    QWidget::moveEvent(event);
+    FloatStack::getInstance().cutHoles();
+}
+
 void FloatWidget::resizeEvent(QResizeEvent* event)
 {
     QWidget::resizeEvent(event);
+    FloatStack::getInstance().cutHoles();
     if (_area)
         _area->setGeometry(rect());
     if (_edge)

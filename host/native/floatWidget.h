@@ -18,6 +18,7 @@ class FloatWidget final : public QWidget, public QtStage
 {
 public:
     FloatWidget(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle);
+    ~FloatWidget() override;
 
     /// The innermost one that holds the widget, or is it; null if there is none.
     static FloatWidget* findAround(QWidget& widget);
@@ -37,6 +38,7 @@ public:
 protected:
     void showEvent(QShowEvent* event) override;
     void hideEvent(QHideEvent* event) override;
+    void moveEvent(QMoveEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
     bool focusNextPrevChild(bool next) override;

@@ -1,5 +1,7 @@
 #include "native/qtFloat.h"
 
+#include "native/floatStack.h"
+
 namespace Kv
 {
 
@@ -16,6 +18,12 @@ QtFloat::QtFloat(QWidget* parent, std::string const& name, QtListenerHandle<NtFl
 QtFloat::~QtFloat()
 {
     _handle.close();
+}
+
+void QtFloat::raise()
+{
+    if (FloatWidget* const native = getNative())
+        FloatStack::getInstance().bringToFront(*native);
 }
 
 void QtFloat::setContentSize(int width, int height)

@@ -15,6 +15,7 @@ public:
     QtFloat(QWidget* parent, std::string const& name, NtFloatListener& listener);
     ~QtFloat() override;
 
+    void raise() override;
     void focusFirst() override { focusFirstInContent(); }
     void setContentSize(int width, int height) override;
     QWidget* getContent() const override;

@@ -5,6 +5,7 @@ import os
 
 import pytest
 
+import stage
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtWidgets import QApplication, QLabel, QLineEdit, QTreeView
@@ -183,6 +184,28 @@ def test_a_callback_can_open_a_browser_and_a_dialog_of_its_own(user, files):
             return ui.showBrowser('Inner', files)
 
     assert browse(user, ok, initialPath='/', pathValidationCb=ask) == files + '/notes.txt'
+
+
+@pytest.mark.inside
+def test_what_the_callback_opens_is_seen_above_it_and_then_goes(user, files):
+    seen = []
+
+    def uppermost(user, name):
+        widget, window = user.find(name), stage.APPLICATION
+        return window.childAt(widget.mapTo(window, widget.rect().center())) is widget
+
+    def look(inner):
+        seen.append(uppermost(inner, 'CloseButton_OK'))
+        inner.close()
+
+    def ask(*_):
+        with user.meanwhile(look):
+            dialog.launch()
+        return ''
+
+    dialog = ui.createDialog('Why', ui.makeXmlFromWidgetList([('Label', 'Why', '', 'Not that one')]), 300, 84)
+    browse(user, ok, lambda user: seen.append(uppermost(user, 'OK')), cancel, initialPath=files, pathValidationCb=ask)
+    assert seen == [True, True]
 
 
 @pytest.mark.inside

@@ -3,10 +3,18 @@
 import os
 import pathlib
 import runpy
+import shutil
 import subprocess
 import sys
 
+import pytest
+
+import stage
 from callback_tools import no_wait_is_endless, patient  # noqa: F401
+from quorvane_velmora import ui
+from PyQt6.QtCore import Qt
+from PyQt6.QtTest import QTest
+from PyQt6.QtWidgets import QApplication, QLabel, QLineEdit, QTreeView
 
 EXAMPLES = pathlib.Path(__file__).parents[2] / 'examples'
 
@@ -15,6 +23,7 @@ def run(name):
     runpy.run_path(str(EXAMPLES / name), run_name='__main__')
 
 
+@pytest.mark.standalone
 def test_the_demo_plays_itself_where_there_is_no_display_and_leaves_pictures(tmp_path):
     environment = {name: value for name, value in os.environ.items() if name not in ('DISPLAY', 'WAYLAND_DISPLAY')}
     del environment['QT_QPA_PLATFORM']
@@ -41,3 +50,74 @@ def test_a_review_is_sent_with_its_note(patient, capsys):
                  lambda user: user.click('CloseButton_Send'))
     run('review.py')
     assert capsys.readouterr().out == 'Retake: Too dark\n'
+
+
+@pytest.fixture
+def shots(tmp_path):
+    """The folder of the examples' compositions, copied, opened in the application's own browser, and closed again."""
+    field, files = (stage.APPLICATION.findChild(kind, 'Browser.' + name)
+                    for kind, name in ((QLineEdit, 'path'), (QTreeView, 'list')))
+    for path in sorted((EXAMPLES / 'compositions').iterdir()):
+        shutil.copy(path, tmp_path)
+        field.setFocus()
+        field.selectAll()
+        QTest.keyClicks(field, str(tmp_path / path.name))
+        QTest.keyClick(field, Qt.Key.Key_Return)
+        while not files.selectionModel().hasSelection():
+            QApplication.processEvents()
+        QTest.keyClick(files, Qt.Key.Key_Return)
+    yield tmp_path
+    for shot in ui.Workspace.getCompositions():
+        shot.save()  # else somebody would be asked what is to become of changes
+    while ui.Workspace.getNbCompositions():
+        QTest.keyClick(files, Qt.Key.Key_W, Qt.KeyboardModifier.ControlModifier)
+
+
+def words(user):
+    return [label.text() for label in user.window().findChildren(QLabel, 'Msg')]
+
+
+@pytest.mark.inside
+def test_the_tour_says_that_no_composition_is_open(patient):
+    read = []
+    patient.plan(lambda user: read.extend(words(user)), lambda user: user.close())
+    run('tour.py')
+    assert read[0] == 'No composition is open.'
+
+
+@pytest.mark.inside
+def test_the_tour_changes_a_value_and_reports_to_a_folder_that_can_hold_a_report(patient, shots):
+    before = (shots / 'shot_010.vmcomposition').read_text()
+    read = []
+
+    def look(user):
+        read.append(words(user))
+
+    def read_folder(user):
+        while not user.find('Browser.list', QTreeView).model().rowCount():
+            QApplication.processEvents()
+
+    def folder_alone(user):
+        read_folder(user)
+        files = user.find('Browser.list', QTreeView)
+        QTest.mouseClick(files.viewport(), Qt.MouseButton.LeftButton, pos=files.viewport().rect().bottomLeft())
+
+    patient.plan(lambda user: user.press(Qt.Key.Key_Up), lambda user: user.click('Text'),
+                 lambda user: user.press(Qt.Key.Key_A, Qt.KeyboardModifier.ControlModifier),
+                 lambda user: user.type('1.3'), lambda user: user.close('Apply'), read_folder,
+                 lambda user: user.type('shot_020'),
+                 lambda user: user.click('OK'), look, lambda user: user.close(),
+                 folder_alone, lambda user: user.click('OK'), look, lambda user: user.close())
+    run('tour.py')
+    assert read[0][0] == 'A report needs a folder that can be written to.'
+    assert read[1] == ['gain of Grade is now 1.3.', 'The report is shot_010.report.txt']
+    report = (shots / 'shot_010.report.txt').read_text().splitlines()
+    assert report == [str(shots / 'shot_010.vmcomposition'), 'gain of Grade is now 1.3.', 'Selected files:',
+                      '  ' + str(shots / 'shot_020.vmcomposition')]
+    assert (shots / 'shot_010.vmcomposition').read_text() == before
+
+    patient.plan(lambda user: user.press(Qt.Key.Key_Up), lambda user: user.click('Save'), lambda user: user.close('Apply'),
+                 folder_alone, lambda user: user.click('OK'), lambda user: user.close('Cancel'),
+                 lambda user: user.click('Cancel'), lambda user: user.close())
+    run('tour.py')
+    assert (shots / 'shot_010.vmcomposition').read_text() == before.replace('"1.15"', '"1.3"')
