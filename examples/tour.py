@@ -1,10 +1,11 @@
 """A tour through the application: changes a value of an open composition, and writes a report to a folder.
 
-    ./run app --open examples/compositions/shot_010.vmcomposition examples/tour.py
+    ./run app examples/tour.py
 
 The composition's own file changes only where "Save" is ticked.
 """
 
+import glob
 import os
 
 from quorvane_velmora import graph, ui
@@ -92,5 +93,9 @@ selected = ui.Workspace.getBrowserSelection()
 compositions = ui.Workspace.getCompositions()
 if compositions:
     Tour(compositions, selected).run()
-else:
-    ui.showMessageBox('Tour', ['No composition is open.', 'Ctrl+O opens one, Ctrl+Shift+R runs the tour again.'])
+elif ui.showMessageBox('Tour', ['No composition is open.', 'Start the application anew with the examples?'],
+                       ['Start', 'Cancel']) == 'Start':
+    # Scripts open no files in the application; its command line does.
+    examples = sorted(glob.glob(os.path.join(os.path.dirname(__file__), 'compositions', '*.vmcomposition')))
+    options = [word for path in examples for word in ('--open', path)]
+    os.execv('/proc/self/exe', ['velmora', *options, __file__])

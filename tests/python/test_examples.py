@@ -80,7 +80,7 @@ def words(user):
 @pytest.mark.inside
 def test_the_tour_says_that_no_composition_is_open(patient):
     read = []
-    patient.plan(lambda user: read.extend(words(user)), lambda user: user.close())
+    patient.plan(lambda user: read.extend(words(user)), lambda user: user.close('Cancel'))
     run('tour.py')
     assert read[0] == 'No composition is open.'
 
