@@ -45,10 +45,12 @@ void FloatStack::cutHoles() const
 {
     for (auto lower = _floats.begin(); lower != _floats.end(); ++lower)
     {
+        QWidget const* const window = (*lower)->parentWidget();
+        if (!window->isWindow())
+            continue;
         QRegion hole;
         for (auto upper = lower + 1; upper != _floats.end(); ++upper)
-            if ((*upper)->isVisible() && (*upper)->window() == (*lower)->window() &&
-                (*upper)->parentWidget() != (*lower)->parentWidget())
+            if ((*upper)->isVisible() && (*upper)->window() == window && (*upper)->parentWidget() != window)
                 hole += getVisibleRect(**upper);
         cutHole(**lower, hole);
     }
