@@ -191,9 +191,9 @@ void Application::interrupt()
 void Application::loadFocused(Kv::EvEvent&)
 {
     // Later: what goes wrong is told in a box, for which nobody shall wait.
+    std::string const path = _browser->getInputFocusPath().toString();
     QMetaObject::invokeMethod(
-        &_window, [this] { attempt([this] { openComposition(_browser->getInputFocusPath().toString()); }); },
-        Qt::QueuedConnection);
+        &_window, [this, path] { attempt([&] { openComposition(path); }); }, Qt::QueuedConnection);
 }
 
 void Application::refuseFocused(Kv::EvEvent&)

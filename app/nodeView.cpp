@@ -92,7 +92,7 @@ void NodeView::paintEvent(QPaintEvent*)
         return;
     }
     if (!isEnabled())
-        painter.setOpacity(0.35);
+        painter.setOpacity(0.5);
     double const scale = std::min({1.0, (width() - margin) / _extent.width(), (height() - margin) / _extent.height()});
     painter.translate(width() / 2.0, height() / 2.0);
     painter.scale(scale, scale);

@@ -29,8 +29,8 @@ public:
     /// Whether somebody else has written the file since it was opened or saved.
     virtual bool isChangedOnDisk() const = 0;
 
-    /// Writes the file as a whole or not at all. Throws `ExBase`, naming the path, where it cannot be written, and where
-    /// it is changed on disk; the file is then as it was.
+    /// Writes the file as a whole or not at all. Throws `ExBase`, naming the path, where it cannot be written, and
+    /// where it is changed on disk; the file is then as it was.
     virtual void save() = 0;
 
     /// Writes the file also where it is changed on disk.
