@@ -20,6 +20,7 @@
 #include "ui/uiCursorGuard.h"
 
 #include <algorithm>
+#include <stdexcept>
 #include <memory>
 
 namespace bp = boost::python;
@@ -190,7 +191,11 @@ std::string showMessageBox(std::string const& title, bp::list const& messages, b
     int const width = static_cast<int>(static_cast<float>(contentWidth) * UiConstraint::getUIGrid().x);
     std::string const xmlString = WidgetListGenerator(widgets, closeButtons).generate();
     RCShdPtr<Dialog> const dialog = makeDialog(title, xmlString, width, height);
-    return dialog->launch().substr(closeButtonPrefix.size());
+    std::string const closeButton = dialog->launch();
+    // An `IndexError` to a script.
+    if (closeButton.size() < closeButtonPrefix.size())
+        throw std::out_of_range("The message box was ended without one of its buttons");
+    return closeButton.substr(closeButtonPrefix.size());
 }
 
 std::string makeXmlFromWidgetList(bp::list const& widgets, bp::list const& closeButtons)
