@@ -20,8 +20,8 @@
 #include "ui/uiCursorGuard.h"
 
 #include <algorithm>
-#include <stdexcept>
 #include <memory>
+#include <stdexcept>
 
 namespace bp = boost::python;
 
