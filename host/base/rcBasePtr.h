@@ -23,8 +23,8 @@ public:
     bool isNull() const { return !_object; }
     explicit operator bool() const { return _object; }
 
-    T* operator->() const { return checked(); }
-    T& operator*() const { return *checked(); }
+    T* operator->() const { return requireObject(_object); }
+    T& operator*() const { return *requireObject(_object); }
 
     /// Writes one line for whoever looks for a fault, without its end: the types, the count and the addresses.
     void dump(std::ostream& stream) const;
@@ -42,13 +42,6 @@ protected:
     void swap(RCBasePtr& other) { std::swap(_object, other._object); }
 
 private:
-    T* checked() const
-    {
-        if (!_object)
-            RCExUtil::throwExNullPtr(typeid(T*).name());
-        return _object;
-    }
-
     T* _object = nullptr;
 };
 

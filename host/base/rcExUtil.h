@@ -3,6 +3,7 @@
 #include "base/exBase.h"
 
 #include <string>
+#include <typeinfo>
 
 namespace Kv
 {
@@ -38,5 +39,13 @@ public:
     /// The plain form of a type name, mangled or plain.
     static std::string getReadableTypeName(char const* typeName);
 };
+
+/// The object itself; throws `ExNullPtr` with the pointer's type for none. What every pointer goes through.
+template <typename T> T* requireObject(T* object)
+{
+    if (!object)
+        RCExUtil::throwExNullPtr(typeid(T*).name());
+    return object;
+}
 
 } // namespace Kv

@@ -5,7 +5,6 @@
 #include <cstddef>
 #include <memory>
 #include <type_traits>
-#include <typeinfo>
 #include <utility>
 
 namespace Kv
@@ -30,17 +29,10 @@ public:
     bool isNull() const { return !_object; }
     std::shared_ptr<T> const& getShared() const { return _object; }
 
-    T* operator->() const { return checked(); }
-    T& operator*() const { return *checked(); }
+    T* operator->() const { return requireObject(_object.get()); }
+    T& operator*() const { return *requireObject(_object.get()); }
 
 private:
-    T* checked() const
-    {
-        if (!_object)
-            RCExUtil::throwExNullPtr(typeid(T*).name());
-        return _object.get();
-    }
-
     std::shared_ptr<T> _object;
 };
 

@@ -18,26 +18,20 @@ public:
 
     bool isNull() const { return !_object; }
 
-    T* operator->() const { return checked().get(); }
-    T& operator*() const { return *checked(); }
+    T* operator->() const { return requireObject(_object.get()); }
+    T& operator*() const { return *requireObject(_object.get()); }
 
     /// The object under the type `To`. Throws `ExCastFailed` where it is none, and `ExNullPtr` where it is expired.
     template <typename To> RCWeakPtr<To> castTo() const
     {
-        RCStrongPtr<To> const object(std::dynamic_pointer_cast<To>(checked()));
+        requireObject(_object.get());
+        RCStrongPtr<To> const object(std::dynamic_pointer_cast<To>(_object));
         if (object.isNull())
             RCExUtil::throwExCastFailed(typeid(T*).name(), typeid(To*).name());
         return object;
     }
 
 private:
-    std::shared_ptr<T> const& checked() const
-    {
-        if (!_object)
-            RCExUtil::throwExNullPtr(typeid(T*).name());
-        return _object;
-    }
-
     std::shared_ptr<T> _object;
 };
 

@@ -2,8 +2,6 @@
 
 #include "base/rcExUtil.h"
 
-#include <typeinfo>
-
 namespace Kv
 {
 
@@ -19,17 +17,10 @@ public:
 
     bool isNull() const { return !_object; }
 
-    T* operator->() const { return checked(); }
-    T& operator*() const { return *checked(); }
+    T* operator->() const { return requireObject(_object); }
+    T& operator*() const { return *requireObject(_object); }
 
 private:
-    T* checked() const
-    {
-        if (!_object)
-            RCExUtil::throwExNullPtr(typeid(T*).name());
-        return _object;
-    }
-
     T* _object = nullptr;
 };
 
