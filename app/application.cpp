@@ -42,14 +42,6 @@ Kv::UiConstraint makeFilling()
                          edge(UiConstraint::ParentHigh)});
 }
 
-Kv::RCShdPtr<Kv::UiView> findView(Kv::UiWidget const& widget)
-{
-    for (int i = 0; i < widget.getClientDataListSize(); ++i)
-        if (Kv::RCShdPtr<Kv::UiView> view = Kv::dynamicCast<Kv::UiView>(widget.getClientDataListPtr()[i]))
-            return view;
-    return nullptr;
-}
-
 } // namespace
 
 Application::Application()
@@ -111,7 +103,7 @@ void Application::makeHost()
     _hostWindow = UiMainWindow::create("Velmora", "Velmora", NtForeignWidget{&_window},
                                        [this](bool enabled) { _window.setOwnEnabled(enabled); });
     RCShdPtr<UiContainer> const root = _hostWindow->getRootContainer();
-    _panel = UiPanel::create(root, "mainPanel", NtForeignWidget{_window.getPanel()});
+    RCShdPtr<UiPanel> const panel = UiPanel::create(root, "mainPanel", NtForeignWidget{_window.getPanel()});
     RCShdPtr<UiPanel> const place = UiPanel::create(root, "browserPanel", NtForeignWidget{_window.getBrowserPlace()});
     _browser = BrBrowser::create(place, "Browser", nullptr);
     _browser->setConstraint(makeFilling());
@@ -125,7 +117,7 @@ void Application::makeHost()
     _workspace = makeShd<UiCompositionWorkspace>([this] { return _hostWindow->findKeyboardHolder(); });
     _workspace->setListener(this);
     UiWorkspace::setCurrentWorkspace(_workspace);
-    UiAppMgr::getInstance().setApplication(_hostWindow, _panel, findView(*_browser));
+    UiAppMgr::getInstance().setApplication(_hostWindow, panel, _browser->getView());
 }
 
 void Application::startScript(ScriptCall const& script, bool exit)

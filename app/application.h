@@ -9,7 +9,6 @@
 #include "appUi/uiCompositionWorkspaceListener.h"
 #include "ui/uiEventCallback.h"
 #include "ui/uiMainWindow.h"
-#include "ui/uiPanel.h"
 
 #include <QTimer>
 
@@ -80,7 +79,6 @@ private:
     Interpreter _interpreter;
     MainWindow _window;
     Kv::RCShdPtr<Kv::UiMainWindow> _hostWindow;
-    Kv::RCShdPtr<Kv::UiPanel> _panel;
     Kv::RCShdPtr<Kv::BrBrowser> _browser;
     Kv::UiEventCallback<Application> _loadCb;
     Kv::UiEventCallback<Application> _fileCb;

@@ -1,7 +1,6 @@
 #include "appUi/brBrowser.h"
 
 #include "appUi/brBrowsable.h"
-#include "appUi/uiView.h"
 #include "base/exBase.h"
 #include "native/ntPlatform.h"
 #include "resmgt/osPlace.h"
@@ -162,6 +161,11 @@ LiString BrBrowser::getInputFocusPath() const
 LiString BrBrowser::getPath() const
 {
     return _directory;
+}
+
+RCShdPtr<UiView> BrBrowser::getView() const
+{
+    return _view;
 }
 
 bool BrBrowser::takeTypedPath()

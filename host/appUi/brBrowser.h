@@ -2,6 +2,7 @@
 
 #include "appUi/brTypes.h"
 #include "appUi/kvAppUiExport.h"
+#include "appUi/uiView.h"
 #include "base/cbHandler.h"
 #include "internalAPI/snSelection.h"
 #include "native/ntPeers.h"
@@ -69,6 +70,9 @@ public:
 
     /// The current directory.
     LiString getPath() const;
+
+    /// What others know of what is selected in it, the one among its client data. Never null.
+    RCShdPtr<UiView> getView() const;
 
     /// Goes where the user has typed in its field without pressing Enter. False, which the user is told, if nothing is
     /// there.
