@@ -1,10 +1,8 @@
-"""What the tests of callbacks share: a dialog with a widget of each kind, a user who goes on while a callback blocks in
-a dialog of its own, and an end for every wait."""
+"""What the tests of callbacks share: a dialog with a widget of each kind, and a user who goes on while a callback blocks
+in a dialog of its own."""
 
 import os
 import signal
-
-import pytest
 
 import scripts
 from quorvane_velmora import ui
@@ -53,30 +51,6 @@ class PatientUser(User):
         # From here on anew: what the step ended must have come to its end.
         if self._steps:
             self._timer.start(5)
-
-
-@pytest.fixture
-def patient():
-    someone = PatientUser()
-    yield someone
-    someone.judge()
-
-
-@pytest.fixture(autouse=True)
-def no_wait_is_endless():
-    """A dialog that nobody closes any more fails its test."""
-    def give_up(_, frame):
-        # In the user's own slot it would be lost: again, until it comes in the loop of the dialog.
-        if os.path.basename(frame.f_code.co_filename) in ('user.py', 'callback_tools.py'):
-            signal.setitimer(signal.ITIMER_REAL, 0.007)
-        else:
-            raise TimeoutError('the dialog is still open')
-
-    previous = signal.signal(signal.SIGALRM, give_up)
-    signal.alarm(20)
-    yield
-    signal.alarm(0)
-    signal.signal(signal.SIGALRM, previous)
 
 
 def run_script(text):

@@ -1,6 +1,7 @@
 """What the tests share: a user who types and clicks, a screen of their own, and an eye on what goes wrong unseen."""
 
 import os
+import signal
 import subprocess
 import sys
 import traceback
@@ -8,6 +9,7 @@ import traceback
 import pytest
 
 import stage
+from callback_tools import PatientUser
 from desk import Desk
 from user import User
 
@@ -15,6 +17,7 @@ from user import User
 def pytest_configure(config):
     config.addinivalue_line('markers', 'standalone: about dialogs that have windows of their own')
     config.addinivalue_line('markers', 'inside: about the running application')
+    config.addinivalue_line('markers', 'screen: on a real screen too, where the keyboard and windows are what matters')
 
 
 def pytest_collection_modifyitems(config, items):
@@ -30,6 +33,30 @@ def user():
     someone = User()
     yield someone
     someone.judge()
+
+
+@pytest.fixture
+def patient():
+    someone = PatientUser()
+    yield someone
+    someone.judge()
+
+
+@pytest.fixture
+def no_wait_is_endless():
+    """A dialog that nobody closes any more fails its test."""
+    def give_up(_, frame):
+        # In the user's own slot it would be lost: again, until it comes in the loop of the dialog.
+        if os.path.basename(frame.f_code.co_filename) in ('user.py', 'callback_tools.py'):
+            signal.setitimer(signal.ITIMER_REAL, 0.007)
+        else:
+            raise TimeoutError('the dialog is still open')
+
+    previous = signal.signal(signal.SIGALRM, give_up)
+    signal.alarm(20)
+    yield
+    signal.alarm(0)
+    signal.signal(signal.SIGALRM, previous)
 
 
 @pytest.fixture

@@ -13,6 +13,8 @@ import pytest
 from quorvane_velmora import ui
 from scripts import environment
 
+pytestmark = pytest.mark.standalone
+
 PROGRAM = str(pathlib.Path(ui.__file__).parents[3] / 'bin' / 'velmora')
 PACKAGES = {'base', 'resmgt', 'pluginAPI', 'internalAPI', 'framework', 'gfx', 'ui', 'appUi', 'scriptingAPI',
             'pyextInit', 'pyextGraph', 'pyextUi'}

@@ -5,11 +5,13 @@ import weakref
 
 import pytest
 
-from callback_tools import UNKNOWN, listen, make_dialog, no_wait_is_endless  # noqa: F401
+from callback_tools import UNKNOWN, listen, make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtTest import QTest
 from PyQt6.QtWidgets import QComboBox
+
+pytestmark = [pytest.mark.screen, pytest.mark.usefixtures('no_wait_is_endless')]
 
 ACTIVATE, STATE, VALUE_CHANGED = ui.EventType.ACTIVATE, ui.EventType.STATE, ui.EventType.VALUE_CHANGED
 

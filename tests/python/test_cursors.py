@@ -3,10 +3,12 @@
 import pytest
 
 import scripts
-from callback_tools import make_dialog, no_wait_is_endless  # noqa: F401
+from callback_tools import make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtWidgets import QApplication
+
+pytestmark = pytest.mark.usefixtures('no_wait_is_endless')
 
 
 def shown():

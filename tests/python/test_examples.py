@@ -10,11 +10,12 @@ import sys
 import pytest
 
 import stage
-from callback_tools import no_wait_is_endless, patient  # noqa: F401
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtTest import QTest
 from PyQt6.QtWidgets import QApplication, QLabel, QLineEdit, QTreeView
+
+pytestmark = pytest.mark.usefixtures('no_wait_is_endless')
 
 EXAMPLES = pathlib.Path(__file__).parents[2] / 'examples'
 

@@ -7,11 +7,13 @@ import traceback
 import pytest
 
 import stage
-from callback_tools import listen, make_dialog, no_wait_is_endless, patient  # noqa: F401
+from callback_tools import listen, make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import QEventLoop, QTimer, Qt
 from PyQt6.QtTest import QTest
 from PyQt6.QtWidgets import QApplication, QPushButton
+
+pytestmark = [pytest.mark.screen, pytest.mark.usefixtures('no_wait_is_endless')]
 
 ACTIVATE, STATE = ui.EventType.ACTIVATE, ui.EventType.STATE
 

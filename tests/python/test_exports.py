@@ -5,7 +5,11 @@ import re
 import subprocess
 from collections import Counter
 
+import pytest
+
 from quorvane_velmora import ui
+
+pytestmark = pytest.mark.standalone
 
 SOURCES = os.path.join(os.path.dirname(__file__), '..', '..')
 LIBS = os.path.dirname(ui.__file__)

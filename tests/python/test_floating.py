@@ -3,7 +3,7 @@
 import pytest
 
 import stage
-from callback_tools import listen, make_dialog, no_wait_is_endless, patient  # noqa: F401
+from callback_tools import listen, make_dialog
 from descriptions import close_button, container
 from quorvane_velmora import ui
 from PyQt6.QtCore import QEvent, QPoint, QPointF, QRect, Qt
@@ -11,7 +11,8 @@ from PyQt6.QtGui import QGuiApplication, QMouseEvent
 from PyQt6.QtTest import QTest
 from PyQt6.QtWidgets import QApplication, QFrame, QLabel, QScrollBar, QTreeView, QWidget
 
-pytestmark = pytest.mark.inside
+pytestmark = [pytest.mark.inside, pytest.mark.usefixtures('no_wait_is_endless')]
+
 PLAIN = container('c', close_button('OK'))
 
 

@@ -13,6 +13,8 @@ import pytest
 import scripts
 from callback_tools import SAME_SCREEN
 
+pytestmark = [pytest.mark.standalone, pytest.mark.screen]
+
 PRELUDE = '''
 import gc, time
 from callback_tools import PatientUser, make_dialog, ui

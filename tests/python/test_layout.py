@@ -7,6 +7,8 @@ import pytest
 
 from scripts import run_script
 
+pytestmark = pytest.mark.standalone
+
 
 @pytest.fixture(scope='module', params=itertools.product('12', ['#efefef', '#303030']), ids=str)
 def pictures(request):

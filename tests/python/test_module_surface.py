@@ -9,6 +9,8 @@ import pytest
 from quorvane_velmora import ui
 from scripts import run_script
 
+pytestmark = pytest.mark.standalone
+
 LIBS = os.path.dirname(ui.__file__)
 XML = ui.makeXmlFromWidgetList([('TextField', 'a')])
 

@@ -4,6 +4,8 @@ import pytest
 
 from scripts import run_script
 
+pytestmark = pytest.mark.standalone
+
 SCRIPT = '''
 import re
 from quorvane_velmora import ui

@@ -5,10 +5,12 @@ import gc
 import pytest
 
 import stage
-from callback_tools import listen, make_dialog, no_wait_is_endless, patient, run_script  # noqa: F401
+from callback_tools import listen, make_dialog, run_script
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtWidgets import QApplication, QPushButton
+
+pytestmark = [pytest.mark.screen, pytest.mark.usefixtures('no_wait_is_endless')]
 
 ACTIVATE, STATE, VALUE_CHANGED = ui.EventType.ACTIVATE, ui.EventType.STATE, ui.EventType.VALUE_CHANGED
 

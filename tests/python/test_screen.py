@@ -2,6 +2,10 @@
 
 import sys
 
+import pytest
+
+pytestmark = pytest.mark.standalone
+
 OK_BUTTON = 49, 21  # from the left and from the bottom edge of a window
 
 

@@ -4,12 +4,14 @@ import pathlib
 
 import pytest
 
-from callback_tools import UNKNOWN, listen, make_dialog, no_wait_is_endless  # noqa: F401
+from callback_tools import UNKNOWN, listen, make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import QPoint, QRect, Qt
 from PyQt6.QtGui import QCursor
 from PyQt6.QtTest import QTest
 from PyQt6.QtWidgets import QApplication, QToolTip
+
+pytestmark = [pytest.mark.screen, pytest.mark.usefixtures('no_wait_is_endless')]
 
 ENABLE, DISABLE = ui.EventType.ENABLE, ui.EventType.DISABLE
 
