@@ -102,8 +102,8 @@ class User:
     def focused(self):
         """The widget that has the keyboard. Where no window system says so, an open window may not be active."""
         window = self.window()
-        holder = QApplication.focusWidget() or window.window().focusWidget()
-        return holder if holder and (window.isWindow() or window.isAncestorOf(holder)) else window
+        holders = QApplication.focusWidget(), window.window().focusWidget()
+        return next((holder for holder in holders if holder and window.isAncestorOf(holder)), window)
 
     def focus(self):
         return self.focused().objectName()
