@@ -54,9 +54,24 @@ BrBrowserFloatingHandler::BrBrowserFloatingHandler(RCShdPtr<UiContainer> const& 
 
 BrBrowserFloatingHandler::~BrBrowserFloatingHandler() = default;
 
+RCShdPtr<BrBrowser> const& BrBrowserFloatingHandler::getBrowser() const
+{
+    return _browser;
+}
+
 void BrBrowserFloatingHandler::setActivateCb(CbHandler<EvEvent>* handler)
 {
     _activateCb = handler;
+}
+
+bool volatile* BrBrowserFloatingHandler::isClosed()
+{
+    return &_closed;
+}
+
+bool const volatile* BrBrowserFloatingHandler::isClosedConst() const
+{
+    return &_closed;
 }
 
 void BrBrowserFloatingHandler::show()

@@ -21,15 +21,15 @@ public:
                              LiString const& place, Bookmarkable);
     ~BrBrowserFloatingHandler() override;
 
-    RCShdPtr<BrBrowser> const& getBrowser() const { return _browser; }
+    RCShdPtr<BrBrowser> const& getBrowser() const;
 
     /// `handler`, borrowed, runs when OK is pressed, and not on Cancel; the browser stays open unless it hides it. With
     /// a path typed that leads nowhere OK does not get so far.
     void setActivateCb(CbHandler<EvEvent>* handler);
 
     /// The flag of a loop that runs the browser: true but between `show` and `hide`.
-    bool volatile* isClosed() { return &_closed; }
-    bool const volatile* isClosedConst() const { return &_closed; }
+    bool volatile* isClosed();
+    bool const volatile* isClosedConst() const;
 
     void show() override;
     void hide() override;

@@ -37,6 +37,11 @@ UiFloatingHandler::~UiFloatingHandler()
     _container->clearParent();
 }
 
+RCShdPtr<UiMoveContainer> const& UiFloatingHandler::getContainer() const
+{
+    return _container;
+}
+
 void UiFloatingHandler::show()
 {
     _container->show();

@@ -17,7 +17,7 @@ public:
     UiFloatingHandler& operator=(UiFloatingHandler const&) = delete;
     virtual ~UiFloatingHandler();
 
-    RCShdPtr<UiMoveContainer> const& getContainer() const { return _container; }
+    RCShdPtr<UiMoveContainer> const& getContainer() const;
 
     virtual void show();
     virtual void hide();

@@ -34,6 +34,10 @@ ExBase::ExBase(char const* sourcePath, int line, std::string reason)
 {
 }
 
+ExBase::ExBase(ExBase const&) = default;
+
+ExBase& ExBase::operator=(ExBase const&) = default;
+
 ExBase::~ExBase() = default;
 
 char const* ExBase::what() const noexcept

@@ -15,8 +15,8 @@ public:
     /// `sourcePath` and `line` tell where it is thrown, `reason` what is wrong. Bytes of the reason that are no UTF-8,
     /// as those of a path can be, stand as escapes in it.
     ExBase(char const* sourcePath, int line, std::string reason);
-    ExBase(ExBase const&) = default;
-    ExBase& operator=(ExBase const&) = default;
+    ExBase(ExBase const&);
+    ExBase& operator=(ExBase const&);
     ~ExBase() override;
 
     /// The reason, as `getReason` gives it.

@@ -3,6 +3,8 @@
 namespace Kv
 {
 
+InBuildInfo::InBuildInfo() = default;
+
 InBuildInfo::~InBuildInfo() = default;
 
 } // namespace Kv

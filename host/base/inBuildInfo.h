@@ -9,7 +9,7 @@ namespace Kv
 class KVBASE_API InBuildInfo
 {
 public:
-    InBuildInfo() = default;
+    InBuildInfo();
     InBuildInfo(InBuildInfo const&) = delete;
     InBuildInfo& operator=(InBuildInfo const&) = delete;
     virtual ~InBuildInfo();

@@ -5,6 +5,8 @@
 namespace Kv
 {
 
+InPackageInit::InPackageInit(char const* name) : InPackageInitBase(name) {}
+
 InPackageInit::~InPackageInit()
 {
     InPackageRegistry::getInstance().remove(*this);

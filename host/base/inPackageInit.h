@@ -13,7 +13,7 @@ namespace Kv
 class KVBASE_API InPackageInit : public InPackageInitBase
 {
 public:
-    using InPackageInitBase::InPackageInitBase;
+    explicit InPackageInit(char const* name);
     ~InPackageInit() override;
 
     /// Announces the package. To be called by the constructor of the record's own class, whose type it takes.

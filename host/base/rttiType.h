@@ -1,24 +1,20 @@
 #pragma once
 
+#include "base/kvBaseExport.h"
+
 #include <typeinfo>
 
 namespace Kv
 {
 
 /// Record of a class and its base. Every library may have a copy of its own, so records compare by `type_info`.
-class RttiType
+class KVBASE_API RttiType
 {
 public:
-    RttiType(std::type_info const& info, RttiType const* base) : _info(info), _base(base) {}
+    RttiType(std::type_info const& info, RttiType const* base);
 
     /// True for the class itself and for classes derived from it.
-    bool isA(RttiType const& other) const
-    {
-        for (RttiType const* type = this; type; type = type->_base)
-            if (type->_info == other._info)
-                return true;
-        return false;
-    }
+    bool isA(RttiType const& other) const;
 
 private:
     std::type_info const& _info;

@@ -5,6 +5,18 @@
 namespace Kv
 {
 
+LiString::LiString() = default;
+
+LiString::LiString(LiString const&) = default;
+
+LiString::LiString(LiString&&) noexcept = default;
+
+LiString& LiString::operator=(LiString const&) = default;
+
+LiString& LiString::operator=(LiString&&) noexcept = default;
+
+LiString::~LiString() = default;
+
 LiString::LiString(char const* text) : _text(text ? text : "") {}
 
 LiString::LiString(std::string text) : _text(std::move(text)) {}

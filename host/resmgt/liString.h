@@ -11,7 +11,12 @@ namespace Kv
 class KVRESMGT_API LiString
 {
 public:
-    LiString() = default;
+    LiString();
+    LiString(LiString const&);
+    LiString(LiString&&) noexcept;
+    LiString& operator=(LiString const&);
+    LiString& operator=(LiString&&) noexcept;
+    ~LiString();
 
     /// A null text gives the empty string.
     LiString(char const* text);

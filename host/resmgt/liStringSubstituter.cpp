@@ -8,6 +8,10 @@
 namespace Kv
 {
 
+LiStringSubstituter::LiStringSubstituter() = default;
+
+LiStringSubstituter::~LiStringSubstituter() = default;
+
 void LiStringSubstituter::add(std::string const& pattern, CbHandler<std::string>* handler)
 {
     if (pattern.empty())

@@ -13,6 +13,11 @@ namespace Kv
 class KVRESMGT_API LiStringSubstituter
 {
 public:
+    LiStringSubstituter();
+    LiStringSubstituter(LiStringSubstituter const&) = delete;
+    LiStringSubstituter& operator=(LiStringSubstituter const&) = delete;
+    ~LiStringSubstituter();
+
     /// The handler is borrowed until the last `substitute`. It is called once per occurrence, with a string that holds
     /// the pattern, and leaves there what replaces it. Throws `ExBase` for an empty pattern or no handler.
     void add(std::string const& pattern, CbHandler<std::string>* handler);

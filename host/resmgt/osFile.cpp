@@ -83,6 +83,8 @@ OsFile::FileDescriptorManipGuard::~FileDescriptorManipGuard() = default;
 
 OsFile::OsFile(OsFilePath path) : _path(std::move(path)) {}
 
+OsFile::~OsFile() = default;
+
 std::uint64_t OsFile::getSize() const
 {
     std::error_code error;

@@ -29,6 +29,9 @@ public:
     };
 
     explicit OsFile(OsFilePath path);
+    OsFile(OsFile const&) = delete;
+    OsFile& operator=(OsFile const&) = delete;
+    ~OsFile();
 
     /// Size in bytes, asked of the system at each call. Throws `ExBase`, naming the path, where there is no file, or
     /// what is there is a directory or something else without a size.

@@ -47,6 +47,18 @@ fs::path readLink(fs::path const& path)
 
 } // namespace
 
+OsFilePath::OsFilePath() = default;
+
+OsFilePath::OsFilePath(OsFilePath const&) = default;
+
+OsFilePath::OsFilePath(OsFilePath&&) noexcept = default;
+
+OsFilePath& OsFilePath::operator=(OsFilePath const&) = default;
+
+OsFilePath& OsFilePath::operator=(OsFilePath&&) noexcept = default;
+
+OsFilePath::~OsFilePath() = default;
+
 OsFilePath::OsFilePath(std::string const& path) : _path(path)
 {
     std::size_t const zero = path.find('\0');

@@ -12,7 +12,12 @@ namespace Kv
 class KVRESMGT_API OsFilePath
 {
 public:
-    OsFilePath() = default;
+    OsFilePath();
+    OsFilePath(OsFilePath const&);
+    OsFilePath(OsFilePath&&) noexcept;
+    OsFilePath& operator=(OsFilePath const&);
+    OsFilePath& operator=(OsFilePath&&) noexcept;
+    ~OsFilePath();
 
     /// Keeps the path as it is given. Throws `ExBase` for one with a zero byte, behind which the system would not look.
     explicit OsFilePath(std::string const& path);

@@ -12,6 +12,8 @@ XmlDocument::XmlDocument(std::string const& text)
         _root = makeShd<XmlElement>(tree, root.internal_object());
 }
 
+XmlDocument::~XmlDocument() = default;
+
 RCShdPtr<XmlElement> XmlDocument::getRoot() const
 {
     return _root;

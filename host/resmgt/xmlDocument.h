@@ -17,6 +17,9 @@ public:
     /// whatever is not well-formed, for a document type definition, for an encoding declared as another than UTF-8, and
     /// for elements nested deeper than 1024.
     explicit XmlDocument(std::string const& text);
+    XmlDocument(XmlDocument const&) = delete;
+    XmlDocument& operator=(XmlDocument const&) = delete;
+    ~XmlDocument();
 
     /// The root element, which lives on without the document. Null for a text without any element in it: empty, or
     /// nothing but white space and comments.

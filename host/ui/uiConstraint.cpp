@@ -29,6 +29,16 @@ UiConstraint::UiConstraint(float x1, float y1, float x2, float y2, Type typeX1, 
 
 UiConstraint::UiConstraint(std::array<Edge, EdgeCount> edges) : _edges(std::move(edges)) {}
 
+UiConstraint::UiConstraint(UiConstraint const&) = default;
+
+UiConstraint::UiConstraint(UiConstraint&&) noexcept = default;
+
+UiConstraint& UiConstraint::operator=(UiConstraint const&) = default;
+
+UiConstraint& UiConstraint::operator=(UiConstraint&&) noexcept = default;
+
+UiConstraint::~UiConstraint() = default;
+
 GeVector2<float> UiConstraint::getUIGrid()
 {
     return {unitPixels, unitPixels};

@@ -65,6 +65,11 @@ public:
                  LiString const& siblingY1, LiString const& siblingX2, LiString const& siblingY2);
 
     explicit UiConstraint(std::array<Edge, EdgeCount> edges);
+    UiConstraint(UiConstraint const&);
+    UiConstraint(UiConstraint&&) noexcept;
+    UiConstraint& operator=(UiConstraint const&);
+    UiConstraint& operator=(UiConstraint&&) noexcept;
+    ~UiConstraint();
 
     Edge const& getEdge(EdgeName name) const { return _edges[name]; }
 

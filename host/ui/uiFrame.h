@@ -1,23 +1,29 @@
 #pragma once
 
 #include "base/rcBase.h"
+#include "ui/kvUiExport.h"
 
 namespace Kv
 {
 
 /// What is drawn around a widget.
-class UiFrame : public RCBase<LkCounter<int>>
+class KVUI_API UiFrame : public RCBase<LkCounter<int>>
 {
 public:
+    ~UiFrame() override;
+
     /// True for a frame with a line along its bottom edge.
     virtual bool hasBottomLine() const = 0;
 };
 
 /// A frame that is a line along the bottom.
-class UiFrameLineBottom : public UiFrame
+class KVUI_API UiFrameLineBottom : public UiFrame
 {
 public:
-    bool hasBottomLine() const override { return true; }
+    UiFrameLineBottom();
+    ~UiFrameLineBottom() override;
+
+    bool hasBottomLine() const override;
 };
 
 } // namespace Kv

@@ -52,6 +52,11 @@ int UiLabel::getLeastWidth() const
     return static_cast<int>(WsFontRegistry::getInstance().getDefaultFont()->getStringWidth(_label.getString().c_str()));
 }
 
+UiString& UiLabel::getLabel()
+{
+    return _label;
+}
+
 void UiLabel::setAlign(NtAlign align)
 {
     requireUiThread();

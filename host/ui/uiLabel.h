@@ -26,7 +26,7 @@ public:
     int getLeastWidth() const override;
 
     /// The text on its face.
-    UiString& getLabel() { return _label; }
+    UiString& getLabel();
 
     /// How the text sits in the widget from left to right.
     void setAlign(NtAlign align);

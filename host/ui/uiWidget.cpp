@@ -61,10 +61,20 @@ int UiWidget::getLeastWidth() const
     return 56;
 }
 
+GeRectangle<int> const& UiWidget::getRect() const
+{
+    return _rect;
+}
+
 void UiWidget::setRect(GeRectangle<int> const& rect, bool)
 {
     _rect = rect;
     placePeer();
+}
+
+void UiWidget::setConstraint(UiConstraint const& constraint)
+{
+    _constraint = constraint;
 }
 
 bool UiWidget::isDisplayed() const
@@ -113,6 +123,11 @@ void UiWidget::setBlocked(bool blocked)
     requireUiThread();
     _blocked = blocked;
     enablePeer();
+}
+
+void UiWidget::setKeyboardFocusable(bool focusable)
+{
+    _keyboardFocusable = focusable;
 }
 
 bool UiWidget::hasKeyboard() const

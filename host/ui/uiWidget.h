@@ -61,13 +61,13 @@ public:
 
     /// Where the widget lies in its window, in pixels, y growing upward. The layout says so for a widget with a
     /// constraint, once its window is shown.
-    GeRectangle<int> const& getRect() const { return _rect; }
+    GeRectangle<int> const& getRect() const;
 
     /// Places the widget, and with `layOut` the widgets in it.
     virtual void setRect(GeRectangle<int> const& rect, bool layOut);
 
     std::optional<UiConstraint> const& getConstraint() const { return _constraint; }
-    void setConstraint(UiConstraint const& constraint) { _constraint = constraint; }
+    void setConstraint(UiConstraint const& constraint);
 
     /// Whether the widget itself is to be seen; it is on the screen if all that hold it are so too.
     bool isDisplayed() const;
@@ -89,7 +89,7 @@ public:
 
     /// Whether the widget itself can be given the keyboard.
     bool isKeyboardFocusable() const { return _keyboardFocusable; }
-    void setKeyboardFocusable(bool focusable) { _keyboardFocusable = focusable; }
+    void setKeyboardFocusable(bool focusable);
 
     /// True if the widget, or one in it, has the keyboard whenever its window has it.
     bool hasKeyboard() const;

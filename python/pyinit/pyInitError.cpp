@@ -14,6 +14,10 @@ Error::Error(char const* sourcePath, int line, char const* modName, char const* 
 {
 }
 
+Error::Error(Error const&) = default;
+
+Error& Error::operator=(Error const&) = default;
+
 Error::~Error() = default;
 
 ExBase* Error::clone() const

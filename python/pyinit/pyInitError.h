@@ -14,8 +14,8 @@ class KVPYEXTINIT_API Error : public ExBase
 public:
     /// `modName` is the module as scripts call it. The reason stays as it is given.
     Error(char const* sourcePath, int line, char const* modName, char const* reason);
-    Error(Error const&) = default;
-    Error& operator=(Error const&) = default;
+    Error(Error const&);
+    Error& operator=(Error const&);
     ~Error() override;
 
     std::string const& getModName() const { return _modName; }

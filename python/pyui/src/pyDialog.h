@@ -91,6 +91,9 @@ public:
 
     // The operations from here on throw `UiError` for a name that no widget has.
 
+    /// The widget of that name, in whatever container it stands.
+    RCShdPtr<UiWidget> getWidget(std::string const& name) const;
+
     /// Calls `cb` for events of that type on the widget from now on. `cb` is kept until it is removed.
     void addCallback(std::string const& widgetName, PiWidget::EventType eventType, PyObject* cb);
 
@@ -142,8 +145,6 @@ private:
     /// Takes the handler of a close button from the button that has it, where several bear the name.
     KVPYEXTUI_LOCAL void unwireNamesake(CallbackSet const& set) const;
     KVPYEXTUI_LOCAL void setupCloseCallbacks();
-
-    KVPYEXTUI_LOCAL RCShdPtr<UiWidget> getWidget(std::string const& name) const;
 
     KVPYEXTUI_LOCAL static std::string const _closeButtonClickedKey;
 
