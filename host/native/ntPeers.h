@@ -81,6 +81,9 @@ public:
 
     /// True if the widget, or one in it, has the keyboard whenever its window has it.
     virtual bool hasKeyboard() const = 0;
+
+    /// True for the kinds that hold a value, which the user may have set.
+    virtual bool holdsValue() const = 0;
 };
 
 /// Holds other peers.

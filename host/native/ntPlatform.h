@@ -106,8 +106,7 @@ public:
                                                      NtBrowserListener& listener) = 0;
 
     /// Dispatches events until `*until` is true, however it came to be. What a handler throws ends the loop and is
-    /// thrown on from here. When the application is asked to quit, or a window closes that has nothing else to press,
-    /// `*end` is set to true. Loops nest.
+    /// thrown on from here. When the application is asked to quit, `*end` is set to true. Loops nest.
     virtual void runLoop(bool const volatile* until, bool volatile* end) = 0;
 
     /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.

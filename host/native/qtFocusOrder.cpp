@@ -63,14 +63,9 @@ void sortAsTheEyeGoes(std::vector<Stop>& stops)
 
 constexpr char const* valueMark = "kvHoldsValue";
 
-bool holdsValue(QWidget const* widget)
+bool isPushButton(QWidget const& widget)
 {
-    return widget->property(valueMark).toBool();
-}
-
-bool isPushButton(QWidget const* widget)
-{
-    return qobject_cast<QPushButton const*>(widget);
+    return qobject_cast<QPushButton const*>(&widget);
 }
 
 } // namespace
@@ -98,11 +93,17 @@ void QtFocusOrder::markAsValue(QWidget& widget)
     widget.setProperty(valueMark, true);
 }
 
+bool QtFocusOrder::holdsValue(QWidget const& widget)
+{
+    QWidget const* const proxy = widget.focusProxy();
+    return (proxy ? proxy : &widget)->property(valueMark).toBool();
+}
+
 QWidget* QtFocusOrder::getFirst() const
 {
     for (auto const wanted : {&holdsValue, &isPushButton})
         for (QWidget* const widget : _stops)
-            if (wanted(widget) && takesFocus(*widget))
+            if (wanted(*widget) && takesFocus(*widget))
                 return widget;
     return nullptr;
 }

@@ -21,6 +21,9 @@ public:
     /// Says that a widget holds a value: such a one has the keyboard first.
     static void markAsValue(QWidget& widget);
 
+    /// True for a widget that is marked so, and for one that hands the keyboard on to such a one.
+    static bool holdsValue(QWidget const& widget);
+
     /// The first widget that holds a value, else the first push button, else null.
     QWidget* getFirst() const;
 

@@ -2,6 +2,7 @@
 
 #include "native/bottomLine.h"
 #include "native/floatWidget.h"
+#include "native/qtFocusOrder.h"
 #include "native/qtGuard.h"
 #include "native/qtPeer.h"
 #include "native/qtPointerWatch.h"
@@ -138,6 +139,12 @@ bool QtNative::hasKeyboard() const
         return false;
     QWidget const* const holder = widget->window()->focusWidget();
     return holder && (holder == widget || widget->isAncestorOf(holder));
+}
+
+bool QtNative::holdsValue() const
+{
+    QWidget const* const widget = get();
+    return widget && QtFocusOrder::holdsValue(*widget);
 }
 
 } // namespace Kv

@@ -46,6 +46,7 @@ public:
     void setPointerListener(NtPointerListener& listener);
     void takeKeyboard() const;
     bool hasKeyboard() const;
+    bool holdsValue() const;
 
 private:
     QPointer<QWidget> _widget;

@@ -21,6 +21,7 @@ public:
     void setPointerListener(NtPointerListener& listener) override { _native.setPointerListener(listener); }
     void takeKeyboard() override { _native.takeKeyboard(); }
     bool hasKeyboard() const override { return _native.hasKeyboard(); }
+    bool holdsValue() const override { return _native.holdsValue(); }
 
     /// Borrowed; null when the widget is gone.
     Widget* getNative() const { return static_cast<Widget*>(_native.get()); }

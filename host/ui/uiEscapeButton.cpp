@@ -15,13 +15,22 @@ bool isDisplayedThroughout(UiWidget const& widget)
     return widget.isDisplayed() && (!parent || isDisplayedThroughout(*parent));
 }
 
+Iterator<RCShdPtr<UiWidget>> findButtons(UiContainer const& container)
+{
+    return container.findWidgets(UiWidgetPredicate::isType(UiPushButton::getClassType()) &&
+                                 PrdPredicate<UiWidget>(&isDisplayedThroughout));
+}
+
+bool holdsValues(UiContainer const& container)
+{
+    return container.findWidgets(PrdPredicate<UiWidget>(&UiWidget::holdsValue)).getCardinality() > 0;
+}
+
 } // namespace
 
 RCShdPtr<UiPushButton> findEscapeButton(UiContainer const& container)
 {
-    PrdPredicate<UiWidget> const isReachable(&isDisplayedThroughout);
-    Iterator<RCShdPtr<UiWidget>> buttons =
-        container.findWidgets(UiWidgetPredicate::isType(UiPushButton::getClassType()) && isReachable);
+    Iterator<RCShdPtr<UiWidget>> buttons = findButtons(container);
     RCShdPtr<UiPushButton> button;
     for (buttons.first(); !buttons.atEnd(); buttons.next())
     {
@@ -29,7 +38,12 @@ RCShdPtr<UiPushButton> findEscapeButton(UiContainer const& container)
         if (button->getLabel().getString() == "Cancel")
             return button;
     }
-    return buttons.getCardinality() == 1 ? button : nullptr;
+    return buttons.getCardinality() == 1 && !holdsValues(container) ? button : nullptr;
+}
+
+bool needsAnswer(UiContainer const& container)
+{
+    return findButtons(container).getCardinality() > 1 && !holdsValues(container);
 }
 
 } // namespace Kv

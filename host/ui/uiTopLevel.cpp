@@ -131,7 +131,7 @@ void UiTopLevel::onCloseRequested()
     RCShdPtr<UiTopLevel> const self(this);
     if (RCShdPtr<UiPushButton> const button = findEscapeButton(*_root))
         button->press();
-    else
+    else if (!needsAnswer(*_root))
         WsNative::getPlatform().endLoop();
 }
 

@@ -10,10 +10,9 @@
 namespace Kv
 {
 
-/// A window of its own on the screen, with the tree of widgets in it. A window manager that asks it to close, and
-/// Escape, press its push button labelled "Cancel", else its only push button; one that is disabled does nothing then,
-/// and one that is not displayed does not count. Where there is none, a request to close ends the innermost message
-/// loop.
+/// A window of its own on the screen, with the tree of widgets in it. Escape, and a window manager that asks it to
+/// close, press the button that `findEscapeButton` gives; one that is disabled does nothing then. Where there is none,
+/// a request to close ends the innermost message loop, but not where the window needs an answer.
 class KVUI_API UiTopLevel : public UiWidget, public UiWindow, protected NtWindowListener
 {
 public:

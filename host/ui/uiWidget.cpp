@@ -135,6 +135,11 @@ bool UiWidget::hasKeyboard() const
     return _peer && _peer->hasKeyboard();
 }
 
+bool UiWidget::holdsValue() const
+{
+    return _peer && _peer->holdsValue();
+}
+
 void UiWidget::setFrame(RCShdPtr<UiFrame> const& frame, LiString const& name)
 {
     requireUiThread();

@@ -94,6 +94,9 @@ public:
     /// True if the widget, or one in it, has the keyboard whenever its window has it.
     bool hasKeyboard() const;
 
+    /// True for a kind that holds a value, which the user may have set. Only the screen knows: false elsewhere.
+    bool holdsValue() const;
+
     /// Sets the frame of that name; null takes it away. `DefaultFrame` is the one that there is, another name throws an
     /// `ExBase`.
     void setFrame(RCShdPtr<UiFrame> const& frame, LiString const& name);

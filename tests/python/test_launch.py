@@ -137,24 +137,52 @@ os.seteuid(os.getuid())
 ''', path) == 'Error opening file: %s\n' % path
 
 
-@pytest.mark.parametrize('buttons, pressed', [(['OK', 'Cancel'], 'CloseButton_Cancel'), (['Done'], 'CloseButton_Done'),
-                                              (['Cancel', 'A', 'B'], 'CloseButton_Cancel')])
-def test_escape_and_the_window_manager_press_cancel_or_the_only_button(user, buttons, pressed):
-    dialog = make(*buttons, widgets=FORM[:1])
-    for how in lambda user: user.press(Qt.Key.Key_Escape), lambda user: user.dismiss():
+def escape(user):
+    user.press(Qt.Key.Key_Escape)
+
+
+def ask_to_close(user):
+    user.ask_to_close()
+
+
+@pytest.mark.parametrize('buttons, widgets, pressed', [
+    (['OK', 'Cancel'], FORM, 'Cancel'), (['Cancel', 'A', 'B'], FORM, 'Cancel'), (['Yes', 'Cancel'], FORM[4:], 'Cancel'),
+    (['Done'], FORM[4:], 'Done'), (['Done'], [], 'Done'),
+])
+def test_escape_and_the_window_manager_press_cancel_or_the_only_button_of_a_box(user, buttons, widgets, pressed):
+    dialog = make(*buttons, widgets=widgets)
+    for how in [escape] if stage.APPLICATION else [escape, ask_to_close]:
         user.plan(how)
-        assert dialog.launch() == pressed
+        assert dialog.launch() == 'CloseButton_' + pressed
+
+
+@pytest.mark.parametrize('widgets', [[widget] for widget in FORM[:3]], ids=lambda widgets: widgets[0][0])
+@pytest.mark.parametrize('buttons', [['OK'], ['Yes', 'No']])
+def test_escape_never_confirms_a_form_and_a_close_request_ends_it_without_a_button(user, buttons, widgets):
+    dialog = make(*buttons, widgets=widgets)
+    for hide in lambda: None, lambda: dialog.hideWidget(widgets[0][1]):
+        hide()
+        if not stage.APPLICATION:
+            user.plan(escape, ask_to_close)
+            assert dialog.launch() == '' and 'CloseButtonClicked' not in dialog.getValues()
+    user.plan(escape, lambda user: user.close(buttons[0]))
+    assert dialog.launch() == 'CloseButton_' + buttons[0]
+
+
+def test_a_box_with_a_choice_waits_for_it(user):
+    user.plan(escape, ask_to_close, escape, lambda user: user.close('No'))
+    assert ui.showMessageBox('t', ['?'], ['Yes', 'No']) == 'No'
 
 
 @pytest.mark.standalone
-def test_with_nothing_to_press_escape_does_nothing_and_a_close_request_ends_the_dialog(user):
-    dialog = make('Yes', 'No')
-    user.plan(lambda user: user.press(Qt.Key.Key_Escape), lambda user: user.window().close())
-    assert dialog.launch() == '' and dialog.getValues().get('CloseButtonClicked') is None
-    user.plan(lambda user: user.window().close())
+def test_a_box_with_a_choice_ends_with_the_application_and_one_without_a_button_by_a_close_request(user):
+    user.plan(lambda user: QApplication.exit())
     with pytest.raises(IndexError):
         ui.showMessageBox('t', ['?'], ['Yes', 'No'])
-    assert not stage.dialogs()
+    dialog = make('Yes', 'No', widgets=[])
+    dialog.hideWidget('CloseButtonsContainer')
+    user.plan(escape, ask_to_close)
+    assert dialog.launch() == '' and not stage.dialogs()
 
 
 def test_enter_in_a_text_field_closes_nothing_and_keeps_the_keyboard_there(user):

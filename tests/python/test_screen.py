@@ -43,7 +43,7 @@ def ask(dialog, name, event):
 dialog.addCallback('Ask', ui.EventType.ACTIVATE, ask)
 for _ in range(2):
     print(dialog.launch(), dialog.getValue('a'))
-print(ui.showSimpleDialog('Other', [('TextField', 'b')], 300, False))
+print(ui.showSimpleDialog('Other', [('TextField', 'b')], 300, True))
 ''')
     desk.wait_for_window('Again')
     desk.run('type', 'first')
@@ -63,5 +63,5 @@ print(ui.showSimpleDialog('Other', [('TextField', 'b')], 300, False))
     desk.wait_for_window('Other')
     desk.run('type', 'x')
     desk.run('key', 'Escape')
-    assert script.communicate()[0] == "{'CloseButtonClicked': 'CloseButton_OK', 'b': 'x'}\n"
+    assert script.communicate()[0] == "{'CloseButtonClicked': 'CloseButton_Cancel', 'b': 'x'}\n"
     assert script.returncode == 0
