@@ -14,7 +14,7 @@ namespace Kv
 /// Escape, press its push button labelled "Cancel", else its only push button; one that is disabled does nothing then,
 /// and one that is not displayed does not count. Where there is none, a request to close ends the innermost message
 /// loop.
-class KVUI_API UiTopLevel : public UiWidget, public UiWindow, protected NtWindowListener
+class KV_API UiTopLevel : public UiWidget, public UiWindow, protected NtWindowListener
 {
 public:
     /// A window that is not yet shown. Makes no native window, which comes with the first show.
