@@ -1,6 +1,6 @@
 #pragma once
 
-#include "appUi/kvAppUiExport.h"
+#include "base/kvExport.h"
 #include "base/prdPredicate.h"
 #include "base/rcBase.h"
 #include "base/rcShdPtr.h"
@@ -12,7 +12,7 @@ namespace Kv
 {
 
 /// What a browser shows an entry for: a file or a directory. It need not exist any more.
-class KVAPPUI_API BrBrowsable : public RCBase<LkCounter<int>>
+class KV_API BrBrowsable : public RCBase<LkCounter<int>>
 {
 public:
     explicit BrBrowsable(LiString path);
@@ -26,7 +26,7 @@ private:
 };
 
 /// A browsable as part of a selection.
-class KVAPPUI_API BrBrowsableItem : public SnItem
+class KV_API BrBrowsableItem : public SnItem
 {
 public:
     /// `browsable` is not null.
@@ -40,7 +40,7 @@ private:
 };
 
 /// The browsables in a selection.
-template <> class KVAPPUI_API SnItemConvert<RCShdPtr<BrBrowsable>>
+template <> class KV_API SnItemConvert<RCShdPtr<BrBrowsable>>
 {
 public:
     /// Holds for items that stand for a browsable.

@@ -1,9 +1,9 @@
 #pragma once
 
 #include "appUi/brTypes.h"
-#include "appUi/kvAppUiExport.h"
 #include "appUi/uiView.h"
 #include "base/cbHandler.h"
+#include "base/kvExport.h"
 #include "internalAPI/snSelection.h"
 #include "native/ntPeers.h"
 #include "resmgt/liString.h"
@@ -21,7 +21,7 @@ namespace Kv
 ///
 /// Paths are bytes of the file system, absolute, and those of a collapsed sequence are that of its first file. All of
 /// it works without a window too: directory, focus and selection are the widget's own.
-class KVAPPUI_API BrBrowser : public UiWidget, private NtBrowserListener
+class KV_API BrBrowser : public UiWidget, private NtBrowserListener
 {
 public:
     /// A browser at the end of `parent`. There are no resource tables for it: pass null.

@@ -10,7 +10,7 @@ namespace Kv
 
 /// Floating browser with an OK and a Cancel button, for picking a path. Enter on a file, and a double click, press OK;
 /// Escape presses Cancel, which hides the browser.
-class KVAPPUI_API BrBrowserFloatingHandler : public UiFloatingHandler
+class KV_API BrBrowserFloatingHandler : public UiFloatingHandler
 {
 public:
     /// A hidden browser in the middle of `parent`, at `place`, where the browsables of `selection` are selected. An

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "appUi/kvAppUiExport.h"
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "ui/uiMainWindow.h"
 
@@ -10,7 +10,7 @@ namespace Kv
 /// Keeps the application's own widgets from taking input for as long as it lives, while the floating containers that
 /// come to the front meanwhile stay usable. The last one to go leaves the application as it was. Without an application
 /// it does nothing.
-class KVAPPUI_API UiAppDisabler
+class KV_API UiAppDisabler
 {
 public:
     UiAppDisabler();

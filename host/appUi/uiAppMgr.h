@@ -1,7 +1,7 @@
 #pragma once
 
-#include "appUi/kvAppUiExport.h"
 #include "appUi/uiView.h"
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "ui/uiMainWindow.h"
 #include "ui/uiPanel.h"
@@ -13,7 +13,7 @@ namespace Kv
 {
 
 /// Knows the windows of the application, and in a standalone interpreter those that scripts open on their own.
-class KVAPPUI_API UiAppMgr
+class KV_API UiAppMgr
 {
 public:
     static UiAppMgr& getInstance();

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "appUi/kvAppUiExport.h"
 #include "appUi/uiCompositionWorkspaceClientInterface.h"
 #include "appUi/uiWorkspace.h"
+#include "base/kvExport.h"
 #include "base/rcStrongPtr.h"
 #include "framework/fwCompositionListener.h"
 
@@ -17,9 +17,9 @@ class UiCompositionWorkspaceListener;
 
 /// The workspace of the application: opens compositions, holds them, and closes them. While there are any, one of them
 /// is the current one.
-class KVAPPUI_API UiCompositionWorkspace : public UiWorkspace,
-                                           public UiCompositionWorkspaceClientInterface,
-                                           private FwCompositionListener
+class KV_API UiCompositionWorkspace : public UiWorkspace,
+                                      public UiCompositionWorkspaceClientInterface,
+                                      private FwCompositionListener
 {
 public:
     /// Gives the widget that has the keyboard, borrowed, or null.

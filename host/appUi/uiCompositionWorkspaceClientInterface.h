@@ -1,7 +1,7 @@
 #pragma once
 
-#include "appUi/kvAppUiExport.h"
 #include "base/constIterator.h"
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "base/rcWeakPtr.h"
 #include "internalAPI/piCompositionGraphInterface.h"
@@ -13,7 +13,7 @@ namespace Kv
 
 /// The compositions of a workspace, for whoever is not the application. They are watched, not held: one that is closed
 /// expires.
-class KVAPPUI_API UiCompositionWorkspaceClientInterface
+class KV_API UiCompositionWorkspaceClientInterface
 {
 public:
     UiCompositionWorkspaceClientInterface() = default;

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "appUi/kvAppUiExport.h"
+#include "base/kvExport.h"
 #include "base/rcWeakPtr.h"
 #include "internalAPI/piCompositionGraphInterface.h"
 
@@ -8,7 +8,7 @@ namespace Kv
 {
 
 /// Hears what happens in a workspace, each time after it has happened.
-class KVAPPUI_API UiCompositionWorkspaceListener
+class KV_API UiCompositionWorkspaceListener
 {
 public:
     UiCompositionWorkspaceListener() = default;

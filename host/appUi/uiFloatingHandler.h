@@ -1,7 +1,7 @@
 #pragma once
 
-#include "appUi/kvAppUiExport.h"
 #include "base/geVector2.h"
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "ui/uiEventCallback.h"
 #include "ui/uiMoveContainer.h"
@@ -10,7 +10,7 @@ namespace Kv
 {
 
 /// Owns a floating container with a title bar that the user moves it by. It goes with the handler.
-class KVAPPUI_API UiFloatingHandler
+class KV_API UiFloatingHandler
 {
 public:
     UiFloatingHandler(UiFloatingHandler const&) = delete;

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "appUi/kvAppUiExport.h"
+#include "base/kvExport.h"
 #include "base/rcBase.h"
 #include "base/rcShdPtr.h"
 #include "internalAPI/snSelection.h"
@@ -9,7 +9,7 @@ namespace Kv
 {
 
 /// What a widget that shows a collection lets others know of it. It is found among the widget's client data.
-class KVAPPUI_API UiView : public RCBase<LkCounter<int>>
+class KV_API UiView : public RCBase<LkCounter<int>>
 {
 public:
     ~UiView() override;

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "appUi/kvAppUiExport.h"
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "base/uPtr.h"
 #include "ui/uiWidget.h"
@@ -9,7 +9,7 @@ namespace Kv
 {
 
 /// Where the user of the interactive application works.
-class KVAPPUI_API UiWorkspace : public RCBase<LkCounter<int>>
+class KV_API UiWorkspace : public RCBase<LkCounter<int>>
 {
 public:
     ~UiWorkspace() override;

@@ -6,7 +6,7 @@ namespace Kv
 {
 
 /// Thrown by an assertion that does not hold.
-class KVBASE_API ExAssertionFailed : public ExBase
+class KV_API ExAssertionFailed : public ExBase
 {
 public:
     using ExBase::ExBase;
@@ -15,7 +15,7 @@ public:
 };
 
 /// Failing assertions are exceptions: they reach the caller and end nothing.
-class KVBASE_API Assertions
+class KV_API Assertions
 {
 public:
     /// Throws `ExAssertionFailed`; its words hold `expression`.

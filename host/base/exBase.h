@@ -1,6 +1,6 @@
 #pragma once
 
-#include "base/kvBaseExport.h"
+#include "base/kvExport.h"
 
 #include <exception>
 #include <string>
@@ -9,7 +9,7 @@ namespace Kv
 {
 
 /// Base of every exception of the host. Carries words for a person and the place in the source that threw it.
-class KVBASE_API ExBase : public std::exception
+class KV_API ExBase : public std::exception
 {
 public:
     /// `sourcePath` and `line` tell where it is thrown, `reason` what is wrong. Bytes of the reason that are no UTF-8,

@@ -1,19 +1,19 @@
 #pragma once
 
 #include "base/inInit.h"
-#include "base/kvBaseExport.h"
+#include "base/kvExport.h"
 
 namespace KvInit
 {
 
 /// Stands for libKVbase among the packages.
-class KVBASE_API base;
+class KV_API base;
 
 } // namespace KvInit
 
 namespace Kv
 {
 
-template <> KVBASE_API std::type_info const* InInit<KvInit::base>::getType();
+template <> KV_API std::type_info const* InInit<KvInit::base>::getType();
 
 } // namespace Kv

@@ -1,12 +1,12 @@
 #pragma once
 
-#include "base/kvBaseExport.h"
+#include "base/kvExport.h"
 
 namespace Kv
 {
 
 /// What a package says of the build that it comes from. The texts last as long as this.
-class KVBASE_API InBuildInfo
+class KV_API InBuildInfo
 {
 public:
     InBuildInfo();

@@ -25,7 +25,7 @@ struct InPackageInfo
 };
 
 /// What is known of the process and of the packages that it is made of.
-class KVBASE_API InBuildInfoUtil
+class KV_API InBuildInfoUtil
 {
 public:
     /// Takes the build information of the package whose `initPackage` is running, and keeps it until the package is

@@ -8,7 +8,7 @@ namespace Kv
 {
 
 /// Build information of the libraries around the module, which all come from one build.
-class KVBASE_API InLibraryBuildInfo : public InBuildInfo
+class KV_API InLibraryBuildInfo : public InBuildInfo
 {
 public:
     /// `buildDate` is `__DATE__` of the library.

@@ -10,7 +10,7 @@ namespace Kv
 
 /// Record of a package: one static object of the library, which announces it while the library loads and takes it back
 /// when it is unloaded. Packages name each other by the types of their records.
-class KVBASE_API InPackageInit : public InPackageInitBase
+class KV_API InPackageInit : public InPackageInitBase
 {
 public:
     explicit InPackageInit(char const* name);

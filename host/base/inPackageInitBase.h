@@ -9,7 +9,7 @@ namespace Kv
 
 /// The life of a package, as it is told of it. Packages that are loaded together are set up together, each after those
 /// that it depends on, and all are taken down in the opposite order when the process ends.
-class KVBASE_API InPackageInitBase : public InVariableBase
+class KV_API InPackageInitBase : public InVariableBase
 {
 public:
     explicit InPackageInitBase(char const* name);

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "base/kvBaseExport.h"
+#include "base/kvExport.h"
 
 #include <vector>
 
@@ -8,7 +8,7 @@ namespace Kv
 {
 
 /// What has to be set up in an order: knows what must be ready before it. Borrows what it depends on.
-class KVBASE_API InVariableBase
+class KV_API InVariableBase
 {
 public:
     InVariableBase() = default;

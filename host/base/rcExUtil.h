@@ -9,7 +9,7 @@ namespace Kv
 {
 
 /// Thrown by going through a null counted pointer.
-class KVBASE_API ExNullPtr : public ExBase
+class KV_API ExNullPtr : public ExBase
 {
 public:
     using ExBase::ExBase;
@@ -18,7 +18,7 @@ public:
 };
 
 /// Thrown by a cast that the object's type does not allow.
-class KVBASE_API ExCastFailed : public ExBase
+class KV_API ExCastFailed : public ExBase
 {
 public:
     using ExBase::ExBase;
@@ -27,7 +27,7 @@ public:
 };
 
 /// The failures that all counted pointers share.
-class KVBASE_API RCExUtil
+class KV_API RCExUtil
 {
 public:
     /// Throws `ExNullPtr`. `typeName` is the pointer's type, mangled or plain; the words hold it in plain form.

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "base/kvBaseExport.h"
+#include "base/kvExport.h"
 
 #include <typeinfo>
 
@@ -8,7 +8,7 @@ namespace Kv
 {
 
 /// Record of a class and its base. Every library may have a copy of its own, so records compare by `type_info`.
-class KVBASE_API RttiType
+class KV_API RttiType
 {
 public:
     RttiType(std::type_info const& info, RttiType const* base);

@@ -1,8 +1,8 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcStrongPtr.h"
 #include "base/rcWeakPtr.h"
-#include "framework/kvFrameworkExport.h"
 #include "internalAPI/piCompositionGraphInterface.h"
 #include "resmgt/osFilePath.h"
 
@@ -15,7 +15,7 @@ class FwNode;
 
 /// A composition that has been read from its file. It is closed by its strong pointers being let go; what is left of
 /// its graph then no longer changes.
-class KVFRAMEWORK_API FwComposition : public PiCompositionGraphInterface
+class KV_API FwComposition : public PiCompositionGraphInterface
 {
 public:
     /// The extension of the names of compositions' files, without the dot.

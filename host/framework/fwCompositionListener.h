@@ -1,6 +1,6 @@
 #pragma once
 
-#include "framework/kvFrameworkExport.h"
+#include "base/kvExport.h"
 
 namespace Kv
 {
@@ -8,7 +8,7 @@ namespace Kv
 class FwComposition;
 
 /// Hears what happens to a composition, after it has happened.
-class KVFRAMEWORK_API FwCompositionListener
+class KV_API FwCompositionListener
 {
 public:
     FwCompositionListener() = default;

@@ -1,19 +1,19 @@
 #pragma once
 
 #include "base/inInit.h"
-#include "framework/kvFrameworkExport.h"
+#include "base/kvExport.h"
 
 namespace KvInit
 {
 
 /// Stands for libKVframework among the packages.
-class KVFRAMEWORK_API framework;
+class KV_API framework;
 
 } // namespace KvInit
 
 namespace Kv
 {
 
-template <> KVFRAMEWORK_API std::type_info const* InInit<KvInit::framework>::getType();
+template <> KV_API std::type_info const* InInit<KvInit::framework>::getType();
 
 } // namespace Kv

@@ -1,19 +1,19 @@
 #pragma once
 
 #include "base/inInit.h"
-#include "gfx/kvGfxExport.h"
+#include "base/kvExport.h"
 
 namespace KvInit
 {
 
 /// Stands for libKVgfx among the packages.
-class KVGFX_API gfx;
+class KV_API gfx;
 
 } // namespace KvInit
 
 namespace Kv
 {
 
-template <> KVGFX_API std::type_info const* InInit<KvInit::gfx>::getType();
+template <> KV_API std::type_info const* InInit<KvInit::gfx>::getType();
 
 } // namespace Kv

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "gfx/kvGfxExport.h"
+#include "base/kvExport.h"
 #include "native/ntPlatform.h"
 #include "resmgt/liString.h"
 
@@ -9,7 +9,7 @@ namespace Kv
 
 /// The cursors by name, and the current one. A change is seen once there is a window system; before that it is only
 /// remembered.
-class KVGFX_API WsCursorRegistry
+class KV_API WsCursorRegistry
 {
 public:
     /// "normal": each widget's own pointer.

@@ -1,13 +1,13 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcBase.h"
-#include "gfx/kvGfxExport.h"
 
 namespace Kv
 {
 
 /// A font that widgets draw with.
-class KVGFX_API WsFont : public RCBase<LkCounter<int>>
+class KV_API WsFont : public RCBase<LkCounter<int>>
 {
 public:
     /// Width of a UTF-8 text as a widget draws it, in pixels, rounded up to whole ones. Works without a display too.

@@ -7,7 +7,7 @@ namespace Kv
 {
 
 /// The fonts of the process.
-class KVGFX_API WsFontRegistry
+class KV_API WsFontRegistry
 {
 public:
     static WsFontRegistry& getInstance();

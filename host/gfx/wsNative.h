@@ -1,6 +1,6 @@
 #pragma once
 
-#include "gfx/kvGfxExport.h"
+#include "base/kvExport.h"
 #include "native/ntPlatform.h"
 
 namespace Kv
@@ -8,7 +8,7 @@ namespace Kv
 
 /// The way to the window system. Its library is loaded at the first need, so that a process which only makes
 /// descriptions never pays for it.
-class KVGFX_API WsNative
+class KV_API WsNative
 {
 public:
     /// The platform, loaded if it is not yet there. Throws an `ExBase` with words where it cannot be loaded, and on

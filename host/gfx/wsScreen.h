@@ -1,13 +1,13 @@
 #pragma once
 
 #include "base/geVector2.h"
-#include "gfx/kvGfxExport.h"
+#include "base/kvExport.h"
 
 namespace Kv
 {
 
 /// The screen that new windows go to.
-class KVGFX_API WsScreen
+class KV_API WsScreen
 {
 public:
     static WsScreen& getInstance();

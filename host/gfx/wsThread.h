@@ -1,12 +1,12 @@
 #pragma once
 
-#include "gfx/kvGfxExport.h"
+#include "base/kvExport.h"
 
 namespace Kv
 {
 
 /// The one thread of the user interface: the first that asks for any of it.
-class KVGFX_API WsThread
+class KV_API WsThread
 {
 public:
     /// Throws an `ExBase` with words when called on another thread than that of the user interface. `what` names what

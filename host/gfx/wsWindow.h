@@ -1,7 +1,7 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcBase.h"
-#include "gfx/kvGfxExport.h"
 #include "native/ntPeers.h"
 
 #include <memory>
@@ -10,7 +10,7 @@ namespace Kv
 {
 
 /// A window of the window system; owns its native side.
-class KVGFX_API WsWindow : public RCBase<LkCounter<int>>
+class KV_API WsWindow : public RCBase<LkCounter<int>>
 {
 public:
     explicit WsWindow(std::unique_ptr<NtWindow> native);

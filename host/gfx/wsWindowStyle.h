@@ -1,9 +1,9 @@
 #pragma once
 
 #include "base/geRectangle.h"
+#include "base/kvExport.h"
 #include "base/rcBase.h"
 #include "base/rcShdPtr.h"
-#include "gfx/kvGfxExport.h"
 
 namespace Kv
 {
@@ -35,7 +35,7 @@ enum class CloseButtonStyle
 };
 
 /// How a window looks on the screen, and where it stands.
-class KVGFX_API WsWindowStyle : public RCBase<LkCounter<int>>
+class KV_API WsWindowStyle : public RCBase<LkCounter<int>>
 {
 public:
     explicit WsWindowStyle(GeRectangle<int> const& frame) : _frame(frame) {}
@@ -48,7 +48,7 @@ private:
 };
 
 /// Makes window styles.
-class KVGFX_API WsWindowStyleUtils
+class KV_API WsWindowStyleUtils
 {
 public:
     /// The style of a window for `frame`, on the screen of the number `screen`; 0 is the one that there always is.

@@ -1,19 +1,19 @@
 #pragma once
 
 #include "base/inInit.h"
-#include "internalAPI/kvInternalApiExport.h"
+#include "base/kvExport.h"
 
 namespace KvInit
 {
 
 /// Stands for libKVinternalAPI among the packages.
-class KVINTERNALAPI_API internalAPI;
+class KV_API internalAPI;
 
 } // namespace KvInit
 
 namespace Kv
 {
 
-template <> KVINTERNALAPI_API std::type_info const* InInit<KvInit::internalAPI>::getType();
+template <> KV_API std::type_info const* InInit<KvInit::internalAPI>::getType();
 
 } // namespace Kv

@@ -1,13 +1,13 @@
 #pragma once
 
-#include "internalAPI/kvInternalApiExport.h"
+#include "base/kvExport.h"
 #include "resmgt/liString.h"
 
 namespace Kv
 {
 
 /// The kinds of entity that a browser can show, by the names that browsers know them by.
-class KVINTERNALAPI_API PiBrowserSchemes
+class KV_API PiBrowserSchemes
 {
 public:
     static LiString const FsScheme;

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "internalAPI/kvInternalApiExport.h"
+#include "base/kvExport.h"
 #include "pluginAPI/piGraph.h"
 #include "pluginAPI/piNodeController.h"
 #include "resmgt/osFilePath.h"
@@ -9,7 +9,7 @@ namespace Kv
 {
 
 /// A composition as the application sees it: the controller of a graph that is kept in a file.
-class KVINTERNALAPI_API PiCompositionGraphInterface : public virtual PiNodeController
+class KV_API PiCompositionGraphInterface : public virtual PiNodeController
 {
 public:
     ~PiCompositionGraphInterface() override;

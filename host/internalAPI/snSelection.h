@@ -11,7 +11,7 @@ namespace Kv
 
 /// What was selected at one moment, in the order in which it is shown. Keeps its items; it does not follow later
 /// changes.
-class KVINTERNALAPI_API SnSelection : public RCBase<LkCounter<int>>
+class KV_API SnSelection : public RCBase<LkCounter<int>>
 {
 public:
     using Items = std::list<RCShdPtr<const SnItem>>;

@@ -1,19 +1,19 @@
 #pragma once
 
 #include "base/inInit.h"
-#include "pluginAPI/kvPluginApiExport.h"
+#include "base/kvExport.h"
 
 namespace KvInit
 {
 
 /// Stands for libKVpluginAPI among the packages.
-class KVPLUGINAPI_API pluginAPI;
+class KV_API pluginAPI;
 
 } // namespace KvInit
 
 namespace Kv
 {
 
-template <> KVPLUGINAPI_API std::type_info const* InInit<KvInit::pluginAPI>::getType();
+template <> KV_API std::type_info const* InInit<KvInit::pluginAPI>::getType();
 
 } // namespace Kv

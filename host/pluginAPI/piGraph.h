@@ -1,8 +1,8 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "base/rcWeakPtr.h"
-#include "pluginAPI/kvPluginApiExport.h"
 
 #include <string>
 #include <vector>
@@ -14,7 +14,7 @@ class PiNode;
 class PiNodeController;
 
 /// Nodes that are joined by their inputs. It can outlive its controller; then it is closed, and no longer changes.
-class KVPLUGINAPI_API PiGraph : public RCBase<LkCounter<int>>
+class KV_API PiGraph : public RCBase<LkCounter<int>>
 {
 public:
     ~PiGraph() override;

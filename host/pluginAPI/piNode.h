@@ -1,8 +1,8 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "base/rcWeakPtr.h"
-#include "pluginAPI/kvPluginApiExport.h"
 
 #include <string>
 #include <utility>
@@ -15,7 +15,7 @@ class PiGraph;
 class PiNodeController;
 
 /// An operation in a graph. All texts are UTF-8 where nothing else is said.
-class KVPLUGINAPI_API PiNode : public RCBase<LkCounter<int>>
+class KV_API PiNode : public RCBase<LkCounter<int>>
 {
 public:
     /// Pairs of a name and what stands under it, each name once, in their order.

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
-#include "pluginAPI/kvPluginApiExport.h"
 
 namespace Kv
 {
@@ -9,7 +9,7 @@ namespace Kv
 class PiNode;
 
 /// What stands behind a node and decides about it. It is held by strong pointers alone, and reached by weak ones.
-class KVPLUGINAPI_API PiNodeController
+class KV_API PiNodeController
 {
 public:
     PiNodeController() = default;

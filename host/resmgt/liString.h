@@ -1,6 +1,6 @@
 #pragma once
 
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 
 #include <string>
 
@@ -8,7 +8,7 @@ namespace Kv
 {
 
 /// The host's string: bytes, as a rule UTF-8, of any content.
-class KVRESMGT_API LiString
+class KV_API LiString
 {
 public:
     LiString();
@@ -34,7 +34,7 @@ private:
     std::string _text;
 };
 
-KVRESMGT_API bool operator==(LiString const& a, LiString const& b);
-KVRESMGT_API bool operator!=(LiString const& a, LiString const& b);
+KV_API bool operator==(LiString const& a, LiString const& b);
+KV_API bool operator!=(LiString const& a, LiString const& b);
 
 } // namespace Kv

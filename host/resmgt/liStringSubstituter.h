@@ -1,7 +1,7 @@
 #pragma once
 
 #include "base/cbHandler.h"
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 
 #include <string>
 #include <vector>
@@ -10,7 +10,7 @@ namespace Kv
 {
 
 /// Replaces patterns in a text by what handlers give for them.
-class KVRESMGT_API LiStringSubstituter
+class KV_API LiStringSubstituter
 {
 public:
     LiStringSubstituter();

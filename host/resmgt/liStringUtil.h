@@ -1,6 +1,6 @@
 #pragma once
 
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 
 #include <cstddef>
 #include <string>
@@ -10,7 +10,7 @@ namespace Kv
 {
 
 /// Questions about texts, and the forms that they take in words for a person.
-class KVRESMGT_API LiStringUtil
+class KV_API LiStringUtil
 {
 public:
     /// The number in decimal, with a leading minus sign where it is negative, whatever the locale.

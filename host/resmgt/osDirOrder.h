@@ -10,7 +10,7 @@ namespace Kv
 
 /// Sorts the entries of a directory a step at a time, so that a loop can run in between whatever their number.
 /// Directories always come first; what counts alike comes by its name.
-class KVRESMGT_API OsDirOrder
+class KV_API OsDirOrder
 {
 public:
     enum Key

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -35,7 +35,7 @@ struct OsDirEntry
 };
 
 /// When a directory was changed last, to find out whether it still is what was read.
-struct KVRESMGT_API OsDirStamp
+struct KV_API OsDirStamp
 {
     std::uint64_t device = 0;
     std::uint64_t inode = 0;
@@ -52,7 +52,7 @@ struct KVRESMGT_API OsDirStamp
 };
 
 /// Reads a directory a step at a time, so that a loop can run in between whatever the size.
-class KVRESMGT_API OsDirScan
+class KV_API OsDirScan
 {
 public:
     /// How many names one step reads at most.

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 #include "resmgt/osFilePath.h"
 
 #include <cstdint>
@@ -11,12 +11,12 @@ namespace Kv
 {
 
 /// A file of the system, by its path; the file need not exist.
-class KVRESMGT_API OsFile
+class KV_API OsFile
 {
 public:
     /// While one lives, no other thread that uses the guard opens or closes a descriptor. Who forks takes it too, so
     /// that the child inherits no descriptor that is half set up. One thread may hold several.
-    class KVRESMGT_API FileDescriptorManipGuard
+    class KV_API FileDescriptorManipGuard
     {
     public:
         FileDescriptorManipGuard();

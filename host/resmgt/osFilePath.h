@@ -1,6 +1,6 @@
 #pragma once
 
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 
 #include <filesystem>
 #include <string>
@@ -9,7 +9,7 @@ namespace Kv
 {
 
 /// Path of a file: a list of components, of which a default path and one made from the empty string have none.
-class KVRESMGT_API OsFilePath
+class KV_API OsFilePath
 {
 public:
     OsFilePath();

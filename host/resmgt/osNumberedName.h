@@ -1,6 +1,6 @@
 #pragma once
 
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 
 #include <cstdint>
 #include <optional>
@@ -12,7 +12,7 @@ namespace Kv
 
 /// The name of a file that is one of a numbered sequence: "frame.0001.exr" is "frame.", the number 1 in 4 digits, and
 /// ".exr".
-struct KVRESMGT_API OsNumberedName
+struct KV_API OsNumberedName
 {
     std::string prefix;
     std::string suffix;

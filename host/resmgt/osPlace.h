@@ -1,6 +1,6 @@
 #pragma once
 
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 
 #include <string>
 
@@ -8,7 +8,7 @@ namespace Kv
 {
 
 /// Where a path leads: to a directory, or to an entry in one. All are bytes of the file system.
-struct KVRESMGT_API OsPlace
+struct KV_API OsPlace
 {
     /// Absolute, without a slash at the end but for the root.
     std::string directory;

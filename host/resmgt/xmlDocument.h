@@ -1,7 +1,7 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
-#include "resmgt/kvResmgtExport.h"
 #include "resmgt/xmlElement.h"
 
 #include <string>
@@ -10,7 +10,7 @@ namespace Kv
 {
 
 /// An XML document, read from its text.
-class KVRESMGT_API XmlDocument
+class KV_API XmlDocument
 {
 public:
     /// Reads `text`, which is the document itself, in UTF-8, and no file name. Throws `XmlError` with the line for

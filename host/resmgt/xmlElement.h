@@ -1,7 +1,7 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcBase.h"
-#include "resmgt/kvResmgtExport.h"
 
 #include <memory>
 #include <optional>
@@ -20,7 +20,7 @@ class XmlTree;
 
 /// An element of a document that has been read. Cheap to copy; each keeps the whole document alive. All texts are
 /// UTF-8 with their references decoded.
-class KVRESMGT_API XmlElement : public RCBase<LkCounter<int>>
+class KV_API XmlElement : public RCBase<LkCounter<int>>
 {
 public:
     /// `node` is an element of `tree`. `XmlDocument` makes the first one, the elements give the others.

@@ -1,13 +1,13 @@
 #pragma once
 
 #include "base/exBase.h"
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 
 namespace Kv
 {
 
 /// Thrown for what is wrong with an XML text, read or written.
-class KVRESMGT_API XmlError : public ExBase
+class KV_API XmlError : public ExBase
 {
 public:
     /// `sourcePath` and `sourceLine` tell where it is thrown. `line` is the line of the text, from 1, which then stands

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "resmgt/kvResmgtExport.h"
+#include "base/kvExport.h"
 
 #include <iosfwd>
 #include <set>
@@ -13,7 +13,7 @@ namespace Kv
 /// Writes one XML document, in UTF-8, onto a stream as the calls come; behind the last `closeTag` the stream holds all
 /// of it. What XML cannot hold, and calls that would give no document, throw `XmlError` and leave stream and writer as
 /// they were. A stream that fails throws `XmlError` too, and is of no more use.
-class KVRESMGT_API XmlWriter
+class KV_API XmlWriter
 {
 public:
     /// The stream is borrowed for the writer's lifetime. `indent` is the number of blanks per level, 0 or more.

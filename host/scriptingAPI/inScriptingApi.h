@@ -1,19 +1,19 @@
 #pragma once
 
 #include "base/inInit.h"
-#include "scriptingAPI/kvScriptingApiExport.h"
+#include "base/kvExport.h"
 
 namespace KvInit
 {
 
 /// Stands for libKVscriptingAPI among the packages.
-class KVSCRIPTINGAPI_API scriptingAPI;
+class KV_API scriptingAPI;
 
 } // namespace KvInit
 
 namespace Kv
 {
 
-template <> KVSCRIPTINGAPI_API std::type_info const* InInit<KvInit::scriptingAPI>::getType();
+template <> KV_API std::type_info const* InInit<KvInit::scriptingAPI>::getType();
 
 } // namespace Kv

@@ -1,13 +1,13 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/uuid.h"
-#include "scriptingAPI/kvScriptingApiExport.h"
 
 namespace Kv
 {
 
 /// What native code asks of the running Python.
-class KVSCRIPTINGAPI_API PiPythonUtils
+class KV_API PiPythonUtils
 {
 public:
     /// Identity of the interpreter that runs on this thread; stays the same for as long as that interpreter lives.

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "base/cbHandler.h"
+#include "base/kvExport.h"
 #include "base/rcBase.h"
-#include "ui/kvUiExport.h"
 
 #include <vector>
 
@@ -12,7 +12,7 @@ namespace Kv
 class EvEvent;
 
 /// A widget's face to those who want to hear of its events.
-class KVUI_API PiWidget : public RCBase<LkCounter<int>>
+class KV_API PiWidget : public RCBase<LkCounter<int>>
 {
 public:
     enum EventType

@@ -1,12 +1,12 @@
 #pragma once
 
-#include "ui/kvUiExport.h"
+#include "base/kvExport.h"
 
 namespace Kv
 {
 
 /// The process as an application with windows.
-class KVUI_API UiApplication
+class KV_API UiApplication
 {
 public:
     /// Borrowed; lives as long as the process.

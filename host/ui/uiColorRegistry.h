@@ -1,14 +1,14 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "gfx/coRgbColor.h"
 #include "resmgt/liString.h"
-#include "ui/kvUiExport.h"
 
 namespace Kv
 {
 
 /// The colours by name.
-class KVUI_API UiColorRegistry
+class KV_API UiColorRegistry
 {
 public:
     /// "grey65": grey of 65 % of the light of white.

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "base/geVector2.h"
+#include "base/kvExport.h"
 #include "resmgt/liString.h"
-#include "ui/kvUiExport.h"
 
 #include <array>
 
@@ -10,7 +10,7 @@ namespace Kv
 {
 
 /// Says where the four edges of a widget lie. X grows to the right and Y grows upward, so that Y1 is the bottom edge.
-class KVUI_API UiConstraint
+class KV_API UiConstraint
 {
 public:
     /// The measure of a value.

@@ -14,7 +14,7 @@ namespace Kv
 class UiWidgetElement;
 
 /// Widget that holds others, lays them out by their constraints and finds them by name.
-class KVUI_API UiContainer : public UiWidget
+class KV_API UiContainer : public UiWidget
 {
 public:
     /// A container at the end of `parent`. There are no resource tables for the built-in kinds: pass null.

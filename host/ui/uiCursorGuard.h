@@ -1,13 +1,13 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "resmgt/liString.h"
-#include "ui/kvUiExport.h"
 
 namespace Kv
 {
 
 /// Holds a cursor for as long as it lives; then the cursor that was current when it was made is current again.
-class KVUI_API UiCursorGuard
+class KV_API UiCursorGuard
 {
 public:
     /// Throws an `ExBase` that lists the names for a name that no cursor has.

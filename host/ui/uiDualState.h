@@ -9,7 +9,7 @@ namespace Kv
 class UiWidgetElement;
 
 /// A button that is on or off. Raises `State` when that changes, and `Activate` when the user clicks it.
-class KVUI_API UiDualState : public UiWidget, private NtToggleListener
+class KV_API UiDualState : public UiWidget, private NtToggleListener
 {
 public:
     /// A toggle at the end of `parent`. There are no resource tables for the built-in kinds: pass null.

@@ -1,13 +1,13 @@
 #pragma once
 
 #include "base/rcBase.h"
-#include "ui/kvUiExport.h"
+#include "base/kvExport.h"
 
 namespace Kv
 {
 
 /// What is drawn around a widget.
-class KVUI_API UiFrame : public RCBase<LkCounter<int>>
+class KV_API UiFrame : public RCBase<LkCounter<int>>
 {
 public:
     ~UiFrame() override;
@@ -17,7 +17,7 @@ public:
 };
 
 /// A frame that is a line along the bottom.
-class KVUI_API UiFrameLineBottom : public UiFrame
+class KV_API UiFrameLineBottom : public UiFrame
 {
 public:
     UiFrameLineBottom();

@@ -10,7 +10,7 @@ namespace Kv
 class UiWidgetElement;
 
 /// A text that the user reads and cannot change.
-class KVUI_API UiLabel : public UiWidget
+class KV_API UiLabel : public UiWidget
 {
 public:
     /// A label at the end of `parent`. There are no resource tables for the built-in kinds: pass null.

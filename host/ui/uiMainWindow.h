@@ -10,7 +10,7 @@ namespace Kv
 
 /// The window of the application, which has made it with the toolkit itself. The host's containers float in it, and
 /// stand in the panels that the application gives it.
-class KVUI_API UiMainWindow : public UiTopLevel
+class KV_API UiMainWindow : public UiTopLevel
 {
 public:
     /// `widget` is the window. `enableOwn` enables and disables what is the application's own in it. Throws an `ExBase`

@@ -12,7 +12,7 @@ namespace Kv
 class UiWidgetElement;
 
 /// A choice among strings. Raises `ValueChanged` when the selection changes, and `Activate` when the user picks.
-class KVUI_API UiMenu : public UiWidget, private NtMenuListener
+class KV_API UiMenu : public UiWidget, private NtMenuListener
 {
 public:
     /// A menu at the end of `parent`. There are no resource tables for the built-in kinds: pass null.

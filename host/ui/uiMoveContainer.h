@@ -16,7 +16,7 @@ namespace Kv
 /// than it has scrolls.
 ///
 /// One that nobody but its parent owns goes with the next turn of the loop: its maker has failed.
-class KVUI_API UiMoveContainer : public UiContainer, private NtFloatListener
+class KV_API UiMoveContainer : public UiContainer, private NtFloatListener
 {
 public:
     /// A floating container at the end of `parent`. There are no resource tables for the built-in kinds: pass null.

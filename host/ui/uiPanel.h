@@ -8,7 +8,7 @@ namespace Kv
 
 /// Container that stands where the application's window has it. Floating containers in it keep their distance from its
 /// upper left corner.
-class KVUI_API UiPanel : public UiContainer, private NtPlaceListener
+class KV_API UiPanel : public UiContainer, private NtPlaceListener
 {
 public:
     /// A panel at the end of `parent`, which is the root of the application's window. `widget` is the application's own

@@ -10,7 +10,7 @@ namespace Kv
 class UiWidgetElement;
 
 /// A button that does something when it is pressed: it raises `Activate` and has no value.
-class KVUI_API UiPushButton : public UiWidget, private NtPushButtonListener
+class KV_API UiPushButton : public UiWidget, private NtPushButtonListener
 {
 public:
     /// A push button at the end of `parent`. There are no resource tables for the built-in kinds: pass null.

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ui/kvUiExport.h"
+#include "base/kvExport.h"
 
 #include <optional>
 #include <string>
@@ -11,7 +11,7 @@ namespace Kv
 
 /// The tooltips of a resource, by the name of the widget. A resource is an XML file with the root `Tooltips` and in it
 /// one element `Tooltip` a widget: its attribute `Widget` is the name, its content the text.
-class KVUI_API UiResTable
+class KV_API UiResTable
 {
 public:
     /// Reads the resource of that name: a path, or a bare name that is looked for in the application's folder of

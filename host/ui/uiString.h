@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ui/kvUiExport.h"
+#include "base/kvExport.h"
 
 #include <functional>
 #include <string>
@@ -9,7 +9,7 @@ namespace Kv
 {
 
 /// The text on the face of a widget, which owns it and follows its changes.
-class KVUI_API UiString
+class KV_API UiString
 {
 public:
     /// `onChange` runs after each change.

@@ -10,7 +10,7 @@ class UiWidgetElement;
 
 /// An editable line of text. Raises `ValueChanged` when the user ends an edit with Enter that has changed the text, and
 /// `Activate` when the user clicks it. Its text is what stands on the screen, Enter pressed or not.
-class KVUI_API UiTextField : public UiWidget, private NtTextFieldListener
+class KV_API UiTextField : public UiWidget, private NtTextFieldListener
 {
 public:
     /// Where a new text leaves the text cursor.

@@ -13,7 +13,7 @@ namespace Kv
 /// A window of its own on the screen, with the tree of widgets in it. Escape, and a window manager that asks it to
 /// close, press the button that `findEscapeButton` gives; one that is disabled does nothing then. Where there is none,
 /// a request to close ends the innermost message loop, but not where the window needs an answer.
-class KVUI_API UiTopLevel : public UiWidget, public UiWindow, protected NtWindowListener
+class KV_API UiTopLevel : public UiWidget, public UiWindow, protected NtWindowListener
 {
 public:
     /// A window that is not yet shown. Makes no native window, which comes with the first show.

@@ -2,11 +2,11 @@
 
 #include "base/geRectangle.h"
 #include "base/geVector2.h"
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "base/rttiType.h"
 #include "gfx/coRgbColor.h"
 #include "resmgt/liString.h"
-#include "ui/kvUiExport.h"
 #include "ui/piWidget.h"
 #include "ui/uiConstraint.h"
 #include "ui/uiFrame.h"
@@ -32,7 +32,7 @@ class UiWindow;
 
 /// Base of the widgets: a counted object in a tree, owned by its parent. It is light; what stands on the screen is its
 /// native peer, which it gets when its window is first shown and which follows it from then on.
-class KVUI_API UiWidget : public RCBase<LkCounter<int>>
+class KV_API UiWidget : public RCBase<LkCounter<int>>
 {
 public:
     /// The name of the frame that a widget has in every state.

@@ -1,8 +1,8 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "native/ntPeers.h"
 #include "resmgt/xmlElement.h"
-#include "ui/kvUiExport.h"
 #include "ui/uiConstraint.h"
 
 #include <optional>
@@ -14,7 +14,7 @@ namespace Kv
 
 /// One widget element of a description, taken apart. A widget takes what it knows; what is left over at the end is a
 /// mistake of the description. Every fault is an `XmlError` that names the line.
-class KVUI_API UiWidgetElement
+class KV_API UiWidgetElement
 {
 public:
     /// `depth` is 1 for the root of the description, and one more for each container that the widget stands in.

@@ -9,7 +9,7 @@ namespace Kv
 {
 
 /// Builds widgets from the elements of a description.
-class KVUI_API UiWidgetFactory
+class KV_API UiWidgetFactory
 {
 public:
     /// How deep containers may stand in each other.

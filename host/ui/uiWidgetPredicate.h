@@ -1,8 +1,8 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/prdPredicate.h"
 #include "base/rttiType.h"
-#include "ui/kvUiExport.h"
 #include "ui/uiWidget.h"
 
 #include <string>
@@ -11,7 +11,7 @@ namespace Kv
 {
 
 /// Questions about widgets, for searches.
-class KVUI_API UiWidgetPredicate
+class KV_API UiWidgetPredicate
 {
 public:
     /// Holds for widgets of the class of that record, and of classes derived from it.

@@ -1,8 +1,8 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "gfx/wsWindow.h"
-#include "ui/kvUiExport.h"
 
 namespace Kv
 {
@@ -10,7 +10,7 @@ namespace Kv
 class UiContainer;
 
 /// What holds a tree of widgets and shows it on the screen.
-class KVUI_API UiWindow
+class KV_API UiWindow
 {
 public:
     virtual ~UiWindow() = default;

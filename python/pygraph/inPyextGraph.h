@@ -1,19 +1,19 @@
 #pragma once
 
 #include "base/inInit.h"
-#include "pygraph/kvPyextGraphExport.h"
+#include "base/kvExport.h"
 
 namespace KvInit
 {
 
 /// Stands for libKVpyextGraph among the packages.
-class KVPYEXTGRAPH_API pyextGraph;
+class KV_API pyextGraph;
 
 } // namespace KvInit
 
 namespace Kv
 {
 
-template <> KVPYEXTGRAPH_API std::type_info const* InInit<KvInit::pyextGraph>::getType();
+template <> KV_API std::type_info const* InInit<KvInit::pyextGraph>::getType();
 
 } // namespace Kv

@@ -8,7 +8,7 @@ namespace Kv::PyextGraph
 {
 
 /// A composition as a script has it: to be read, and if it was made writable, to be changed.
-class KVPYEXTGRAPH_API Graph : public GraphRO
+class KV_API Graph : public GraphRO
 {
 public:
     /// Writable.

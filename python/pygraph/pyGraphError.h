@@ -1,13 +1,13 @@
 #pragma once
 
-#include "pygraph/kvPyextGraphExport.h"
+#include "base/kvExport.h"
 #include "pyinit/pyModError.h"
 
 namespace Kv::PyextGraph
 {
 
 /// Stands for this module where a template asks which one.
-class KVPYEXTGRAPH_API GraphModule;
+class KV_API GraphModule;
 
 } // namespace Kv::PyextGraph
 
@@ -15,7 +15,7 @@ namespace Kv::PyextInit
 {
 
 // One set of statics for all libraries.
-extern template class KVPYEXTGRAPH_API ModError<PyextGraph::GraphModule>;
+extern template class KV_API ModError<PyextGraph::GraphModule>;
 
 } // namespace Kv::PyextInit
 

@@ -3,12 +3,12 @@
 #include <boost/python/dict.hpp>
 #include <boost/python/list.hpp>
 
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "base/rcWeakAccessor.h"
 #include "internalAPI/piCompositionGraphInterface.h"
 #include "pluginAPI/piGraph.h"
 #include "pluginAPI/piNode.h"
-#include "pygraph/kvPyextGraphExport.h"
 #include "resmgt/osFilePath.h"
 
 #include <string>
@@ -18,7 +18,7 @@ namespace Kv::PyextGraph
 
 /// What a script can read of a composition. It keeps the graph, but not the composition: once that is closed, whatever
 /// asks for it throws `GraphError`.
-class KVPYEXTGRAPH_API GraphRO : public RCBase<LkCounter<int>>
+class KV_API GraphRO : public RCBase<LkCounter<int>>
 {
 public:
     /// `graph` is that of a composition; null throws `ExNullPtr`.

@@ -8,7 +8,7 @@
 namespace Kv
 {
 
-extern template class KVPYEXTGRAPH_API PyManagedObject<RCShdPtr<PyextGraph::Graph>>;
+extern template class KV_API PyManagedObject<RCShdPtr<PyextGraph::Graph>>;
 
 /// What Python objects keep of a graph.
 using ManagedGraph = PyManagedObject<RCShdPtr<PyextGraph::Graph>>;

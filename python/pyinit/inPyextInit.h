@@ -1,19 +1,19 @@
 #pragma once
 
 #include "base/inInit.h"
-#include "pyinit/kvPyextInitExport.h"
+#include "base/kvExport.h"
 
 namespace KvInit
 {
 
 /// Stands for libKVpyextInit among the packages.
-class KVPYEXTINIT_API pyextInit;
+class KV_API pyextInit;
 
 } // namespace KvInit
 
 namespace Kv
 {
 
-template <> KVPYEXTINIT_API std::type_info const* InInit<KvInit::pyextInit>::getType();
+template <> KV_API std::type_info const* InInit<KvInit::pyextInit>::getType();
 
 } // namespace Kv

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "base/exBase.h"
-#include "pyinit/kvPyextInitExport.h"
+#include "base/kvExport.h"
 
 #include <string>
 
@@ -9,7 +9,7 @@ namespace Kv::PyextInit
 {
 
 /// Base of the exceptions that extension modules raise on their own account.
-class KVPYEXTINIT_API Error : public ExBase
+class KV_API Error : public ExBase
 {
 public:
     /// `modName` is the module as scripts call it. The reason stays as it is given.

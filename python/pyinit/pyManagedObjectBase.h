@@ -1,14 +1,14 @@
 #pragma once
 
+#include "base/kvExport.h"
 #include "base/rcBase.h"
 #include "base/uuid.h"
-#include "pyinit/kvPyextInitExport.h"
 
 namespace Kv
 {
 
 /// Base of what is handed to Python by reference: knows the interpreter that it was handed to.
-class KVPYEXTINIT_API PyManagedObjectBase : public RCBase<LkCounter<int>>
+class KV_API PyManagedObjectBase : public RCBase<LkCounter<int>>
 {
 public:
     ~PyManagedObjectBase() override;

@@ -40,7 +40,7 @@ def declared_in(header, class_name, only_public=False):
     if only_public:
         body = re.search(r'public:\n(.*?)^\w+:', body, re.DOTALL | re.MULTILINE).group(1)
     lines = [line for line in body.splitlines()
-             if re.match(r' {4}(?!KVPYEXTUI_LOCAL)[\w[~]', line) and not re.search(r'= (default|delete);$', line)]
+             if re.match(r' {4}(?!KV_LOCAL)[\w[~]', line) and not re.search(r'= (default|delete);$', line)]
     return Counter(re.findall(r'^.*?(operator[^(]*|~?\w+)\(', '\n'.join(lines), re.MULTILINE))
 
 

@@ -1,19 +1,19 @@
 #pragma once
 
 #include "base/inInit.h"
-#include "kvPyextUiExport.h"
+#include "base/kvExport.h"
 
 namespace KvInit
 {
 
 /// Stands for libKVpyextUi among the packages.
-class KVPYEXTUI_API pyextUi;
+class KV_API pyextUi;
 
 } // namespace KvInit
 
 namespace Kv
 {
 
-template <> KVPYEXTUI_API std::type_info const* InInit<KvInit::pyextUi>::getType();
+template <> KV_API std::type_info const* InInit<KvInit::pyextUi>::getType();
 
 } // namespace Kv

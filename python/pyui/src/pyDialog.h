@@ -5,9 +5,9 @@
 
 #include "appUi/uiAppMgr.h"
 #include "base/iterator.h"
+#include "base/kvExport.h"
 #include "base/rcShdPtr.h"
 #include "base/rcStrongPtr.h"
-#include "kvPyextUiExport.h"
 #include "pyCallables.h"
 #include "pyErrorAside.h"
 #include "pyWidgetCbs.h"
@@ -31,7 +31,7 @@ inline std::string const closeButtonPrefix = "CloseButton_";
 /// it.
 ///
 /// A failure that the dialog finds itself is a `UiError`; those of the host pass through.
-class KVPYEXTUI_API Dialog : public RCBase<LkCounter<int>>
+class KV_API Dialog : public RCBase<LkCounter<int>>
 {
 public:
     /// Places a dialog inside the application: its vertical centre lies on a boundary of equal bands of the main panel.
@@ -114,39 +114,39 @@ public:
     bool isEnabled(std::string const& widgetName) const;
 
     /// The callables of the scripts' callbacks, whose references the wrappers of the dialog share.
-    KVPYEXTUI_LOCAL PyCallables& getCallables();
+    KV_LOCAL PyCallables& getCallables();
 
 protected:
-    KVPYEXTUI_LOCAL virtual boost::python::object getWidgetValue(RCShdPtr<UiContainer> container,
-                                                                 std::string const& widgetName) const;
-    KVPYEXTUI_LOCAL virtual void getWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict& values) const;
+    KV_LOCAL virtual boost::python::object getWidgetValue(RCShdPtr<UiContainer> container,
+                                                          std::string const& widgetName) const;
+    KV_LOCAL virtual void getWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict& values) const;
     /// True once a widget has taken the value.
-    KVPYEXTUI_LOCAL virtual bool setWidgetValue(RCShdPtr<UiContainer> container, std::string const& widgetName,
-                                                boost::python::object const& value, bool invokeCallback);
-    KVPYEXTUI_LOCAL virtual void setWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict const& values,
-                                                 bool invokeCallback);
+    KV_LOCAL virtual bool setWidgetValue(RCShdPtr<UiContainer> container, std::string const& widgetName,
+                                         boost::python::object const& value, bool invokeCallback);
+    KV_LOCAL virtual void setWidgetValues(RCShdPtr<UiContainer> container, boost::python::dict const& values,
+                                          bool invokeCallback);
 
 private:
     friend class WidgetCbs;
 
     using CallbackSets = std::vector<RCStrongPtr<CallbackSet>>;
 
-    KVPYEXTUI_LOCAL void createUi(Positionner const& position);
-    KVPYEXTUI_LOCAL static RCShdPtr<UiContainer> createTopLevelPanel(RCShdPtr<UiTopLevel> const& topLevel);
-    KVPYEXTUI_LOCAL RCShdPtr<UiContainer> createFloatingContainer(int width, int height, int divisions, int position,
-                                                                  std::string const& title);
-    KVPYEXTUI_LOCAL void createTitleBar(RCShdPtr<UiContainer> const& container, std::string const& title);
+    KV_LOCAL void createUi(Positionner const& position);
+    KV_LOCAL static RCShdPtr<UiContainer> createTopLevelPanel(RCShdPtr<UiTopLevel> const& topLevel);
+    KV_LOCAL RCShdPtr<UiContainer> createFloatingContainer(int width, int height, int divisions, int position,
+                                                           std::string const& title);
+    KV_LOCAL void createTitleBar(RCShdPtr<UiContainer> const& container, std::string const& title);
 
-    KVPYEXTUI_LOCAL void onTitleBarMove(EvEvent& event);
-    KVPYEXTUI_LOCAL void onTitleBarPress(EvEvent& event);
-    KVPYEXTUI_LOCAL void onTitleBarRelease(EvEvent& event);
+    KV_LOCAL void onTitleBarMove(EvEvent& event);
+    KV_LOCAL void onTitleBarPress(EvEvent& event);
+    KV_LOCAL void onTitleBarRelease(EvEvent& event);
 
-    KVPYEXTUI_LOCAL void clearCloseCallbacks();
+    KV_LOCAL void clearCloseCallbacks();
     /// Takes the handler of a close button from the button that has it, where several bear the name.
-    KVPYEXTUI_LOCAL void unwireNamesake(CallbackSet const& set) const;
-    KVPYEXTUI_LOCAL void setupCloseCallbacks();
+    KV_LOCAL void unwireNamesake(CallbackSet const& set) const;
+    KV_LOCAL void setupCloseCallbacks();
 
-    KVPYEXTUI_LOCAL static std::string const _closeButtonClickedKey;
+    KV_LOCAL static std::string const _closeButtonClickedKey;
 
     /// Filled by the destructor, and the last to go.
     std::optional<ErrorAside> _errorAside;
@@ -175,7 +175,7 @@ namespace Kv
 {
 
 // Whoever uses dialogs shares these with the module.
-extern template class KVPYEXTUI_API RCBasePtr<PyextUi::Dialog>;
-extern template class KVPYEXTUI_API Iterator<RCShdPtr<UiWidget>>;
+extern template class KV_API RCBasePtr<PyextUi::Dialog>;
+extern template class KV_API Iterator<RCShdPtr<UiWidget>>;
 
 } // namespace Kv

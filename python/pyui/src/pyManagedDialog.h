@@ -11,7 +11,7 @@ namespace Kv
 /// What Python objects keep of a dialog.
 using ManagedDialog = PyManagedObject<RCShdPtr<PyextUi::Dialog>>;
 
-extern template class KVPYEXTUI_API PyManagedObject<RCShdPtr<PyextUi::Dialog>>;
+extern template class KV_API PyManagedObject<RCShdPtr<PyextUi::Dialog>>;
 
 /// The dialog in a wrapper; null for a wrapper around none. A null pointer to a wrapper throws `ExNullPtr`.
 inline PyextUi::Dialog* get_pointer(RCShdPtr<ManagedDialog> const& managed)

@@ -1,13 +1,13 @@
 #pragma once
 
-#include "kvPyextUiExport.h"
+#include "base/kvExport.h"
 #include "pyinit/pyModError.h"
 
 namespace Kv::PyextUi
 {
 
 /// Stands for this module where a template asks which one.
-class KVPYEXTUI_API Ui;
+class KV_API Ui;
 
 } // namespace Kv::PyextUi
 
@@ -15,7 +15,7 @@ namespace Kv::PyextInit
 {
 
 // One set of statics for all libraries.
-extern template class KVPYEXTUI_API ModError<PyextUi::Ui>;
+extern template class KV_API ModError<PyextUi::Ui>;
 
 } // namespace Kv::PyextInit
 

@@ -262,7 +262,7 @@ void moduleBody()
 
 #if PY_MAJOR_VERSION >= 3
 
-extern "C" KVPYEXTUI_API PyObject* PyInit_libKVpyextUi()
+extern "C" KV_API PyObject* PyInit_libKVpyextUi()
 {
     static PyModuleDef definition{
         PyModuleDef_HEAD_INIT, "libKVpyextUi", nullptr, -1, nullptr, nullptr, nullptr, nullptr, nullptr};

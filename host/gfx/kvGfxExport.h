@@ -1,4 +1,0 @@
-#pragma once
-
-/// Marks what libKVgfx exports.
-#define KVGFX_API __attribute__((visibility("default")))
