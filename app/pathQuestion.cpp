@@ -17,6 +17,7 @@ PathQuestion::PathQuestion(char const* title, std::string const& place)
       _okCb(this, &PathQuestion::onOk)
 {
     _handler.getBrowser()->setDontLoadCompositions(true);
+    _handler.getBrowser()->setTakesNew(false);
     _handler.setActivateCb(&_okCb);
 }
 

@@ -7,6 +7,7 @@
 #include "ui/uiContainer.h"
 
 #include <filesystem>
+#include <optional>
 #include <system_error>
 #include <utility>
 
@@ -154,6 +155,8 @@ void BrBrowser::select(RCShdPtr<SnSelection> const& selection)
 
 LiString BrBrowser::getInputFocusPath() const
 {
+    if (!_newPath.empty())
+        return _newPath;
     std::string const path = OsPlace::join(_directory, _focus);
     return _focus.empty() || !isThere(path) ? LiString() : LiString(path);
 }
@@ -168,11 +171,19 @@ RCShdPtr<UiView> BrBrowser::getView() const
     return _view;
 }
 
+void BrBrowser::setTakesNew(bool takesNew)
+{
+    requireUiThread();
+    _takesNew = takesNew;
+}
+
 bool BrBrowser::takeTypedPath()
 {
     RCShdPtr<BrBrowser> const self(this);
     requireUiThread();
-    return !_native || _native->takeTypedPath();
+    std::optional<std::string> const typed = _native ? _native->takeTypedPath(_takesNew) : std::string();
+    _newPath = typed.value_or("");
+    return typed.has_value();
 }
 
 std::unique_ptr<NtPeer> BrBrowser::createPeer(NtPlatform& platform, NtContainer& parent)
@@ -194,14 +205,14 @@ void BrBrowser::dropPeer()
 void BrBrowser::onDirectoryChanged(std::string const& directory)
 {
     _directory = directory;
-    _focus.clear();
-    _selected.clear();
+    onSelectionChanged("", {});
 }
 
 void BrBrowser::onSelectionChanged(std::string const& focus, std::vector<std::string> const& selected)
 {
     _focus = focus;
     _selected = selected;
+    _newPath.clear();
 }
 
 void BrBrowser::onActivated()
@@ -226,7 +237,7 @@ void BrBrowser::showCollapsing()
 RCShdPtr<SnSelection> BrBrowser::makeSelection() const
 {
     SnSelection::Items items;
-    for (std::string const& name : _selected)
+    for (std::string const& name : _newPath.empty() ? _selected : std::vector<std::string>())
         if (std::string const path = OsPlace::join(_directory, name); isThere(path))
             items.push_back(makeShd<BrBrowsableItem>(makeShd<BrBrowsable>(path)));
     return makeShd<SnSelection>(std::move(items));

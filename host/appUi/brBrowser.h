@@ -65,7 +65,8 @@ public:
     /// null, all stays as it was.
     void select(RCShdPtr<SnSelection> const& selection);
 
-    /// The path of the entry that has the keyboard in it; empty if none is selected, or it is gone.
+    /// The path of the entry that has the keyboard in it, or the one that `takeTypedPath` took; empty if none is
+    /// selected, or it is gone.
     LiString getInputFocusPath() const;
 
     /// The current directory.
@@ -74,8 +75,11 @@ public:
     /// What others know of what is selected in it, the one among its client data. Never null.
     RCShdPtr<UiView> getView() const;
 
-    /// Goes where the user has typed in its field without pressing Enter. False, which the user is told, if nothing is
-    /// there.
+    /// Whether the user can type the path of an entry that is not there yet; at first that is so.
+    void setTakesNew(bool takesNew);
+
+    /// Goes where the user has typed in its field without pressing Enter. What is not there yet, in a directory that
+    /// is, is in focus then, and nothing is selected. False, which the user is told, if nothing can be there.
     bool takeTypedPath();
 
 protected:
@@ -98,6 +102,9 @@ private:
     /// Names of entries of the directory.
     std::string _focus;
     std::vector<std::string> _selected;
+    /// The whole path of what is not there yet.
+    std::string _newPath;
+    bool _takesNew = true;
     bool _sequencesCollapsed = true;
     bool _compositionsCollapsed = false;
     bool _dontLoadCompositions = false;

@@ -1,8 +1,10 @@
 #include "appUi/uiCompositionWorkspace.h"
 
+#include "appUi/brBrowser.h"
 #include "appUi/uiCompositionWorkspaceListener.h"
 #include "base/rcWeakAccessor.h"
 #include "framework/fwComposition.h"
+#include "ui/uiContainer.h"
 
 #include <algorithm>
 #include <utility>
@@ -76,7 +78,15 @@ void UiCompositionWorkspace::makeCurrent(RCWeakPtr<const PiCompositionGraphInter
 
 UPtr<UiWidget> UiCompositionWorkspace::getFocus() const
 {
-    return _findFocus ? _findFocus() : nullptr;
+    UPtr<UiWidget> const holder = _findFocus ? _findFocus() : nullptr;
+    RCShdPtr<UiContainer> const around = holder.isNull() ? nullptr : holder->getParent();
+    if (!around)
+        return holder;
+    // A button beside a browser is there for what is selected in it.
+    for (RCShdPtr<UiWidget> const& child : around->getChildren())
+        if (dynamic_cast<BrBrowser*>(child.get()))
+            return child.get();
+    return holder;
 }
 
 RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::getCurrentComposition() const

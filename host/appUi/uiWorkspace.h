@@ -21,7 +21,7 @@ public:
     /// For the application: null when it ends.
     static void setCurrentWorkspace(RCShdPtr<UiWorkspace> const& workspace);
 
-    /// The widget that has the keyboard, borrowed; null if none has.
+    /// The widget that has the keyboard, borrowed; the browser where it is a button beside one; null if none has.
     virtual UPtr<UiWidget> getFocus() const = 0;
 };
 

@@ -48,6 +48,20 @@ std::string findFault(std::string const& directory)
     }
 }
 
+/// The path of an entry that is not there yet, in a directory that is; empty for any other.
+std::string findNewPath(std::string const& typed, std::string const& base)
+{
+    try
+    {
+        OsPlace const place = OsPlace::findNew(typed, base);
+        return OsPlace::join(place.directory, place.name);
+    }
+    catch (ExBase const&)
+    {
+        return "";
+    }
+}
+
 /// Lets a path be wrapped at its slashes.
 QString makeWrappable(QString text)
 {
@@ -58,7 +72,7 @@ QString makeWrappable(QString text)
 
 BrowserPane::BrowserPane(QWidget* parent, std::string const& name, QtListenerHandle<NtBrowserListener> const& handle)
     : QWidget(parent), _handle(handle), _up(new QToolButton(this)),
-      _path(new PathField(this, [this] { takeTypedPath(); })), _model(new DirModel(this, [this] { onRead(); })),
+      _path(new PathField(this, [this] { takeTypedPath(false); })), _model(new DirModel(this, [this] { onRead(); })),
       _list(new BrowserList(this, {[this] { activate(); }, [this] { goUp(); }})), _message(new QLabel(this))
 {
     _up->setIcon(style()->standardIcon(QStyle::SP_FileDialogToParent));
@@ -137,23 +151,26 @@ void BrowserPane::setMultiple(bool multiple)
     _list->setSelectionMode(multiple ? QAbstractItemView::ExtendedSelection : QAbstractItemView::SingleSelection);
 }
 
-bool BrowserPane::takeTypedPath()
+std::optional<std::string> BrowserPane::takeTypedPath(bool takesNew)
 {
     if (!_path->isEdited() || !isVisible())
-        return true;
+        return "";
+    std::string const typed = _path->getTypedPath();
     try
     {
-        std::string const typed = _path->getTypedPath();
         OsPlace const place = OsPlace::find(typed.empty() ? _directory : typed, _directory);
         if (_path->hasFocus())
             _list->setFocus(Qt::OtherFocusReason);
         walkTo(place.directory, {place.name, {}});
-        return true;
+        return "";
     }
     catch (ExBase const& error)
     {
+        if (takesNew)
+            if (std::string path = findNewPath(typed, _directory); !path.empty())
+                return path;
         say(error.getReason());
-        return false;
+        return std::nullopt;
     }
 }
 

@@ -46,8 +46,9 @@ public:
     void setCollapsing(std::function<bool(std::string const&)> collapses);
     void setMultiple(bool multiple);
 
-    /// Goes where the user has typed, and tells the listener. False if nothing is there, which the user is told.
-    bool takeTypedPath();
+    /// Goes where the user has typed, and tells the listener; gives an empty path. With `takesNew`, where nothing is
+    /// there but its directory, stays and gives the typed path. Nothing in all other cases, which the user is told.
+    std::optional<std::string> takeTypedPath(bool takesNew);
 
 protected:
     void showEvent(QShowEvent* event) override;

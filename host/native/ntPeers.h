@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <functional>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -230,9 +231,10 @@ public:
     /// Whether more than one entry can be selected.
     virtual void setMultiple(bool multiple) = 0;
 
-    /// Goes where the user has typed without pressing Enter, as Enter would, and the listener hears of it. False if
-    /// nothing is there, which the user is told.
-    virtual bool takeTypedPath() = 0;
+    /// Goes where the user has typed without pressing Enter, as Enter would, and the listener hears of it; gives an
+    /// empty path. With `takesNew`, where nothing is there but its directory, stays and gives the typed path. Nothing
+    /// in all other cases, which the user is told.
+    virtual std::optional<std::string> takeTypedPath(bool takesNew) = 0;
 };
 
 /// What a window hears of the user.

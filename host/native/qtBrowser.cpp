@@ -38,10 +38,10 @@ void QtBrowser::setMultiple(bool multiple)
         pane->setMultiple(multiple);
 }
 
-bool QtBrowser::takeTypedPath()
+std::optional<std::string> QtBrowser::takeTypedPath(bool takesNew)
 {
     BrowserPane* const pane = getNative();
-    return !pane || pane->takeTypedPath();
+    return pane ? pane->takeTypedPath(takesNew) : std::string();
 }
 
 } // namespace Kv

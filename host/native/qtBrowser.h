@@ -20,7 +20,7 @@ public:
               std::vector<std::string> const& selected) override;
     void setCollapsing(std::function<bool(std::string const&)> collapses) override;
     void setMultiple(bool multiple) override;
-    bool takeTypedPath() override;
+    std::optional<std::string> takeTypedPath(bool takesNew) override;
 
 private:
     QtBrowser(QWidget* parent, std::string const& name, QtListenerHandle<NtBrowserListener> const& handle);

@@ -31,12 +31,18 @@ fs::path expandHome(std::string const& path)
     return isHome ? fs::path(getHome() + path.substr(1)) : fs::path(path);
 }
 
-fs::path makeAbsolute(std::string const& path, std::string const& base)
+[[noreturn]] void throwNone(fs::path const& path)
+{
+    throw ExBase(__FILE__, __LINE__, "There is no " + OsPlace::quote(path.native()));
+}
+
+/// The directory that ".." names in one, which is another than the one in front of it where that is a link.
+fs::path getParent(fs::path const& directory)
 {
     std::error_code error;
-    fs::path const expanded = expandHome(path);
-    fs::path const from = base.empty() ? fs::current_path(error) : fs::path(base);
-    return (from / expanded).lexically_normal();
+    if (!fs::is_directory(directory, error))
+        throwNone(directory / "..");
+    return (fs::is_symlink(directory, error) ? fs::canonical(directory) : directory).parent_path();
 }
 
 /// Without the slash that ends the path of a directory.
@@ -48,22 +54,48 @@ std::string trim(fs::path const& path)
     return text;
 }
 
+/// Free of "." and "..", with the links that are no part of the way to a "..".
+fs::path makeAbsolute(std::string const& path, std::string const& base)
+{
+    if (path.find('\0') != std::string::npos)
+        throw ExBase(__FILE__, __LINE__, "A path cannot hold a zero byte");
+    std::error_code error;
+    fs::path const from = base.empty() ? fs::current_path(error) : fs::path(base);
+    fs::path absolute;
+    for (fs::path const& component : from / expandHome(path))
+    {
+        if (component == "..")
+            absolute = getParent(trim(absolute));
+        else
+            absolute /= component == "." ? fs::path() : component;
+    }
+    return absolute;
+}
+
 } // namespace
 
 OsPlace OsPlace::find(std::string const& path, std::string const& base)
 {
-    if (path.find('\0') != std::string::npos)
-        throw ExBase(__FILE__, __LINE__, "A path cannot hold a zero byte");
     fs::path const absolute = makeAbsolute(path, base);
     std::error_code error;
     fs::file_status const status = fs::status(absolute, error);
     if (status.type() == fs::file_type::not_found)
-        throw ExBase(__FILE__, __LINE__, "There is no " + OsPlace::quote(absolute.native()));
+        throwNone(absolute);
     if (status.type() == fs::file_type::none)
         throw ExBase(__FILE__, __LINE__,
                      "Cannot look at " + OsPlace::quote(absolute.native()) + ": " + error.message());
     if (fs::is_directory(status))
         return {trim(absolute), ""};
+    return {trim(absolute.parent_path()), absolute.filename().native()};
+}
+
+OsPlace OsPlace::findNew(std::string const& path, std::string const& base)
+{
+    fs::path const absolute = makeAbsolute(path, base);
+    std::error_code error;
+    bool const isTaken = fs::status(absolute, error).type() != fs::file_type::not_found;
+    if (isTaken || !absolute.has_filename() || !fs::is_directory(absolute.parent_path(), error))
+        throwNone(absolute);
     return {trim(absolute.parent_path()), absolute.filename().native()};
 }
 

@@ -19,6 +19,9 @@ struct KV_API OsPlace
     /// is the current directory of the process. Throws `ExBase`, with words that name the path, where nothing is there.
     static OsPlace find(std::string const& path, std::string const& base);
 
+    /// The same for an entry that is not there yet. Throws `ExBase` where it is, or where its directory is not.
+    static OsPlace findNew(std::string const& path, std::string const& base);
+
     /// The directory, or where it is gone, the nearest one above it that exists.
     static std::string findNearest(std::string const& directory);
 

@@ -222,8 +222,17 @@ TEST_F(Folder, IsFoundByPathsAsPeopleWriteThem)
     EXPECT_EQ(find("~"), root + "|");
     EXPECT_EQ(find("."), root + "/sub|");
     EXPECT_EQ(find("/.."), "/|");
-    for (char const* const path : {"none", "../file/", "~none", "../file/x"})
+    for (char const* const path : {"none", "../file/", "~none", "../file/x", "none/..", "../file/..", "../file/."})
         EXPECT_THROW(find(path), ExBase) << path;
+    make({"far/deep/"});
+    fs::create_directory_symlink(folder / "far/deep", folder / "sub/link");
+    EXPECT_EQ(find("link"), root + "/sub/link|");
+    EXPECT_EQ(find("link/.."), root + "/far|");
+    EXPECT_EQ(find("link/./../../file"), root + "|file");
+    OsPlace const added = OsPlace::findNew("link/../new", root + "/sub");
+    EXPECT_EQ(added.directory + "|" + added.name, root + "/far|new");
+    for (char const* const path : {"../file", ".", "none/new", "new/", "../file/new"})
+        EXPECT_THROW(OsPlace::findNew(path, root + "/sub"), ExBase) << path;
     EXPECT_EQ(OsPlace::findNearest(root + "/sub/a/b"), root + "/sub");
 }
 
@@ -280,7 +289,15 @@ TEST_F(Browser, GoesWhereThePathIsTyped)
     type("none", true);
     EXPECT_EQ(place(), folder);
     EXPECT_NE(words().find((folder / "none").string()), std::string::npos);
+    browser->setTakesNew(false);
     EXPECT_FALSE(browser->takeTypedPath());
+    browser->setTakesNew(true);
+    EXPECT_TRUE(browser->takeTypedPath());
+    EXPECT_EQ(focus(), folder / "none");
+    EXPECT_EQ(place(), folder);
+    type("none/none", false);
+    EXPECT_FALSE(browser->takeTypedPath());
+    EXPECT_EQ(focus(), "");
     press({Qt::Key_Escape});
     type("sub/f", true);
     EXPECT_EQ(focus(), folder / "sub/f");

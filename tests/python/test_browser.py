@@ -8,6 +8,7 @@ import pytest
 import stage
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
+from PyQt6.QtTest import QTest
 from PyQt6.QtWidgets import QApplication, QLabel, QLineEdit, QTreeView
 
 
@@ -220,8 +221,37 @@ def test_a_typed_path_that_leads_nowhere_is_told_and_given_to_nobody(user, files
         calls.append(paths)
         return 'x'
 
-    assert browse(user, enter('nothing'), ok, look, cancel, initialPath=files, pathValidationCb=validate) == ''
-    assert told == ["There is no '%s/nothing'" % files, 'nothing'] and not calls
+    assert browse(user, enter('no/where'), ok, look, cancel, initialPath=files, pathValidationCb=validate) == ''
+    assert told == ["There is no '%s/no/where'" % files, 'no/where'] and not calls
+
+
+@pytest.mark.inside
+def test_the_path_of_a_file_to_be_written_is_typed_judged_and_typed_again(user, files):
+    calls = []
+
+    def validate(*paths):
+        calls.append((*paths, ui.Workspace.getBrowserSelection()))
+        return paths[0] if paths[0].endswith('.exr') else ''
+
+    def correct(user):
+        user.click('Browser.path')
+        user.press(Qt.Key.Key_End)
+        user.type('.exr')
+
+    assert browse(user, pick('notes'), enter('sub/new'), ok, correct, ok, initialPath=files,
+                  pathValidationCb=validate) == files + '/sub/new.exr'
+    assert calls == [(files + '/sub/new', files, []), (files + '/sub/new.exr', files, [])]
+    assert browse(user, enter('new'), ok, initialPath=files) == files + '/new'
+    assert browse(user, enter('new'), last, ok, initialPath=files) == files + '/\udcff.txt'
+
+
+@pytest.mark.inside
+def test_a_path_leads_where_the_system_says_it_does(user, files):
+    os.makedirs(files + '/sub/deep/er')
+    os.symlink(files + '/sub/deep', files + '/link')
+    assert browse(user, ok, initialPath=files + '/link/..') == files + '/sub'
+    assert browse(user, enter('link/../deep'), ok, initialPath=files) == files + '/sub/deep'
+    assert browse(user, ok, initialPath=files + '/link') == files + '/link'
 
 
 @pytest.mark.inside
@@ -232,9 +262,21 @@ def test_the_workspace_knows_what_is_selected_in_it(user, files):
         seen.append(ui.Workspace.getBrowserSelection())
         return files
 
-    browse(user, pick('notes', Qt.Key.Key_Return), initialPath=files, pathValidationCb=look)
+    def press_ok_by_key(user):
+        user.find('OK').setFocus()
+        user.press(Qt.Key.Key_Space)
+
+    def click_twice(user):
+        view = user.find('Browser.list', QTreeView)
+        place = view.visualRect(view.currentIndex()).center()
+        for click in QTest.mouseClick, QTest.mouseDClick:
+            click(view.viewport(), Qt.MouseButton.LeftButton, Qt.KeyboardModifier.NoModifier, place)
+
+    for how in ok, press_ok_by_key, click_twice, lambda user: user.press(Qt.Key.Key_Return):
+        browse(user, pick('notes'), how, initialPath=files, pathValidationCb=look)
+    assert seen == [[files + '/notes.txt']] * 4
     browse(user, lambda user: user.find('Browser.list').setFocus(), lambda user: look(), ok, initialPath=files)
-    assert seen == [[files + '/notes.txt'], []]
+    assert seen[4:] == [[]]
 
 
 @pytest.mark.inside
