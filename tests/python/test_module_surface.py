@@ -228,3 +228,5 @@ def test_the_module_and_the_dialog_say_what_they_are():
                   'a widget has been activated (clicked)', 'when the user changes it and presses the Enter key',
                   'def myCallbackFunction1( dialog, widgetName, eventType )', 'getValues'):
         assert words in ui.Dialog.__doc__
+    told = ui.Dialog.__doc__.split('registers a callable:\n')[1].split('\n\n')[0].replace('EventType.', '')
+    assert ui.EventType.__doc__.endswith(told) and re.findall(r'- C\{(\w+)\}: ', told) == list(ui.EventType.names)

@@ -145,6 +145,14 @@ that of the first file.
 @raise UiError: If it is not used within Velmora.
 @raise ValueError: If a path holds a zero byte.)";
 
+constexpr char const* eventType =
+    R"(What a widget tells the callables that L{Dialog.addCallback} has registered:
+  - C{ENABLE}: a widget has been enabled
+  - C{DISABLE}: a widget has been disabled
+  - C{STATE}: a toggle button's state has changed
+  - C{ACTIVATE}: a widget has been activated (clicked)
+  - C{VALUE_CHANGED}: a text field's value has been changed, when the user changes it and presses the Enter key)";
+
 constexpr char const* dialog =
     R"(A dialog, whose widgets can be filled, read, and heard of. There is no public constructor: L{createDialog} is the only
 way to get hold of a C{Dialog}.

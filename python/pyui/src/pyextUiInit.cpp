@@ -158,12 +158,13 @@ void registerEventType()
 {
     if (PyextInit::shareClass<PiWidget::EventType>("EventType"))
         return;
-    bp::enum_<PiWidget::EventType>("EventType")
-        .value("ENABLE", PiWidget::Enable)
+    bp::enum_<PiWidget::EventType> eventType("EventType");
+    eventType.value("ENABLE", PiWidget::Enable)
         .value("DISABLE", PiWidget::Disable)
         .value("STATE", PiWidget::State)
         .value("ACTIVATE", PiWidget::Activate)
         .value("VALUE_CHANGED", PiWidget::ValueChanged);
+    eventType.attr("__doc__") = Docs::eventType;
 }
 
 void registerDialog()
