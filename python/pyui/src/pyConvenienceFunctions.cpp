@@ -11,6 +11,7 @@
 #include "gfx/wsCursorRegistry.h"
 #include "internalAPI/piBrowserSchemes.h"
 #include "pyCompat.h"
+#include "pyErrorNote.h"
 #include "pyUiError.h"
 #include "pyUtils.h"
 #include "pyWidgetListGenerator.h"
@@ -169,7 +170,9 @@ bp::dict showSimpleDialog(std::string const& title, bp::list const& widgets, int
     if (cancelButton)
         closeButtons.append(cancelLabel);
     std::string const xmlString = WidgetListGenerator(widgets, closeButtons).generate();
-    RCShdPtr<Dialog> const dialog = makeDialog(title, xmlString, width, height, initialValues);
+    RCShdPtr<Dialog> const dialog = withNote([&] { return makeDialog(title, xmlString, width, height); },
+                                             [&] { return WidgetListGenerator::describeUnknownKind(widgets); });
+    dialog->setValues(initialValues, false);
     dialog->launch();
     return dialog->getValues();
 }
@@ -183,7 +186,8 @@ std::string showMessageBox(std::string const& title, bp::list const& messages, b
     bp::list widgets;
     for (int i = 0; i < lineCount; ++i)
     {
-        std::string const line = bp::extract<std::string>(messages[i]);
+        std::string const line = withNote([&] { return bp::extract<std::string>(messages[i])(); },
+                                                    [&] { return describeEntry("list of messages", i, messages[i]); });
         contentWidth = std::max(contentWidth, measureInUnits(line));
         widgets.append(bp::make_tuple("Label", "Msg", "", line));
     }
