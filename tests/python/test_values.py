@@ -126,6 +126,15 @@ def test_what_a_callback_raises_in_a_setter_says_nothing_of_the_value(write):
             assert not hasattr(failure, '__notes__')
 
 
+def test_a_text_ends_at_its_first_zero_byte_and_a_number_at_32_bits(write):
+    dialog = make()
+    write(dialog, 'Show', 'a\x1b\0b')
+    write(dialog, 'Win', 2 ** 70)
+    assert dialog.getValues() == {**START, 'Show': 'a\x1b', 'Win': True}
+    with pytest.raises(OverflowError):
+        write(dialog, 'Prize', ([], 2 ** 31))
+
+
 def test_many_values_are_written_from_top_to_bottom_up_to_the_first_refused():
     dialog = make(widgets=[('TextField', name) for name in 'abc'])
     with pytest.raises(TypeError):
