@@ -57,6 +57,16 @@ UiWindow* UiTopLevel::getWindow() const
     return const_cast<UiTopLevel*>(this);
 }
 
+RCShdPtr<UiContainer> UiTopLevel::getRootContainer() const
+{
+    return _root;
+}
+
+RCShdPtr<WsWindow> UiTopLevel::getOSWindow() const
+{
+    return _osWindow;
+}
+
 bool UiTopLevel::redraw()
 {
     if (isShown())

@@ -26,8 +26,8 @@ public:
     RttiType const& getRttiType() const override;
 
     UiWindow* getWindow() const override;
-    RCShdPtr<UiContainer> getRootContainer() const override { return _root; }
-    RCShdPtr<WsWindow> getOSWindow() const override { return _osWindow; }
+    RCShdPtr<UiContainer> getRootContainer() const override;
+    RCShdPtr<WsWindow> getOSWindow() const override;
     bool isShown() const override { return _osWindow && isDisplayed(); }
     bool redraw() override;
 

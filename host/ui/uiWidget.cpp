@@ -173,6 +173,12 @@ void UiWidget::setPointerUpCb(CbHandler<EvEvent>* handler)
     getPointerCallbacks().setUpCb(handler);
 }
 
+void UiWidget::arm(EvPointerButtonDownEvent const&) {}
+
+void UiWidget::mmove(EvPointerMoveEvent const&) {}
+
+void UiWidget::disarm(EvPointerButtonUpEvent const&) {}
+
 void UiWidget::clearParent()
 {
     if (UiContainer* const parent = std::exchange(_parent, nullptr))

@@ -111,9 +111,9 @@ public:
     void setPointerUpCb(CbHandler<EvEvent>* handler);
 
     /// Begins, goes on with and ends a drag of the widget, for those kinds that can be dragged.
-    virtual void arm(EvPointerButtonDownEvent const&) {}
-    virtual void mmove(EvPointerMoveEvent const&) {}
-    virtual void disarm(EvPointerButtonUpEvent const&) {}
+    virtual void arm(EvPointerButtonDownEvent const& event);
+    virtual void mmove(EvPointerMoveEvent const& event);
+    virtual void disarm(EvPointerButtonUpEvent const& event);
 
     /// Takes the widget out of its parent, which may end its life, and off the screen. Its handlers, and those of the
     /// widgets in it, are forgotten: their owner may be about to go. May come from any thread.

@@ -9,6 +9,7 @@
 #include "ui/uiTextField.h"
 #include "ui/uiWidgetElement.h"
 
+#include <cctype>
 #include <map>
 
 namespace Kv
@@ -19,15 +20,52 @@ namespace
 
 using Builder = void (*)(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
 
+using Builders = std::map<std::string, Builder>;
+
+/// The letters of a text, all of them small.
+std::string toLetters(std::string const& text)
+{
+    std::string letters;
+    for (char const character : text)
+        if (std::isalpha(static_cast<unsigned char>(character)))
+            letters += static_cast<char>(std::tolower(static_cast<unsigned char>(character)));
+    return letters;
+}
+
+/// Whether who wrote `name` may have meant `kind`: as "text_field" or "Text" may be a "TextField".
+bool isNear(std::string const& name, std::string const& kind)
+{
+    std::string const letters = toLetters(name);
+    return letters.size() > 2 &&
+           (toLetters(kind).find(letters) != std::string::npos || letters.find(toLetters(kind)) != std::string::npos);
+}
+
+[[noreturn]] void failUnknown(XmlElement const& element, Builders const& known)
+{
+    std::string words = "unknown widget element \"" + element.getName() + "\"";
+    std::optional<XmlElement> const widget = element.findChild("Widget");
+    if (std::optional<std::string> const name = widget ? widget->findAttribute("Name") : std::nullopt)
+        words += " of the widget \"" + *name + "\"";
+    std::string kinds;
+    std::string meant;
+    for (auto const& [kind, builder] : known)
+    {
+        kinds += (kinds.empty() ? "" : ", ") + kind;
+        if (meant.empty() && isNear(element.getName(), kind))
+            meant = " Is it \"" + kind + "\"?";
+    }
+    throw XmlError(__FILE__, __LINE__, element.getLine(), words + ". Known are " + kinds + "." + meant);
+}
+
 Builder findBuilder(XmlElement const& element)
 {
-    static std::map<std::string, Builder> const builders{
+    static Builders const builders{
         {"Container", &UiContainer::build},   {"Label", &UiLabel::build},         {"Menu", &UiMenu::build},
         {"PushButton", &UiPushButton::build}, {"TextField", &UiTextField::build}, {"ToggleButton", &UiDualState::build},
     };
     auto const found = builders.find(element.getName());
     if (found == builders.end())
-        throw XmlError(__FILE__, __LINE__, element.getLine(), "unknown widget element \"" + element.getName() + "\"");
+        failUnknown(element, builders);
     return found->second;
 }
 

@@ -186,6 +186,15 @@ TEST_F(Script, HasItsOwnExceptionComeThroughANativeLaunchThatIsWellUnwound)
     EXPECT_EQ(dialog->getReferenceCount(), 1);
 }
 
+TEST_F(Script, SharesTheWidgetsThatNativeCodeFindsByName)
+{
+    run("dialog = make()\n");
+    Dialog const& dialog = *getManaged("dialog")->getValue();
+    dialog.getWidget("Toggle")->setEnabled(false);
+    EXPECT_EQ(evaluate("dialog.isEnabled('Toggle'), dialog.isEnabled('Text')"), "(False, True)");
+    EXPECT_THROW(static_cast<void>(dialog.getWidget("Nobody")), UiError);
+}
+
 TEST_F(Script, HasItsDialogDescribedByAPointer)
 {
     run("dialog = make()\n");

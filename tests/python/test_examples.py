@@ -2,6 +2,7 @@
 
 import os
 import pathlib
+import re
 import runpy
 import shutil
 import subprocess
@@ -51,6 +52,29 @@ def test_a_review_is_sent_with_its_note(patient, capsys):
                  lambda user: user.click('CloseButton_Send'))
     run('review.py')
     assert capsys.readouterr().out == 'Retake: Too dark\n'
+
+
+def test_the_recipe_for_a_text_that_follows_the_values_follows_each_key(patient):
+    page = (EXAMPLES.parent / 'docs' / 'callbacks.md').read_text()
+    recipe = page.split('## A text that follows the values')[1].split('## ')[0]
+    first, second = re.findall(r'```python\n(.*?)```', recipe, re.DOTALL)
+
+    def shows(text):
+        def step(user):
+            while user.find('File').text() != text:
+                QApplication.processEvents()
+        return step
+
+    patient.plan(shows('_beauty.exr'), lambda user: user.type('sh01'), shows('_beauty.exr'),
+                 lambda user: user.press(Qt.Key.Key_Return), shows('sh01_beauty.exr'), lambda user: user.type('0'),
+                 shows('sh01_beauty.exr'),
+                 lambda user: (user.find('Pass').setFocus(), user.press(Qt.Key.Key_Down)), shows('sh010_depth.exr'),
+                 lambda user: user.close())
+    names = {}
+    exec(first + 'dialog.launch()', names)
+    patient.plan(lambda user: user.type('7'), shows('7_depth.exr'), lambda user: user.close())
+    exec(second, names)
+    assert not names['timer'].isActive()
 
 
 @pytest.fixture

@@ -89,6 +89,21 @@ def test_the_longest_line_of_a_message_box_is_whole(user, line):
     ui.showMessageBox('Box', ['short', line])
 
 
+CONTROLS = {'\x1b[31mred\x1b[0m': '␛[31mred␛[0m', 'a\0' + 'b' * 60: 'a␀' + 'b' * 60, '\x01\b\f\x1f\x7f': '␁␈␌␟␡',
+            '10%\r20%\r\ndone\r': '10%␍20%\r\ndone\r', '\ttab\nline': '\ttab\nline', '\xa0é\x85': '\xa0é\x85'}
+
+
+def test_a_message_box_shows_control_characters_as_signs_of_their_own(user):
+    def look(user):
+        labels = [label for label in user.window().findChildren(QLabel) if label.objectName() == 'Msg']
+        assert [label.text() for label in labels] == list(CONTROLS.values())
+        assert max(label.sizeHint().width() for label in labels) <= labels[0].width()
+        user.close()
+
+    user.plan(look)
+    ui.showMessageBox('Output', list(CONTROLS))
+
+
 @pytest.mark.parametrize('tail', [b'', b'\0<what stands here is not read'])
 def test_a_description_is_read_from_a_file_up_to_its_first_nul(user, tmp_path, tail):
     path = tmp_path / 'façade.xml'

@@ -152,6 +152,30 @@ def test_functions_take_by_name_just_what_can_be_left_out(name):
             assert is_refused(function, *values[:required], **{parameter: values[index]}), parameter
 
 
+@pytest.mark.parametrize('call, note', [
+    (lambda: ui.showSimpleDialog('t', [], 400, initialValues={}), 'initialValues by name needs cancelButton too'),
+    (lambda: ui.showDialog('t', 'f', height=50), 'height by name needs width too'),
+    (lambda: ui.createDialog('t', XML, initialValues={}), 'initialValues by name needs width and height too'),
+    (lambda: ui.showBrowser(pathValidationCb=print), 'pathValidationCb by name needs title and initialPath too'),
+    (lambda: ui.showDialog('t', 'f', 400, width=400), 'width is there by place already'),
+    (lambda: ui.showSimpleDialog('t', [], cancelButton=True), 'The first 3 arguments go by place'),
+    (lambda: ui.showSimpleDialog('t', [], width=400),
+     'No argument goes by the name width: those that do are cancelButton and initialValues'),
+    (lambda: ui.showMessageBox('t', [], buttons=[]),
+     'No argument goes by the name buttons: those that do are closeButtons'),
+    (lambda: ui.createDialog('t', XML).setValue('a', 'x', invokeCallback=False), 'All arguments go by place'),
+    (lambda: ui.showMessageBox('t', ('a', 'b')), None),
+    (lambda: ui.showDialog('t', '/missing', width=400), None),
+])
+def test_a_refused_call_says_which_argument_by_name_is_in_the_way(call, note):
+    with pytest.raises(Exception) as caught:
+        call()
+    assert getattr(caught.value, '__notes__', [None]) == [note]
+    if note:
+        assert caught.type.__module__ + '.' + caught.type.__name__ == 'Boost.Python.ArgumentError'
+        assert str(caught.value).startswith('Python argument types in\n')
+
+
 @pytest.mark.parametrize('name', METHODS)
 def test_methods_take_nothing_by_name(name):
     dialog = ui.createDialog('t', XML)
@@ -230,3 +254,5 @@ def test_the_module_and_the_dialog_say_what_they_are():
                   'a widget has been activated (clicked)', 'when the user changes it and presses the Enter key',
                   'def myCallbackFunction1( dialog, widgetName, eventType )', 'getValues'):
         assert words in ui.Dialog.__doc__
+    told = ui.Dialog.__doc__.split('registers a callable:\n')[1].split('\n\n')[0].replace('EventType.', '')
+    assert ui.EventType.__doc__.endswith(told) and re.findall(r'- C\{(\w+)\}: ', told) == list(ui.EventType.names)

@@ -93,6 +93,8 @@ def test_a_refused_menu_value_leaves_what_was_done_before_the_refusal(value, fai
         with pytest.raises(failure) as caught:
             WRITERS[name](dialog, 'Prize', value)
         assert caught.type is failure and entries(dialog) == list(after)
+        assert caught.value.__notes__ == ["The menu 'Prize' takes a tuple of a list of str and an index, as "
+                                          "(['a', 'b'], 0); it was given %r" % (value,)]
     with pytest.raises(failure):
         make({'Prize': value})
 
@@ -102,11 +104,35 @@ def test_a_refused_menu_value_leaves_what_was_done_before_the_refusal(value, fai
     ('Show', 'a\ud800', UnicodeEncodeError), ('Win', 'yes', TypeError), ('Win', [], TypeError), ('Win', 1.5, TypeError)])
 def test_a_refused_text_or_state_changes_nothing(write, name, value, failure):
     dialog = make()
-    with pytest.raises(failure):
-        write(dialog, name, value)
-    with pytest.raises(failure):
-        make({name: value})
+    takes = {'Show': 'text field', 'Win': 'toggle button'}[name], name, {'Show': 'str or None', 'Win': 'bool, an int or None'}[name]
+    for refused in lambda: write(dialog, name, value), lambda: make({name: value}):
+        with pytest.raises(failure) as caught:
+            refused()
+        assert caught.value.__notes__ == ['The %s %r takes a %s; it was given %r' % (*takes, value)]
     assert dialog.getValues() == START
+
+
+def test_what_a_callback_raises_in_a_setter_says_nothing_of_the_value(write):
+    def fail(*_):
+        raise KeyError('mine')
+
+    dialog = make()
+    for name, value in ('Show', 'x'), ('Win', True), ('Prize', (['c'], 0)):
+        for event in ui.EventType.STATE, ui.EventType.VALUE_CHANGED:
+            dialog.addCallback(name, event, fail)
+        try:
+            write(dialog, name, value)
+        except KeyError as failure:
+            assert not hasattr(failure, '__notes__')
+
+
+def test_a_text_ends_at_its_first_zero_byte_and_a_number_at_32_bits(write):
+    dialog = make()
+    write(dialog, 'Show', 'a\x1b\0b')
+    write(dialog, 'Win', 2 ** 70)
+    assert dialog.getValues() == {**START, 'Show': 'a\x1b', 'Win': True}
+    with pytest.raises(OverflowError):
+        write(dialog, 'Prize', ([], 2 ** 31))
 
 
 def test_many_values_are_written_from_top_to_bottom_up_to_the_first_refused():

@@ -1,6 +1,7 @@
 """Descriptions that are made from a list of widgets."""
 
 import math
+import reprlib
 from collections import namedtuple
 from xml.etree import ElementTree
 
@@ -183,13 +184,51 @@ def test_a_bad_entry_is_refused_and_the_next_list_works(entry, failure, words):
         with pytest.raises(failure, match=words) as caught:
             show(widgets)
         assert caught.type is failure
+        assert caught.value.__notes__[-1] == 'Entry [1] of the widget list is ' + reprlib.repr(entry)
     assert widgets == [('TextField', 'first'), entry]
     assert find(make(widgets[:1]), 'first') is not None
 
 
-def test_a_kind_that_no_widget_has_is_refused_when_the_dialog_is_built():
-    with pytest.raises(RuntimeError, match=r'line \d+: .*"Gauge"'):
-        ui.createDialog('t', ui.makeXmlFromWidgetList([('Gauge', 'a')]))
+@pytest.mark.parametrize('kind, meant', [('Gauge', ''), ('textfield', 'TextField'), ('Text', 'TextField'),
+                                         ('toggle_button', 'ToggleButton'), ('MenuButton', 'Menu'), ('xy', '')])
+def test_a_kind_that_no_widget_has_is_refused_when_the_dialog_is_built(kind, meant):
+    entries = [('TextField', 'a'), (kind, 'odd')]
+    words = (r'line \d+: unknown widget element "%s" of the widget "odd"\. Known are Container, Label, Menu, PushButton, '
+             r'TextField, ToggleButton\.%s$' % (kind, ' Is it "%s"\\?' % meant if meant else ''))
+    with pytest.raises(RuntimeError, match=words) as caught:
+        ui.createDialog('t', ui.makeXmlFromWidgetList(entries))
+    assert not hasattr(caught.value, '__notes__')
+    with pytest.raises(RuntimeError, match=words) as caught:
+        ui.showSimpleDialog('t', entries, 400)
+    assert caught.value.__notes__ == ['Entry [1] of the widget list is %r; the kinds are TextField, ToggleButton, Menu, '
+                                      'Label and PushButton' % (entries[1],)]
+
+
+def test_a_note_says_which_value_a_row_was_given_and_is_left_out_where_it_cannot_be_made():
+    def notes_of(*entries, buttons=()):
+        with pytest.raises(Exception) as caught:
+            make(list(entries), *buttons)
+        return getattr(caught.value, '__notes__', [])
+
+    assert notes_of(('Label', 'a', '', ['x'] * 9)) == [
+        "The label 'a' takes a str or None; it was given ['x', 'x', 'x', 'x', 'x', 'x', ...]",
+        "Entry [0] of the widget list is ('Label', 'a', '', ['x', 'x', 'x', 'x', 'x', 'x', ...])"]
+    assert notes_of(('Menu', 'a', '', 'x'))[0].startswith("The menu 'a' takes a tuple of a list of str and an index")
+    assert notes_of(buttons=['Yes', 5]) == ['Entry [1] of the list of close buttons is 5']
+    with pytest.raises(TypeError) as caught:
+        ui.showMessageBox('t', ['a', None])
+    assert caught.value.__notes__ == ['Entry [1] of the list of messages is None']
+
+    class Stubborn(Exception):
+        def __setattr__(self, name, value):
+            raise OSError(name)
+
+    class Odd:
+        def __bool__(self):
+            raise Stubborn('odd')
+
+    with pytest.raises(Stubborn, match='^odd$'):
+        make([('TextField', 'a', '', Odd())])
 
 
 NASTY = ['<&>"\'', '\ttab\t', 'two\nlines', 'dos\r\nend', '\r', ' leading', 'trailing ', '   ', '\n', 'clef 𝄞 😀',

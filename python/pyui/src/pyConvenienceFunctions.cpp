@@ -11,6 +11,7 @@
 #include "gfx/wsCursorRegistry.h"
 #include "internalAPI/piBrowserSchemes.h"
 #include "pyCompat.h"
+#include "pyErrorNote.h"
 #include "pyUiError.h"
 #include "pyUtils.h"
 #include "pyWidgetListGenerator.h"
@@ -65,6 +66,23 @@ RCShdPtr<Dialog> makeDialog(std::string const& title, std::string const& xmlStri
     RCShdPtr<Dialog> dialog = makeDialog(title, xmlString, width, height);
     dialog->setValues(initialValues, false);
     return dialog;
+}
+
+/// A line as it can be shown: each control character but tabs and line ends as the sign that Unicode has for it.
+std::string toVisible(std::string const& line)
+{
+    constexpr unsigned char deleteCode = 0x7f;
+    std::string visible;
+    for (std::size_t i = 0; i < line.size(); ++i)
+    {
+        auto const code = static_cast<unsigned char>(line[i]);
+        bool const endsLine = code == '\n' || (code == '\r' && (i + 1 == line.size() || line[i + 1] == '\n'));
+        if ((code >= ' ' && code != deleteCode) || code == '\t' || endsLine)
+            visible += line[i];
+        else
+            visible += {'\xe2', '\x90', static_cast<char>(0x80 + (code == deleteCode ? ' ' + 1 : code))};
+    }
+    return visible;
 }
 
 bp::object toPyPath(std::string const& path)
@@ -169,7 +187,9 @@ bp::dict showSimpleDialog(std::string const& title, bp::list const& widgets, int
     if (cancelButton)
         closeButtons.append(cancelLabel);
     std::string const xmlString = WidgetListGenerator(widgets, closeButtons).generate();
-    RCShdPtr<Dialog> const dialog = makeDialog(title, xmlString, width, height, initialValues);
+    RCShdPtr<Dialog> const dialog = withNote([&] { return makeDialog(title, xmlString, width, height); },
+                                             [&] { return WidgetListGenerator::describeUnknownKind(widgets); });
+    dialog->setValues(initialValues, false);
     dialog->launch();
     return dialog->getValues();
 }
@@ -183,7 +203,8 @@ std::string showMessageBox(std::string const& title, bp::list const& messages, b
     bp::list widgets;
     for (int i = 0; i < lineCount; ++i)
     {
-        std::string const line = bp::extract<std::string>(messages[i]);
+        std::string const line = toVisible(withNote([&] { return bp::extract<std::string>(messages[i])(); },
+                                                    [&] { return describeEntry("list of messages", i, messages[i]); }));
         contentWidth = std::max(contentWidth, measureInUnits(line));
         widgets.append(bp::make_tuple("Label", "Msg", "", line));
     }

@@ -5,6 +5,7 @@
 #include "appUi/uiAppDisabler.h"
 #include "gfx/wsCursorRegistry.h"
 #include "gfx/wsScreen.h"
+#include "pyErrorNote.h"
 #include "pyUiError.h"
 #include "resmgt/xmlDocument.h"
 #include "ui/evPointerEvent.h"
@@ -81,7 +82,8 @@ enum class MenuEntries
     Add,
 };
 
-void writeMenu(UiMenu& menu, bp::object const& value, MenuEntries mode, bool invokeCallback)
+/// Gives the index that the value selects.
+int fillMenu(UiMenu& menu, bp::object const& value, MenuEntries mode)
 {
     bp::tuple const form = bp::extract<bp::tuple>(value);
     bp::list const entries = bp::extract<bp::list>(form[0]);
@@ -90,18 +92,23 @@ void writeMenu(UiMenu& menu, bp::object const& value, MenuEntries mode, bool inv
         menu.removeAll();
     for (int i = 0; i < count; ++i)
         menu.append(bp::extract<std::string>(entries[i])().c_str());
-    menu.setSelection(bp::extract<int>(form[1]), invokeCallback);
+    return bp::extract<int>(form[1]);
 }
 
-/// Writes the value of a widget that has one.
+/// Writes the value of a widget that has one. What the setters raise, by callbacks, is not about the value.
 void writeValue(RCShdPtr<UiWidget> const& widget, bp::object const& value, MenuEntries mode, bool invokeCallback)
 {
+    auto const read = [&](auto action, char const* form)
+    { return withNote(action, [&] { return describeValue(form, widget->getName(), value); }); };
     if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
-        field->setString(readText(value), UiTextField::End, false, invokeCallback);
+        field->setString(read([&] { return readText(value); }, textFieldForm), UiTextField::End, false, invokeCallback);
     else if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
-        toggle->setState(bp::extract<bool>(value), invokeCallback);
+        toggle->setState(read([&] { return bp::extract<bool>(value)(); }, toggleButtonForm), invokeCallback);
     else
-        writeMenu(*dynamicCast<UiMenu>(widget), value, mode, invokeCallback);
+    {
+        RCShdPtr<UiMenu> const menu = dynamicCast<UiMenu>(widget);
+        menu->setSelection(read([&] { return fillMenu(*menu, value, mode); }, menuForm), invokeCallback);
+    }
 }
 
 } // namespace
@@ -454,6 +461,7 @@ void Dialog::removeCallback(std::string const& widgetName, PiWidget::EventType e
     WidgetCbs::release(set);
 }
 
+// It changes the dialog, as a script sees it. NOLINTNEXTLINE(readability-make-member-function-const)
 void Dialog::setWidgetResourceName(std::string const& widgetName, std::string const& resName)
 {
     UiWidget::setWidgetResTable(getWidget(widgetName), resName);

@@ -5,6 +5,7 @@
 #include "base/cbHandler.h"
 #include "gfx/wsFontRegistry.h"
 #include "pyDialog.h"
+#include "pyErrorNote.h"
 #include "pyUiError.h"
 #include "resmgt/liStringSubstituter.h"
 #include "resmgt/liStringUtil.h"
@@ -12,6 +13,7 @@
 #include "ui/uiConstraint.h"
 
 #include <algorithm>
+#include <array>
 #include <sstream>
 
 namespace bp = boost::python;
@@ -50,6 +52,14 @@ struct Substituter
 {
     void writeNumber(std::string& text, int number) { text = LiStringUtil::convertNb(number); }
 };
+
+bool isTrue(bp::object const& object)
+{
+    int const truth = PyObject_IsTrue(object.ptr());
+    if (truth < 0)
+        bp::throw_error_already_set();
+    return truth > 0;
+}
 
 } // namespace
 
@@ -94,6 +104,33 @@ std::string WidgetListGenerator::generate()
     return text;
 }
 
+bp::object WidgetListGenerator::describeUnknownKind(bp::list const& widgetEntries)
+{
+    int const count = lengthOf(widgetEntries);
+    for (int index = 0; index < count; ++index)
+    {
+        bp::object const entry = widgetEntries[index];
+        if (findRowKind(bp::extract<std::string>(entry[0])).name.empty())
+            return describeEntry("widget list", index, entry) +
+                   "; the kinds are TextField, ToggleButton, Menu, Label and PushButton";
+    }
+    return bp::object();
+}
+
+WidgetListGenerator::RowKind const& WidgetListGenerator::findRowKind(std::string const& type)
+{
+    using Generator = WidgetListGenerator;
+    static std::array<RowKind, 6> const kinds{{
+        {textFieldType, rightMargin, "r", &Generator::writeTextValue, textFieldForm},
+        {toggleButtonType, toggleButtonWidth, "w", &Generator::writeStateValue, toggleButtonForm},
+        {menuType, menuWidth, "w", &Generator::writeMenuValue, menuForm},
+        {labelType, 0, "r", &Generator::writeTextValue, labelForm},
+        {pushButtonType, 0, "w", nullptr, nullptr},
+        {"", rightMargin, "r", nullptr, nullptr},
+    }};
+    return *std::find_if(kinds.begin(), kinds.end() - 1, [&type](RowKind const& kind) { return kind.name == type; });
+}
+
 int WidgetListGenerator::writeRows()
 {
     std::size_t longest = 0;
@@ -101,9 +138,13 @@ int WidgetListGenerator::writeRows()
     int const count = lengthOf(_widgets);
     for (int index = 0; index < count; ++index)
     {
-        WidgetEntry const entry = readWidgetEntry(index);
-        longest = std::max(longest, entry.label.size());
-        writeRow(entry.type, entry.name, entry.label, rowOffset, entry.value);
+        auto const writeEntry = [&]
+        {
+            WidgetEntry const entry = readWidgetEntry(index);
+            longest = std::max(longest, entry.label.size());
+            writeRow(entry.type, entry.name, entry.label, rowOffset, entry.value);
+        };
+        withNote(writeEntry, [&] { return describeEntry("widget list", index, _widgets[index]); });
         rowOffset += rowPitch;
     }
     return longest == 0 ? 0 : static_cast<int>(longest) + captionMargin;
@@ -127,9 +168,9 @@ void WidgetListGenerator::writeCloseButtons()
     int x = 0;
     for (int i = 0; i < count; ++i)
     {
-        std::string const label = bp::extract<std::string>(_closeButtons[i]);
         bool const alignRight = i == 1 && count == 2;
-        writeCloseButton(label, x, closeButtonWidth, alignRight);
+        withNote([&] { writeCloseButton(bp::extract<std::string>(_closeButtons[i]), x, closeButtonWidth, alignRight); },
+                 [&] { return describeEntry("list of close buttons", i, _closeButtons[i]); });
         x += closeButtonStep;
     }
 }
@@ -175,39 +216,17 @@ void WidgetListGenerator::writeRow(std::string const& type, std::string const& n
         _writer->closeTag();
         _writer->closeTag();
     }
-    void (WidgetListGenerator::*writeValue)(bp::object const&) = nullptr;
-    if (type == textFieldType)
-    {
-        openRowWidget(type, name, rowOffset, rightMargin, "r");
-        writeValue = &WidgetListGenerator::writeTextValue;
-    }
-    else if (type == toggleButtonType)
-    {
-        openRowWidget(type, name, rowOffset, toggleButtonWidth, "w");
-        writeValue = &WidgetListGenerator::writeStateValue;
-    }
-    else if (type == menuType)
-    {
-        openRowWidget(type, name, rowOffset, menuWidth, "w");
-        writeValue = &WidgetListGenerator::writeMenuValue;
-    }
-    else if (type == labelType)
-    {
-        openRowWidget(type, name, rowOffset, 0, "r");
-        writeValue = &WidgetListGenerator::writeTextValue;
-    }
-    else if (type == pushButtonType)
-        openRowWidget(type, name, rowOffset, measureInUnits(name) + pushButtonMargin, "w");
-    else
-        openRowWidget(type, name, rowOffset, rightMargin, "r");
-    if (writeValue)
-    {
-        int const truth = PyObject_IsTrue(value.ptr());
-        if (truth < 0)
-            bp::throw_error_already_set();
-        if (truth > 0)
-            (this->*writeValue)(value);
-    }
+    RowKind const& kind = findRowKind(type);
+    int const x2Value = type == pushButtonType ? measureInUnits(name) + pushButtonMargin : kind.x2Value;
+    openRowWidget(type, name, rowOffset, x2Value, kind.x2Target);
+    if (kind.writeValue)
+        withNote(
+            [&]
+            {
+                if (isTrue(value))
+                    (this->*kind.writeValue)(value);
+            },
+            [&] { return describeValue(kind.valueForm, name, value); });
     _writer->closeTag();
     _writer->closeTag();
 }

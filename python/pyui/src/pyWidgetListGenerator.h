@@ -37,6 +37,9 @@ public:
     /// for one of the wrong form.
     std::string generate();
 
+    /// Says which entry is the first of a kind that no row is of; None where there is none.
+    static boost::python::object describeUnknownKind(boost::python::list const& widgetEntries);
+
 private:
     struct WidgetEntry
     {
@@ -44,6 +47,17 @@ private:
         std::string name;
         std::string label;
         boost::python::object value;
+    };
+
+    /// What the rows of a kind have in common: where their right edge lies, and how their value is written. Null stands
+    /// for no value.
+    struct RowKind
+    {
+        std::string name;
+        int x2Value;
+        std::string x2Target;
+        void (WidgetListGenerator::*writeValue)(boost::python::object const&);
+        char const* valueForm;
     };
 
     /// Where an edge lies, as the description says it.
@@ -54,6 +68,9 @@ private:
         std::string target;
         std::string sibling;
     };
+
+    /// One without a name for a type that is none of the kinds.
+    static RowKind const& findRowKind(std::string const& type);
 
     /// Writes the rows and gives the width of the caption column, in layout units.
     int writeRows();

@@ -68,7 +68,7 @@ There is no C{showMessage} beside it: a message without a choice is a box withou
 
 @param title: The title of the box.
 @type title: C{str}
-@param messages: The lines from top to bottom.
+@param messages: The lines from top to bottom. Control characters in them are shown as signs.
 @type messages: C{list} of C{str}
 @param closeButtons: The labels of the close buttons. An empty list gets the label "OK". Defaults to [].
 @type closeButtons: C{list} of C{str}
@@ -144,6 +144,14 @@ that of the first file.
 @rtype: C{str}
 @raise UiError: If it is not used within Velmora.
 @raise ValueError: If a path holds a zero byte.)";
+
+constexpr char const* eventType =
+    R"(What a widget tells the callables that L{Dialog.addCallback} has registered:
+  - C{ENABLE}: a widget has been enabled
+  - C{DISABLE}: a widget has been disabled
+  - C{STATE}: a toggle button's state has changed
+  - C{ACTIVATE}: a widget has been activated (clicked)
+  - C{VALUE_CHANGED}: a text field's value has been changed, when the user changes it and presses the Enter key)";
 
 constexpr char const* dialog =
     R"(A dialog, whose widgets can be filled, read, and heard of. There is no public constructor: L{createDialog} is the only
@@ -277,7 +285,7 @@ constexpr char const* hideWidget =
 @raise UiError: If the widget does not exist.)";
 
 constexpr char const* isDisplayed =
-    R"(Tells whether a widget is displayed.
+    R"(Tells whether a widget itself is displayed, also where what holds it is not.
 
 @param widgetName: The name of the widget.
 @type widgetName: C{str}
@@ -295,7 +303,7 @@ constexpr char const* enableWidget =
 @raise UiError: If the widget does not exist.)";
 
 constexpr char const* isEnabled =
-    R"(Tells whether a widget is enabled.
+    R"(Tells whether a widget itself is enabled, also where what holds it is not.
 
 @param widgetName: The name of the widget.
 @type widgetName: C{str}
@@ -304,7 +312,7 @@ constexpr char const* isEnabled =
 
 constexpr char const* disableNextClose =
     R"(Keeps the dialog open at the next press of a close button, and only at that. Called in an C{ACTIVATE} callback of a
-close button, it holds for the press that the callback runs for.)";
+close button that was added before the launch, it holds for the press that the callback runs for.)";
 
 constexpr char const* cursorGuard =
     R"(Changes the current cursor to an alternate cursor, automatically reverting to previous cursor when going out of scope.

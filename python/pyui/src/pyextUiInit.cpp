@@ -10,6 +10,7 @@
 #include "internalAPI/inInternalApi.h"
 #include "internalAPI/piBrowserSchemes.h"
 #include "pluginAPI/inPluginApi.h"
+#include "pyArgumentNote.h"
 #include "pyCompat.h"
 #include "pyConvenienceFunctions.h"
 #include "pyManagedDialog.h"
@@ -26,6 +27,7 @@
 
 #include <memory>
 #include <string>
+#include <vector>
 
 namespace bp = boost::python;
 
@@ -133,37 +135,47 @@ bp::handle<> importGraphModule()
     return bp::handle<>(module);
 }
 
+template <typename Overloads, typename Function, std::size_t count>
+void defineFunction(char const* name, Function function, bp::detail::keywords<count> const& parameters, char const* doc)
+{
+    bp::def(name, function, Overloads(parameters, doc));
+    std::vector<std::string> names;
+    for (bp::detail::keyword const& parameter : parameters.elements)
+        names.emplace_back(parameter.name);
+    explainArguments(bp::scope().attr(name), names);
+}
+
 void defineFunctions()
 {
     using bp::arg;
-    bp::def("showDialog", &showDialog,
-            showDialogOverloads((positional(), positional(), arg("width"), arg("height"), arg("initialValues")),
-                                Docs::showDialog));
-    bp::def(
+    defineFunction<showDialogOverloads>("showDialog", &showDialog,
+                                        (positional(), positional(), arg("width"), arg("height"), arg("initialValues")),
+                                        Docs::showDialog);
+    defineFunction<showSimpleDialogOverloads>(
         "showSimpleDialog", &showSimpleDialog,
-        showSimpleDialogOverloads((positional(), positional(), positional(), arg("cancelButton"), arg("initialValues")),
-                                  Docs::showSimpleDialog));
-    bp::def("showMessageBox", &showMessageBox,
-            showMessageBoxOverloads((positional(), positional(), arg("closeButtons")), Docs::showMessageBox));
-    bp::def("makeXmlFromWidgetList", &makeXmlFromWidgetList,
-            makeXmlOverloads((positional(), arg("closeButtons")), Docs::makeXmlFromWidgetList));
-    bp::def("createDialog", &createDialog,
-            createDialogOverloads((positional(), positional(), arg("width"), arg("height"), arg("initialValues")),
-                                  Docs::createDialog));
-    bp::def("showBrowser", &showBrowser,
-            showBrowserOverloads((arg("title"), arg("initialPath"), arg("pathValidationCb")), Docs::showBrowser));
+        (positional(), positional(), positional(), arg("cancelButton"), arg("initialValues")), Docs::showSimpleDialog);
+    defineFunction<showMessageBoxOverloads>("showMessageBox", &showMessageBox,
+                                            (positional(), positional(), arg("closeButtons")), Docs::showMessageBox);
+    defineFunction<makeXmlOverloads>("makeXmlFromWidgetList", &makeXmlFromWidgetList,
+                                     (positional(), arg("closeButtons")), Docs::makeXmlFromWidgetList);
+    defineFunction<createDialogOverloads>(
+        "createDialog", &createDialog, (positional(), positional(), arg("width"), arg("height"), arg("initialValues")),
+        Docs::createDialog);
+    defineFunction<showBrowserOverloads>(
+        "showBrowser", &showBrowser, (arg("title"), arg("initialPath"), arg("pathValidationCb")), Docs::showBrowser);
 }
 
 void registerEventType()
 {
     if (PyextInit::shareClass<PiWidget::EventType>("EventType"))
         return;
-    bp::enum_<PiWidget::EventType>("EventType")
-        .value("ENABLE", PiWidget::Enable)
+    bp::enum_<PiWidget::EventType> eventType("EventType");
+    eventType.value("ENABLE", PiWidget::Enable)
         .value("DISABLE", PiWidget::Disable)
         .value("STATE", PiWidget::State)
         .value("ACTIVATE", PiWidget::Activate)
         .value("VALUE_CHANGED", PiWidget::ValueChanged);
+    eventType.attr("__doc__") = Docs::eventType;
 }
 
 void registerDialog()
@@ -193,6 +205,9 @@ void registerDialog()
         .def("enableWidget", &Dialog::enableWidget, Docs::enableWidget)
         .def("isEnabled", &Dialog::isEnabled, Docs::isEnabled)
         .def("disableNextClose", &Dialog::disableNextClose, Docs::disableNextClose);
+    // What can be left out of these is what one would name.
+    for (char const* const name : {"setValue", "setValues"})
+        explainArguments(dialog.attr(name), {});
 }
 
 void registerCursorGuard()
