@@ -109,7 +109,13 @@ TEST_F(Compositions, NameTheFileAndTheLineOfWhatIsWrongWithThem)
              {1, "'graph'", "<graph/>"},
              {2, "'noode'", "<composition>\n<noode/></composition>"},
              {2, "'colour'", "<composition>\n<node name='a' type='t' colour='c'/></composition>"},
-             {1, "'version'", "<composition version='1'/>"},
+             {1, "is no version: '1.5'", "<composition version='1.5'/>"},
+             {1, "is no version: ''", "<composition version=''/>"},
+             {1, "is no version: '-1'", "<composition version='-1'/>"},
+             {1, "a later version of the application has written it, in version '2'",
+              "<composition version='2' new=''/>"},
+             {1, "a later version of the application",
+              "<composition version='99999999999999999999'><new/></composition>"},
              {2, "no attribute 'name'", "<composition>\n<node type='t'/></composition>"},
              {2, "'name' of element 'node' is empty", "<composition>\n<node name='' type='t'/></composition>"},
              {2, "no attribute 'type'", "<composition>\n<node name='a'/></composition>"},
@@ -156,6 +162,7 @@ TEST_F(Compositions, AreReadAgainExactlyAsTheyWereWritten)
     EXPECT_EQ(nodes[0]->getInputs(), (PiNode::NamedTexts{{"source", "Read"}}));
     EXPECT_EQ(nodes[1]->getValues(), (PiNode::NamedTexts{{text, text}}));
     std::string const written = read(name);
+    expectContains(written, "<composition version=\"1\">");
     again->save();
     EXPECT_EQ(read(name), written);
 }
