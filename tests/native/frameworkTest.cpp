@@ -344,6 +344,35 @@ TEST_F(Compositions, AreOpenedMadeCurrentAndClosedInAWorkspace)
     EXPECT_THROW(workspace->openComposition({}), ExBase);
 }
 
+TEST_F(Compositions, BelongToWhoHasReadThemUntilAWorkspaceTakesThemOver)
+{
+    RCShdPtr<UiCompositionWorkspace> const workspace = makeShd<UiCompositionWorkspace>();
+    Hearer hearer(*workspace);
+    write("shot", grade);
+    FwComposition::Keeper keeper = FwComposition::openApart(pathOf("shot"));
+    RCShdPtr<PiGraph> const graph = (*keeper)->getGraph();
+    Composition const apart = workspace->getComposition(graph);
+    EXPECT_FALSE(apart.isExpired() || workspace->isCompositionOpened(pathOf("shot")));
+    EXPECT_THROW(workspace->close(apart), ExBase) << "it is not the workspace's";
+    keeper.reset();
+    EXPECT_TRUE(apart.isExpired() && workspace->getComposition(graph).isExpired());
+    EXPECT_TRUE(workspace->getComposition(nullptr).isExpired());
+
+    keeper = FwComposition::openApart(pathOf("shot"));
+    RCShdPtr<PiGraph> const kept = (*keeper)->getGraph();
+    kept->setNodeValue("Grade", "gain", "2");
+    Composition const taken = workspace->getComposition(kept);
+    workspace->openComposition(taken);
+    EXPECT_EQ(hearer.take(), "opened shot of 1; current shot of 1; ");
+    kept->setNodeValue("Grade", "gain", "3");
+    EXPECT_EQ(hearer.take(), "changed shot of 1; ");
+    keeper.reset();
+    EXPECT_TRUE(workspace->getCurrentComposition() == taken) << "it is the workspace's own now";
+    workspace->close(taken);
+    EXPECT_TRUE(taken.isExpired());
+    EXPECT_EQ(hearer.take(), "closed shot of 0; current none of 0; ");
+}
+
 TEST_F(Compositions, TellTheirWorkspaceOfEachChange)
 {
     RCShdPtr<UiCompositionWorkspace> workspace = makeShd<UiCompositionWorkspace>();
