@@ -30,7 +30,7 @@ public:
     /// Owns a composition until a workspace takes it over, and is empty from then on.
     using Keeper = std::shared_ptr<RCStrongPtr<FwComposition>>;
 
-    /// The same for somebody who is no workspace.
+    /// Reads the file as `open` does, for somebody who is no workspace.
     static Keeper openApart(OsFilePath const& path);
 
     ~FwComposition() override;
