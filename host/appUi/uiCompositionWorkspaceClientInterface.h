@@ -26,8 +26,8 @@ public:
 
     /// Makes the composition the current one. One that a script has read belongs to the workspace from then on; where
     /// its file is open already, the script keeps it, and the one that is open is made the current one. Throws `ExBase`
-    /// for a composition that has been closed. So it does where the file is open already and the script has changes that
-    /// are not saved.
+    /// for a composition that has been closed. So it does where the file is open already and the script has changes
+    /// that are not saved.
     virtual void openComposition(RCWeakPtr<const PiCompositionGraphInterface> const& composition) = 0;
 
     /// The composition that the graph belongs to, open here or read by a script; expired if it has been closed.
