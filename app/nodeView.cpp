@@ -22,24 +22,48 @@ constexpr double columnGap = 56;
 constexpr double rowGap = 22;
 constexpr double margin = 40;
 
+/// Texts that are drawn smaller than this cannot be read.
+constexpr double leastTextScale = 0.1;
+
 using Inputs = std::vector<std::vector<std::size_t>>;
 
-/// How many steps each node is away from one without inputs. Nodes that hang on each other in a ring end at their
-/// number.
+/// How many steps each node is away from one without inputs. Each is visited once, after its inputs; of a ring of nodes
+/// the step that closes it counts for nothing.
 std::vector<std::size_t> findDepths(Inputs const& inputs)
 {
-    std::vector<std::size_t> depths(inputs.size(), 0);
-    bool changed = true;
-    for (std::size_t round = 0; changed && round < inputs.size(); ++round)
+    struct Visit
     {
-        changed = false;
-        for (std::size_t node = 0; node < inputs.size(); ++node)
+        std::size_t node;
+        std::size_t nextInput = 0;
+    };
+    std::vector<std::size_t> depths(inputs.size(), 0);
+    std::vector<bool> seen(inputs.size(), false);
+    std::vector<bool> finished(inputs.size(), false);
+    // A stack of its own: a chain can be longer than the program's.
+    std::vector<Visit> visits;
+    auto const visit = [&](std::size_t node)
+    {
+        if (!seen[node])
+            visits.push_back({node});
+        seen[node] = true;
+    };
+    for (std::size_t start = 0; start < inputs.size(); ++start)
+    {
+        visit(start);
+        while (!visits.empty())
+        {
+            auto& [node, nextInput] = visits.back();
+            if (nextInput < inputs[node].size())
+            {
+                visit(inputs[node][nextInput++]);
+                continue;
+            }
             for (std::size_t const input : inputs[node])
-                if (input != node && depths[node] <= depths[input])
-                {
-                    depths[node] = depths[input] + 1;
-                    changed = true;
-                }
+                if (finished[input])
+                    depths[node] = std::max(depths[node], depths[input] + 1);
+            finished[node] = true;
+            visits.pop_back();
+        }
     }
     return depths;
 }
@@ -133,6 +157,8 @@ void NodeView::paintBox(QPainter& painter, Box const& box) const
     painter.setPen(QPen(palette().color(QPalette::Highlight), 1.2));
     painter.setBrush(palette().color(QPalette::Button));
     painter.drawRoundedRect(box.place, corner, corner);
+    if (painter.transform().m11() < leastTextScale)
+        return;
     QRectF const text = box.place.adjusted(8, 5, -8, -5);
     QFont bold = font();
     bold.setBold(true);

@@ -90,12 +90,10 @@ class Tour:
 
 # What is selected counts only while the browser has the keyboard: no dialog may come first.
 selected = ui.Workspace.getBrowserSelection()
+if not ui.Workspace.getNbCompositions() and ui.showMessageBox(
+        'Tour', ['No composition is open.', 'Open the examples?'], ['Open', 'Cancel']) == 'Open':
+    for path in sorted(glob.glob(os.path.join(os.path.dirname(__file__), 'compositions', '*.vmcomposition'))):
+        ui.Workspace.openComposition(graph.readComposition(path))
 compositions = ui.Workspace.getCompositions()
 if compositions:
     Tour(compositions, selected).run()
-elif ui.showMessageBox('Tour', ['No composition is open.', 'Start the application anew with the examples?'],
-                       ['Start', 'Cancel']) == 'Start':
-    # Scripts open no files in the application; its command line does.
-    examples = sorted(glob.glob(os.path.join(os.path.dirname(__file__), 'compositions', '*.vmcomposition')))
-    options = [word for path in examples for word in ('--open', path)]
-    os.execv('/proc/self/exe', ['velmora', *options, __file__])

@@ -4,6 +4,7 @@
 #include "appUi/uiCompositionWorkspaceListener.h"
 #include "base/rcWeakAccessor.h"
 #include "framework/fwComposition.h"
+#include "resmgt/liStringUtil.h"
 #include "ui/uiContainer.h"
 
 #include <algorithm>
@@ -11,6 +12,18 @@
 
 namespace Kv
 {
+
+namespace
+{
+
+/// The composition if a script has read it and no workspace has taken it over; null otherwise.
+template <typename Controller> RCStrongPtr<FwComposition const> findApart(std::shared_ptr<Controller> const& controller)
+{
+    auto composition = std::dynamic_pointer_cast<FwComposition const>(controller);
+    return composition && composition->isApart() ? composition : nullptr;
+}
+
+} // namespace
 
 UiCompositionWorkspace::UiCompositionWorkspace(FocusFinder findFocus) : _findFocus(std::move(findFocus)) {}
 
@@ -36,11 +49,7 @@ RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::open(OsFile
         return composition;
     }
     RCStrongPtr<FwComposition> const composition = FwComposition::open(canonical);
-    composition->setListener(this);
-    _compositions.push_back(composition);
-    if (_listener)
-        _listener->compositionOpened(composition);
-    setCurrent(composition);
+    add(composition);
     return composition;
 }
 
@@ -96,7 +105,21 @@ RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::getCurrentC
 
 void UiCompositionWorkspace::openComposition(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
 {
-    makeCurrent(composition);
+    RCStrongPtr<FwComposition const> const apart = findApart(composition.lock());
+    if (apart.isNull())
+    {
+        makeCurrent(composition);
+        return;
+    }
+    auto const known = find(apart->getPath());
+    if (known == _compositions.end())
+        add(apart->takeOver());
+    else if (apart->isModified())
+        throw ExBase(__FILE__, __LINE__,
+                     "Cannot open " + LiStringUtil::getPrintablePath(apart->getPath().toString()) +
+                         ": it is open already, and what was read has changes that are not saved");
+    else
+        setCurrent(*known);
 }
 
 RCWeakPtr<const PiCompositionGraphInterface>
@@ -105,7 +128,7 @@ UiCompositionWorkspace::getComposition(RCShdPtr<const PiGraph> const& graph) con
     for (RCStrongPtr<const FwComposition> const composition : _compositions)
         if (composition->getGraph() == graph)
             return composition;
-    return {};
+    return graph ? findApart(graph->getController().lock()) : nullptr;
 }
 
 bool UiCompositionWorkspace::isCompositionEditable(
@@ -147,6 +170,15 @@ UiCompositionWorkspace::Compositions::const_iterator UiCompositionWorkspace::fin
     return std::find_if(_compositions.begin(), _compositions.end(),
                         [&path](RCStrongPtr<FwComposition> const& composition)
                         { return composition->getPath() == path; });
+}
+
+void UiCompositionWorkspace::add(RCStrongPtr<FwComposition> const& composition)
+{
+    composition->setListener(this);
+    _compositions.push_back(composition);
+    if (_listener)
+        _listener->compositionOpened(composition);
+    setCurrent(composition);
 }
 
 RCStrongPtr<FwComposition>

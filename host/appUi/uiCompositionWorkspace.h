@@ -69,6 +69,7 @@ private:
     void compositionSaved(FwComposition const& composition) override;
 
     Compositions::const_iterator find(OsFilePath const& path) const;
+    void add(RCStrongPtr<FwComposition> const& composition);
     RCStrongPtr<FwComposition> require(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const;
     void setCurrent(RCStrongPtr<FwComposition> const& composition);
 

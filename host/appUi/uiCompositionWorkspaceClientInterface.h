@@ -24,10 +24,13 @@ public:
     /// Expired when there is none.
     virtual RCWeakPtr<const PiCompositionGraphInterface> getCurrentComposition() const = 0;
 
-    /// Makes the composition the current one. Throws `ExBase` for one that has been closed.
+    /// Makes the composition the current one. One that a script has read belongs to the workspace from then on; where
+    /// its file is open already, the script keeps it, and the one that is open is made the current one. Throws `ExBase`
+    /// for a composition that has been closed. So it does where the file is open already and the script has changes
+    /// that are not saved.
     virtual void openComposition(RCWeakPtr<const PiCompositionGraphInterface> const& composition) = 0;
 
-    /// The open composition that the graph belongs to; expired if there is none.
+    /// The composition that the graph belongs to, open here or read by a script; expired if it has been closed.
     virtual RCWeakPtr<const PiCompositionGraphInterface> getComposition(RCShdPtr<const PiGraph> const& graph) const = 0;
 
     /// Whether the composition is open and can be changed now, which the disk decides.

@@ -45,9 +45,28 @@ RCStrongPtr<FwComposition> FwComposition::open(OsFilePath const& path)
     return composition;
 }
 
+FwComposition::Keeper FwComposition::openApart(OsFilePath const& path)
+{
+    Keeper keeper = std::make_shared<RCStrongPtr<FwComposition>>(open(path));
+    (*keeper)->_keeper = keeper;
+    return keeper;
+}
+
 FwComposition::FwComposition(OsFilePath path) : _path(std::move(path)) {}
 
 FwComposition::~FwComposition() = default;
+
+bool FwComposition::isApart() const
+{
+    Keeper const keeper = _keeper.lock();
+    return keeper && !keeper->isNull();
+}
+
+RCStrongPtr<FwComposition> FwComposition::takeOver() const
+{
+    Keeper const keeper = _keeper.lock();
+    return keeper ? std::exchange(*keeper, nullptr) : nullptr;
+}
 
 RCShdPtr<const PiNode> FwComposition::getNode() const
 {

@@ -6,6 +6,8 @@
 #include "internalAPI/piCompositionGraphInterface.h"
 #include "resmgt/osFilePath.h"
 
+#include <memory>
+
 namespace Kv
 {
 
@@ -13,8 +15,8 @@ class FwCompositionListener;
 class FwGraph;
 class FwNode;
 
-/// A composition that has been read from its file. It is closed by its strong pointers being let go; what is left of
-/// its graph then no longer changes.
+/// A composition that has been read from its file. It has one owner, and is closed by that letting it go; what is left
+/// of its graph then no longer changes.
 class KV_API FwComposition : public PiCompositionGraphInterface
 {
 public:
@@ -25,7 +27,19 @@ public:
     /// it.
     static RCStrongPtr<FwComposition> open(OsFilePath const& path);
 
+    /// Owns a composition until a workspace takes it over, and is empty from then on.
+    using Keeper = std::shared_ptr<RCStrongPtr<FwComposition>>;
+
+    /// Reads the file as `open` does, for somebody who is no workspace.
+    static Keeper openApart(OsFilePath const& path);
+
     ~FwComposition() override;
+
+    /// Whether it is owned by a keeper.
+    bool isApart() const;
+
+    /// Takes it from its keeper. Null where none owns it.
+    RCStrongPtr<FwComposition> takeOver() const;
 
     /// The node that stands for the composition as a whole, and is none of the nodes of its graph.
     RCShdPtr<const PiNode> getNode() const override;
@@ -55,6 +69,7 @@ private:
     RCShdPtr<FwNode> _node;
     RCShdPtr<FwGraph> _graph;
     bool _isModified = false;
+    Keeper::weak_type _keeper;
     FwCompositionListener* _listener = nullptr;
 };
 

@@ -10,6 +10,10 @@ constexpr char const* node = "node";
 constexpr char const* value = "value";
 constexpr char const* input = "input";
 
+/// Of the whole: the version of these words. A file without one is of the first.
+constexpr char const* version = "version";
+constexpr int currentVersion = 1;
+
 /// Of a node, a value or an input.
 constexpr char const* name = "name";
 /// Of a node.

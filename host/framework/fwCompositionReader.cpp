@@ -7,8 +7,11 @@
 #include "resmgt/xmlError.h"
 
 #include <algorithm>
+#include <charconv>
 #include <cstdint>
 #include <initializer_list>
+#include <optional>
+#include <system_error>
 
 namespace Kv
 {
@@ -53,6 +56,24 @@ std::string getFilledAttribute(XmlElement const& element, char const* name)
     return text;
 }
 
+/// A file of a later version can hold what nobody here knows, and would lose it by the next save.
+void requireKnownVersion(XmlElement const& root)
+{
+    std::optional<std::string> const text = root.findAttribute(Format::version);
+    if (!text)
+        return;
+    int version = 0;
+    char const* const end = text->data() + text->size();
+    auto const [rest, error] = std::from_chars(text->data(), end, version);
+    bool const isNumber = !text->empty() && rest == end && text->front() != '-' && text->front() != '0';
+    if (!isNumber)
+        fail(root, "attribute 'version' of element 'composition' is no version: " + LiStringUtil::getPrintable(*text));
+    if (error != std::errc() || version > Format::currentVersion)
+        fail(root, "a later version of the application has written it, in version " +
+                       LiStringUtil::getPrintable(*text) + " of the format; this one reads version " +
+                       std::to_string(Format::currentVersion));
+}
+
 /// `names` are those that the node has used for elements of this kind.
 std::string readName(XmlElement const& element, std::set<std::string>& names)
 {
@@ -77,7 +98,8 @@ std::vector<FwNode::Description> FwCompositionReader::read(OsFilePath const& pat
     catch (XmlError const& error)
     {
         throw ExBase(__FILE__, __LINE__,
-                     LiStringUtil::getPrintablePath(path.toString()) + " is no composition: " + error.getReason());
+                     "Cannot read the composition " + LiStringUtil::getPrintablePath(path.toString()) + ": " +
+                         error.getReason());
     }
 }
 
@@ -89,7 +111,8 @@ FwCompositionReader::FwCompositionReader(std::string const& text)
     if (root->getName() != Format::composition)
         fail(*root, "the root element is " + LiStringUtil::getPrintable(root->getName()) + " and not '" +
                         Format::composition + "'");
-    requireNothingElse(*root, {});
+    requireKnownVersion(*root);
+    requireNothingElse(*root, {Format::version});
     for (XmlElement const& child : root->getChildren())
         readNode(child);
     requireReferencedNodes();

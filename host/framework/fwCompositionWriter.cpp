@@ -5,6 +5,7 @@
 #include "resmgt/xmlWriter.h"
 
 #include <sstream>
+#include <string>
 
 namespace Kv
 {
@@ -44,6 +45,7 @@ std::string FwCompositionWriter::write(PiGraph const& graph)
     std::ostringstream stream;
     XmlWriter writer(stream, indent);
     writer.openTag(Format::composition);
+    writer.writeAttrib(Format::version, std::to_string(Format::currentVersion));
     for (RCShdPtr<const PiNode> const& node : graph.getNodes())
         writeNode(writer, *node);
     writer.closeTag();

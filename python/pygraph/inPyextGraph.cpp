@@ -3,6 +3,7 @@
 #include "base/inBase.h"
 #include "base/inBuildInfoUtil.h"
 #include "base/inLibraryBuildInfo.h"
+#include "framework/inFramework.h"
 #include "gfx/inGfx.h"
 #include "internalAPI/inInternalApi.h"
 #include "pluginAPI/inPluginApi.h"
@@ -25,6 +26,7 @@ template <> InInit<KvInit::pyextGraph>::InInit() : InPackageInit("pyextGraph")
     registerPackage();
     addDependency(InInit<KvInit::pyextInit>::getType());
     addDependency(InInit<KvInit::scriptingAPI>::getType());
+    addDependency(InInit<KvInit::framework>::getType());
     addDependency(InInit<KvInit::internalAPI>::getType());
     addDependency(InInit<KvInit::pluginAPI>::getType());
     addDependency(InInit<KvInit::gfx>::getType());

@@ -2,6 +2,7 @@
 
 #include "pygraph/pyGraph.h"
 
+#include "gfx/wsThread.h"
 #include "pygraph/pyGraphError.h"
 #include "pygraph/pyManagedGraph.h"
 #include "resmgt/liStringUtil.h"
@@ -15,11 +16,11 @@ namespace
 {
 
 /// To a script, what the graph refuses is no other failure than what the module itself refuses.
-template <typename Action> void runForScript(Action const& action)
+template <typename Action> auto runForScript(Action const& action)
 {
     try
     {
-        action();
+        return action();
     }
     catch (ExBase const& failure)
     {
@@ -32,6 +33,21 @@ template <typename Action> void runForScript(Action const& action)
 Graph::Graph(RCShdPtr<PiGraph> const& graph) : GraphRO(graph), _writableGraph(graph) {}
 
 Graph::Graph(RCShdPtr<const PiGraph> const& graph) : GraphRO(graph) {}
+
+RCShdPtr<Graph> Graph::read(OsFilePath const& path)
+{
+    FwComposition::Keeper const keeper = runForScript(
+        [&path]
+        {
+            WsThread::require("Graph");
+            return FwComposition::openApart(path);
+        });
+    RCShdPtr<PiGraph> const piGraph = (*keeper)->getGraph();
+    RCShdPtr<Graph> graph =
+        (*keeper)->isEditable() ? makeShd<Graph>(piGraph) : makeShd<Graph>(RCShdPtr<const PiGraph>(piGraph));
+    graph->_keeper = keeper;
+    return graph;
+}
 
 Graph::~Graph() = default;
 

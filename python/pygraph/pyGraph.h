@@ -1,5 +1,6 @@
 #pragma once
 
+#include "framework/fwComposition.h"
 #include "pygraph/pyGraphRo.h"
 
 #include <string>
@@ -16,6 +17,10 @@ public:
 
     /// Read-only.
     explicit Graph(RCShdPtr<const PiGraph> const& graph);
+
+    /// Reads the file of a composition, which is writable if the file can be written now. Until a workspace opens it,
+    /// it is open for as long as the result. Throws `GraphError` for what is wrong with the file.
+    static RCShdPtr<Graph> read(OsFilePath const& path);
 
     ~Graph() override;
 
@@ -39,6 +44,8 @@ private:
 
     /// Null if read-only.
     RCShdPtr<PiGraph> _writableGraph;
+    /// Null for a composition of a workspace.
+    FwComposition::Keeper _keeper;
 };
 
 } // namespace Kv::PyextGraph

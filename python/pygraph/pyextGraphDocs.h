@@ -8,18 +8,34 @@ namespace Kv::PyextGraph::Docs
 constexpr char const* module = "Quorvane Velmora internal graph extension module.";
 
 constexpr char const* graph =
-    R"(The graph of a composition that is open in Velmora: nodes, each with a name of its own, a type, values, and
-inputs that refer to other nodes. There is no public constructor: the workspace of the C{ui} module hands out the graphs
-of its compositions.
+    R"(The graph of a composition: nodes, each with a name of its own, a type, values, and inputs that refer to other
+nodes. There is no public constructor: the workspace of the C{ui} module hands out the graphs of the compositions that
+are open in Velmora, and L{readComposition} reads one from its file.
 
-A C{Graph} does not keep its composition open. Once that is closed, every method raises L{GraphError}; the object can
-still be compared, and printed. Two of them are equal if they stand for the same composition. Example::
+A C{Graph} does not keep a composition of the workspace open. Once that is closed, every method raises L{GraphError};
+the object can still be compared, and printed. Two of them are equal if they stand for the same composition. Example::
 
     shot = ui.Workspace.getCurrentComposition()
     for node in shot.getNodes():
         if shot.getNodeType( node ) == 'ImageReader':
             shot.setNodeValue( node, 'proxy', 'half' )
     shot.save())";
+
+constexpr char const* readComposition =
+    R"(Reads the file of a composition, in Velmora and in an interpreter on its own. The composition is the script's own:
+nobody sees it, and it is there for as long as the C{Graph}, until C{ui.Workspace.openComposition} gives it to the
+workspace. Each call reads the file anew. Example::
+
+    shot = graph.readComposition( '/shots/shot_010.vmcomposition' )
+    shot.setNodeValue( 'Grade', 'gain', '1.3' )
+    shot.save()
+
+@param path: The path of the file. One that is relative begins in the current directory.
+@type path: C{str}
+@return: The graph of the composition. It only reads if the file cannot be written.
+@rtype: L{Graph}
+@raise GraphError: If there is no such file, if it cannot be read, if it is that of no composition, or if a later version
+of the application has written it.)";
 
 constexpr char const* getName =
     R"(Gets the name of the composition.

@@ -24,6 +24,11 @@ bool isUnequal(Graph const& graph, bp::object const& other)
     return !isEqual(graph, other);
 }
 
+RCShdPtr<ManagedGraph> readComposition(OsFilePath const& path)
+{
+    return makeShd<ManagedGraph>(Graph::read(path));
+}
+
 void registerGraph()
 {
     if (PyextInit::shareClass<Graph>("Graph"))
@@ -55,6 +60,7 @@ void moduleBody()
     bp::docstring_options const options(true, false, false);
     registerGraph();
     registerException();
+    bp::def("readComposition", &readComposition, bp::arg("path"), Docs::readComposition);
     bp::scope().attr("__doc__") = Docs::module;
 }
 

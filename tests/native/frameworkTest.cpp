@@ -109,7 +109,13 @@ TEST_F(Compositions, NameTheFileAndTheLineOfWhatIsWrongWithThem)
              {1, "'graph'", "<graph/>"},
              {2, "'noode'", "<composition>\n<noode/></composition>"},
              {2, "'colour'", "<composition>\n<node name='a' type='t' colour='c'/></composition>"},
-             {1, "'version'", "<composition version='1'/>"},
+             {1, "is no version: '1.5'", "<composition version='1.5'/>"},
+             {1, "is no version: ''", "<composition version=''/>"},
+             {1, "is no version: '-1'", "<composition version='-1'/>"},
+             {1, "a later version of the application has written it, in version '2'",
+              "<composition version='2' new=''/>"},
+             {1, "a later version of the application",
+              "<composition version='99999999999999999999'><new/></composition>"},
              {2, "no attribute 'name'", "<composition>\n<node type='t'/></composition>"},
              {2, "'name' of element 'node' is empty", "<composition>\n<node name='' type='t'/></composition>"},
              {2, "no attribute 'type'", "<composition>\n<node name='a'/></composition>"},
@@ -156,6 +162,7 @@ TEST_F(Compositions, AreReadAgainExactlyAsTheyWereWritten)
     EXPECT_EQ(nodes[0]->getInputs(), (PiNode::NamedTexts{{"source", "Read"}}));
     EXPECT_EQ(nodes[1]->getValues(), (PiNode::NamedTexts{{text, text}}));
     std::string const written = read(name);
+    expectContains(written, "<composition version=\"1\">");
     again->save();
     EXPECT_EQ(read(name), written);
 }
@@ -335,6 +342,35 @@ TEST_F(Compositions, AreOpenedMadeCurrentAndClosedInAWorkspace)
     workspace->close(a);
     EXPECT_EQ(hearer.take(), "closed a of 0; current none of 0; ");
     EXPECT_THROW(workspace->openComposition({}), ExBase);
+}
+
+TEST_F(Compositions, BelongToWhoHasReadThemUntilAWorkspaceTakesThemOver)
+{
+    RCShdPtr<UiCompositionWorkspace> const workspace = makeShd<UiCompositionWorkspace>();
+    Hearer hearer(*workspace);
+    write("shot", grade);
+    FwComposition::Keeper keeper = FwComposition::openApart(pathOf("shot"));
+    RCShdPtr<PiGraph> const graph = (*keeper)->getGraph();
+    Composition const apart = workspace->getComposition(graph);
+    EXPECT_FALSE(apart.isExpired() || workspace->isCompositionOpened(pathOf("shot")));
+    EXPECT_THROW(workspace->close(apart), ExBase) << "it is not the workspace's";
+    keeper.reset();
+    EXPECT_TRUE(apart.isExpired() && workspace->getComposition(graph).isExpired());
+    EXPECT_TRUE(workspace->getComposition(nullptr).isExpired());
+
+    keeper = FwComposition::openApart(pathOf("shot"));
+    RCShdPtr<PiGraph> const kept = (*keeper)->getGraph();
+    kept->setNodeValue("Grade", "gain", "2");
+    Composition const taken = workspace->getComposition(kept);
+    workspace->openComposition(taken);
+    EXPECT_EQ(hearer.take(), "opened shot of 1; current shot of 1; ");
+    kept->setNodeValue("Grade", "gain", "3");
+    EXPECT_EQ(hearer.take(), "changed shot of 1; ");
+    keeper.reset();
+    EXPECT_TRUE(workspace->getCurrentComposition() == taken) << "it is the workspace's own now";
+    workspace->close(taken);
+    EXPECT_TRUE(taken.isExpired());
+    EXPECT_EQ(hearer.take(), "closed shot of 0; current none of 0; ");
 }
 
 TEST_F(Compositions, TellTheirWorkspaceOfEachChange)

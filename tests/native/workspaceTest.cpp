@@ -157,6 +157,38 @@ TEST_F(Application, ClosesCompositionsThatScriptsStillHave)
     EXPECT_EQ(evaluate("ws.getCurrentComposition() == a"), "False") << "it is another one on the same file";
 }
 
+TEST_F(Application, OpensWhatAScriptHasRead)
+{
+    run("a, other = graph.readComposition(path_a), graph.readComposition(path_a)\n"
+        "a.setNodeValue('Grade', 'gain', '2')\n");
+    EXPECT_EQ(evaluate("(a == other, other.getNodeValues('Grade'), ws.getNbCompositions(), a.isWritable())"),
+              "(False, {'gain': '1'}, 0, True)");
+    run("ws.openComposition(a)\n");
+    EXPECT_EQ(evaluate("(ws.getCurrentComposition() == a, ws.getCurrentComposition().getNodeValues('Grade'))"),
+              "(True, {'gain': '2'})");
+    workspace->open(pathOf("b"));
+    run("ws.openComposition(other)\n");
+    EXPECT_EQ(evaluate("(ws.getNbCompositions(), ws.getCurrentComposition() == a, other.getNodeValues('Grade'))"),
+              "(2, True, {'gain': '1'})")
+        << "its file is open already";
+    run("other.setNodeValue('Grade', 'gain', '3')\nws.openComposition(ws.getCompositions()[1])\n");
+    EXPECT_EQ(
+        evaluate("refusal(ws.openComposition, other) == \"RuntimeError: Cannot open '%s': it is open already, and "
+                 "what was read has changes that are not saved\" % path_a"),
+        "True");
+    EXPECT_EQ(evaluate("ws.getCurrentComposition().getName()"), "b");
+    run("again = ws.getCompositions()[0]\ndel a\n");
+    EXPECT_EQ(evaluate("again.getNodeValues('Grade')"), "{'gain': '2'}") << "no script has to keep it";
+    run("a = again\nws.openComposition(a)\n");
+    workspace->close(workspace->getCurrentComposition());
+    EXPECT_EQ(evaluate("{refusal(a.getNodes), refusal(a.save), refusal(other.getNodes) == ['Grade', 'Read']}"
+                       " == {\"GraphError: The composition 'a' has been closed.\", True}"),
+              "True");
+    run("ws.openComposition(other)\nunseen = graph.readComposition(path_a)\nws.openComposition(unseen)\n");
+    EXPECT_EQ(evaluate("(ws.getCurrentComposition() == other, unseen.getNodeValues('Grade'))"),
+              "(True, {'gain': '1'})");
+}
+
 TEST_F(Application, ShowsScriptsWhatIsSelectedInTheBrowserWithTheKeyboard)
 {
     EXPECT_EQ(evaluate("ws.getBrowserSelection()"), "[]");

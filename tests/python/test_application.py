@@ -104,7 +104,7 @@ def test_what_it_cannot_do_without_a_display_it_says_and_ends(tmp_path, argument
     assert (ended, printed) == (status, '') and words in errors
 
 
-@pytest.mark.parametrize('name, words', [('none', 'No such file'), ('bad', 'is no composition: line 3')])
+@pytest.mark.parametrize('name, words', [('none', 'No such file'), ('bad', "bad.vmcomposition': line 3")])
 def test_a_composition_that_cannot_be_opened_is_told_before_the_script_runs(tmp_path, name, words):
     (tmp_path / 'good.vmcomposition').write_text(COMPOSITION)
     (tmp_path / 'bad.vmcomposition').write_text('<composition>\n  <node name="Plate" type="Read">\n</composition>\n')

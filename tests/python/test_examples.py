@@ -14,7 +14,7 @@ import stage
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtTest import QTest
-from PyQt6.QtWidgets import QApplication, QLabel, QLineEdit, QTreeView
+from PyQt6.QtWidgets import QApplication, QComboBox, QLabel, QLineEdit, QTreeView
 
 pytestmark = pytest.mark.usefixtures('no_wait_is_endless')
 
@@ -78,8 +78,16 @@ def test_the_recipe_for_a_text_that_follows_the_values_follows_each_key(patient)
 
 
 @pytest.fixture
-def shots(tmp_path):
-    """The folder of the examples' compositions, copied, opened in the application's own browser, and closed again."""
+def closing():
+    """Closes the compositions that a test leaves open."""
+    yield
+    while ui.Workspace.getNbCompositions():
+        QTest.keyClick(stage.APPLICATION, Qt.Key.Key_W, Qt.KeyboardModifier.ControlModifier)
+
+
+@pytest.fixture
+def shots(tmp_path, closing):
+    """The folder of the examples' compositions, copied, and opened in the application's own browser."""
     field, files = (stage.APPLICATION.findChild(kind, 'Browser.' + name)
                     for kind, name in ((QLineEdit, 'path'), (QTreeView, 'list')))
     for path in sorted((EXAMPLES / 'compositions').iterdir()):
@@ -94,8 +102,6 @@ def shots(tmp_path):
     yield tmp_path
     for shot in ui.Workspace.getCompositions():
         shot.save()  # else somebody would be asked what is to become of changes
-    while ui.Workspace.getNbCompositions():
-        QTest.keyClick(files, Qt.Key.Key_W, Qt.KeyboardModifier.ControlModifier)
 
 
 def words(user):
@@ -103,11 +109,22 @@ def words(user):
 
 
 @pytest.mark.inside
-def test_the_tour_says_that_no_composition_is_open(patient):
+def test_the_tour_opens_the_examples_where_no_composition_is_open(patient, closing):
     read = []
     patient.plan(lambda user: read.extend(words(user)), lambda user: user.close('Cancel'))
     run('tour.py')
-    assert read[0] == 'No composition is open.'
+    assert read == ['No composition is open.', 'Open the examples?'] and ui.Workspace.getNbCompositions() == 0
+
+    def look(user):
+        menu = user.find('Composition', QComboBox)
+        read[:] = [menu.itemText(row) for row in range(menu.count())]
+        user.close('Cancel')
+
+    patient.plan(lambda user: user.close('Open'), look)
+    run('tour.py')
+    assert read == ['1  shot_010', '2  shot_020']
+    assert [shot.getPath() for shot in ui.Workspace.getCompositions()] == [
+        str((EXAMPLES / 'compositions' / name[3:]).with_suffix('.vmcomposition')) for name in read]
 
 
 @pytest.mark.inside

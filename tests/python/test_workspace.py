@@ -1,8 +1,22 @@
-"""The workspace where there is no application."""
+"""The workspace where there is no application, and compositions that scripts read themselves."""
+
+import os
+import pathlib
+import threading
 
 import pytest
 
 from quorvane_velmora import graph, ui
+from scripts import run_script
+
+COMPOSITION = '''<composition version="1">
+  <node name="Grade" type="ColourGrade">
+    <value name="gain" text="1"/>
+    <input name="source" node="Plate"/>
+  </node>
+  <node name="Plate" type="Read"/>
+</composition>
+'''
 
 REFUSED = 'Ui workspace access only available within interactive application.'
 
@@ -29,3 +43,86 @@ def test_scripts_make_no_graphs_and_have_one_exception_for_them():
     with pytest.raises(RuntimeError):
         graph.Graph()
     assert issubclass(graph.GraphError, Exception) and graph.GraphError is not ui.UiError
+
+
+@pytest.mark.standalone
+def test_a_composition_is_read_changed_and_saved_without_a_window(tmp_path):
+    path = tmp_path / 'shot.vmcomposition'
+    path.write_text(COMPOSITION)
+    run_script('''
+import os, sys
+from quorvane_velmora import graph
+os.chdir(os.path.dirname(sys.argv[1]))
+shot = graph.readComposition(path='shot.vmcomposition')
+assert type(shot) is graph.Graph and (shot.getName(), shot.getPath()) == ('shot', os.path.realpath(sys.argv[1]))
+assert shot.isWritable() and shot.getNodes() == ['Grade', 'Plate'] and shot.getNodeInputs('Grade') == {'source': 'Plate'}
+shot.setNodeValue('Grade', 'gain', '2')
+shot.save()
+assert graph.readComposition(shot.getPath()).getNodeValues('Grade') == {'gain': '2'}
+with open('/proc/self/maps') as maps:
+    assert 'libQt' not in maps.read()
+''', str(path))
+    assert path.read_text() == COMPOSITION.replace('"1"/', '"2"/')
+
+
+@pytest.mark.parametrize('text, words', [
+    (None, 'No such file'), ('', 'line 1: there is no element'), ('<graph/>', "line 1: the root element is 'graph'"),
+    (COMPOSITION.replace('"Plate"/', '"None"/'), "line 4: input 'source' refers to node 'None'"),
+    ('<composition version="2"/>', 'a later version of the application has written it'),
+])
+def test_a_file_that_holds_no_composition_is_told_with_its_path(tmp_path, text, words):
+    path = tmp_path / 'shot.vmcomposition'
+    if text is not None:
+        path.write_text(text)
+    with pytest.raises(graph.GraphError) as refused:
+        graph.readComposition(str(path))
+    assert str(path) in str(refused.value) and words in str(refused.value)
+
+
+@pytest.mark.parametrize('no_path, failure', [(None, TypeError), (5, TypeError), ('a\0b', ValueError), ('', graph.GraphError)])
+def test_what_is_no_path_of_a_file_is_not_read(no_path, failure):
+    with pytest.raises(failure):
+        graph.readComposition(no_path)
+
+
+@pytest.mark.parametrize('kind', [os.fsencode, os.fsdecode, pathlib.Path])
+def test_the_path_may_be_bytes_and_no_text(tmp_path, kind):
+    path = os.path.join(tmp_path, 'shot \udcff.vmcomposition')
+    with open(path, 'w') as file:
+        file.write(COMPOSITION)
+    shot = graph.readComposition(kind(path))
+    assert (shot.getName(), shot.getPath()) == ('shot \udcff', os.path.realpath(path))
+
+
+def test_what_cannot_be_written_when_it_is_read_only_reads(tmp_path):
+    path = tmp_path / 'shot.vmcomposition'
+    path.write_text(COMPOSITION)
+    path.chmod(0o444)
+    locked = graph.readComposition(path)
+    path.chmod(0o644)
+    free = graph.readComposition(path)
+    free.setNodeValue('Plate', 'file', 'a.exr')
+    path.write_text(COMPOSITION + '<!-- changed -->')
+    for call, words in ((lambda: locked.setNodeValue('Plate', 'file', 'a.exr'), 'is read-only'), (locked.save, 'is read-only'),
+                        (free.save, 'has been changed on disk since it was opened')):
+        with pytest.raises(graph.GraphError, match=words):
+            call()
+    assert not locked.isWritable() and free.isWritable() and 'changed' in path.read_text()
+
+
+def test_a_composition_is_for_the_thread_of_the_user_interface(tmp_path):
+    path = tmp_path / 'shot.vmcomposition'
+    path.write_text(COMPOSITION)
+    graph.readComposition(path)
+    refused = []
+
+    def read():
+        try:
+            graph.readComposition(path)
+        except graph.GraphError as error:
+            refused.append(str(error))
+
+    thread = threading.Thread(target=read)
+    thread.start()
+    thread.join()
+    assert len(refused) == 1 and 'another thread' in refused[0]

@@ -22,7 +22,7 @@ public:
 
     static unsigned int getNbCompositions();
 
-    /// Makes the composition the current one.
+    /// Makes the composition the current one; one that a script has read becomes one of the workspace.
     static void openComposition(RCShdPtr<ManagedGraph> const& graph);
 
     static bool isCompositionOpened(OsFilePath const& path);

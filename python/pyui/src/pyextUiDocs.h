@@ -368,12 +368,16 @@ constexpr char const* getNbCompositions =
 @raise UiError: If this method is not used within the embedded interpreter.)";
 
 constexpr char const* openComposition =
-    R"(Opens the given composition in the Velmora UI workspace.
+    R"(Opens the given composition in the Velmora UI workspace. It becomes the current one. One that
+C{graph.readComposition} has read belongs to the workspace from then on, changes included, and stays open without the
+C{Graph}. If its file is open already, the composition that is open becomes the current one instead, and the C{Graph}
+keeps its own.
 
 @param path: Composition to open.
 @type path: L{Graph}
 @raise UiError: If this method is not used within the embedded interpreter.
-@raise RuntimeError: If the composition has been closed.)";
+@raise RuntimeError: If the composition has been closed, or if its file is open already and the C{Graph} has changes that
+are not saved. Nothing has changed then.)";
 
 constexpr char const* isCompositionOpened =
     R"(Indicates whether the composition at the specified path is currently opened in the Velmora UI workspace.
