@@ -9,13 +9,11 @@
 #include "base/rcStrongPtr.h"
 #include "kvPyextUiExport.h"
 #include "pyCallables.h"
-#include "pyErrorAside.h"
 #include "pyWidgetCbs.h"
 #include "ui/uiContainer.h"
 #include "ui/uiEventCallback.h"
 #include "ui/uiTopLevel.h"
 
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -147,8 +145,6 @@ private:
 
     KVPYEXTUI_LOCAL static std::string const _closeButtonClickedKey;
 
-    /// Filled by the destructor, and the last to go.
-    std::optional<ErrorAside> _errorAside;
     std::string _xml;
     std::string _title;
     int _width;
