@@ -38,6 +38,11 @@ public:
     /// Throws a captured exception on, with the interpreter's error back in place.
     [[noreturn]] virtual void rethrow(std::exception_ptr const& error) = 0;
 
+    /// Takes the error that is set off the interpreter, for `putErrorBack`. Null where there is none, or no interpreter
+    /// in this thread.
+    virtual std::exception_ptr takeError() noexcept = 0;
+    virtual void putErrorBack(std::exception_ptr const& error) noexcept = 0;
+
     /// `later` came while `first` was still on its way out: keeps it visible to the script's author.
     virtual void addContext(std::exception_ptr const& first, std::exception_ptr const& later) noexcept = 0;
 

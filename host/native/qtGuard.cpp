@@ -55,6 +55,14 @@ void print(std::exception_ptr const& error) noexcept
 
 } // namespace
 
+QtErrorAside::QtErrorAside() : _error(QtGuard::getInstance().takeError()) {}
+
+QtErrorAside::~QtErrorAside()
+{
+    if (_error)
+        QtGuard::getInstance().putErrorBack(_error);
+}
+
 QtGuard& QtGuard::getInstance()
 {
     // Never destroyed: peers go as late as the last objects of the interpreter do.
@@ -102,6 +110,17 @@ void QtGuard::rethrow(std::exception_ptr const& error) const
     std::rethrow_exception(error);
 }
 
+std::exception_ptr QtGuard::takeError() const noexcept
+{
+    return _hook ? _hook->takeError() : nullptr;
+}
+
+void QtGuard::putErrorBack(std::exception_ptr const& error) const noexcept
+{
+    if (_hook)
+        _hook->putErrorBack(error);
+}
+
 void QtGuard::addContext(std::exception_ptr const& first, std::exception_ptr const& later) const noexcept
 {
     if (_hook)
@@ -117,6 +136,7 @@ QtGuard::Moment QtGuard::getMoment() const
 
 void QtGuard::destroy(QWidget* widget)
 {
+    QtErrorAside const aside;
     // Without its application a widget can no longer be touched.
     if (!widget || !QCoreApplication::instance())
         return;

@@ -14,6 +14,20 @@ namespace Kv
 
 class QtLoop;
 
+/// Keeps the interpreter's error, which is on its way out, off the interpreter for as long as this lives. To be held
+/// where windows go or come back: Qt tells others of it, and those may run Python code.
+class QtErrorAside
+{
+public:
+    QtErrorAside();
+    QtErrorAside(QtErrorAside const&) = delete;
+    QtErrorAside& operator=(QtErrorAside const&) = delete;
+    ~QtErrorAside();
+
+private:
+    std::exception_ptr _error;
+};
+
 /// The one place where the toolkit calls into the host. Takes the interpreter for the call, and keeps what a handler
 /// throws from the toolkit's frames: the innermost local loop ends and carries it out. Owns nothing but the
 /// widgets that cannot go yet since the toolkit may be in the middle of one of their events.
@@ -36,6 +50,10 @@ public:
 
     /// Throws on what a loop has carried out.
     [[noreturn]] void rethrow(std::exception_ptr const& error) const;
+
+    /// Takes the interpreter's error off it, and puts it back. Null where there is none.
+    std::exception_ptr takeError() const noexcept;
+    void putErrorBack(std::exception_ptr const& error) const noexcept;
 
     /// `later` came while `first` was on its way out.
     void addContext(std::exception_ptr const& first, std::exception_ptr const& later) const noexcept;

@@ -1,6 +1,7 @@
 #include "native/qtMainWindow.h"
 
 #include "native/floatWidget.h"
+#include "native/qtGuard.h"
 #include "native/qtInputDrop.h"
 
 #include <QApplication>
@@ -65,6 +66,7 @@ void QtMainWindow::refuseInput()
 
 void QtMainWindow::admitInput()
 {
+    QtErrorAside const aside;
     QPointer<QWidget> const holder = _holders.back();
     if (_content.getNative() && _holders.size() == 1)
         _enableOwn(true);

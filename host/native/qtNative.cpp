@@ -65,12 +65,14 @@ void QtNative::setCell(int x, int y, int width, int height) const
 
 void QtNative::setDisplayed(bool displayed) const
 {
+    QtErrorAside const aside;
     if (QWidget* const widget = get())
         widget->setVisible(displayed);
 }
 
 void QtNative::setEnabled(bool enabled) const
 {
+    QtErrorAside const aside;
     if (QWidget* const widget = get())
         widget->setEnabled(enabled);
 }

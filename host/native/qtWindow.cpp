@@ -1,5 +1,6 @@
 #include "native/qtWindow.h"
 
+#include "native/qtGuard.h"
 #include "native/qtInputDrop.h"
 #include "native/qtText.h"
 #include "native/windowWidget.h"
@@ -88,6 +89,7 @@ void QtWindow::show()
 
 void QtWindow::hide()
 {
+    QtErrorAside const aside;
     QWidget* const native = _native.get();
     if (!native || native->isHidden())
         return;

@@ -35,7 +35,8 @@ public:
         }
         catch (boost::python::error_already_set const&)
         {
-            return PyErr_Occurred() ? std::make_exception_ptr(PythonError::fetch()) : std::current_exception();
+            std::exception_ptr const error = takeError();
+            return error ? error : std::current_exception();
         }
         catch (...)
         {
@@ -54,6 +55,18 @@ public:
             pythonError.restore();
             throw boost::python::error_already_set();
         }
+    }
+
+    std::exception_ptr takeError() noexcept override
+    {
+        bool const isHeld = PyGILState_GetThisThreadState() && PyGILState_Check() == 1;
+        return isHeld && PyErr_Occurred() ? std::make_exception_ptr(PythonError::fetch()) : nullptr;
+    }
+
+    void putErrorBack(std::exception_ptr const& error) noexcept override
+    {
+        if (std::optional<PythonError> const pythonError = find(error))
+            pythonError->restore();
     }
 
     void addContext(std::exception_ptr const& first, std::exception_ptr const& later) noexcept override

@@ -9,9 +9,9 @@ import pytest
 import stage
 from callback_tools import listen, make_dialog
 from quorvane_velmora import ui
-from PyQt6.QtCore import QEventLoop, QTimer, Qt
+from PyQt6.QtCore import QEventLoop, QObject, QTimer, Qt
 from PyQt6.QtTest import QTest
-from PyQt6.QtWidgets import QApplication, QPushButton
+from PyQt6.QtWidgets import QApplication, QPushButton, QWidget
 
 pytestmark = [pytest.mark.screen, pytest.mark.usefixtures('no_wait_is_endless')]
 
@@ -278,23 +278,63 @@ def test_the_last_reference_to_a_dialog_with_a_left_window_goes_while_its_other_
     assert heard == ['first'] and not held
 
 
-@pytest.mark.standalone
-def test_an_exception_survives_what_others_do_when_the_windows_go(user):
-    exception = ValueError('of the script')
-    changes = []
-    application = QApplication.instance()
-    application.focusChanged.connect(changes.append)
-    callback = raising(exception)
+class Intruder(QObject):
+    """Runs Python code, which fails, for whatever the toolkit does to anybody."""
 
-    def launch():
-        dialog = make_dialog()
-        dialog.addCallback('Button', ACTIVATE, callback)
-        user.plan(click('Button'))
-        dialog.launch()
+    def __init__(self):
+        super().__init__()
+        self.calls = 0
+
+    def fail(self, *_):
+        self.calls += 1
+        raise OSError('of others')
+
+    def eventFilter(self, *_):
+        self.fail()
+
+
+def run_dialog(user, callback):
+    held = [make_dialog()]
+    held[0].addCallback('Button', ACTIVATE, callback)
+    user.plan(click('Button'))
+    held.pop().launch()  # goes with the exception
+
+
+def run_browser(user, callback):
+    user.plan(click('OK'))
+    ui.showBrowser('Pick', '/', callback)
+
+
+def build_with_a_bad_value(_, callback):
+    class State(int):
+        def __bool__(self):
+            callback()
+
+    ui.showSimpleDialog('t', [('ToggleButton', 'Toggle')], 400, False, {'Toggle': State()})
+
+
+@pytest.mark.parametrize('exception', [KeyError('of the script'), SystemExit(3)], ids=lambda error: type(error).__name__)
+@pytest.mark.parametrize('run', [run_dialog, *[pytest.param(run, marks=pytest.mark.inside)
+                                               for run in (run_browser, build_with_a_bad_value)]])
+def test_an_exception_survives_what_others_do_when_the_windows_go(user, monkeypatch, run, exception):
+    monkeypatch.setattr(sys, 'excepthook', lambda *_: None)
+    application, intruder = QApplication.instance(), Intruder()
+    application.focusChanged.connect(intruder.fail)
+
+    def callback(*given):
+        del given  # which the traceback would keep
+        for widget in [one for dialog in stage.dialogs() for one in dialog.findChildren(QWidget)]:
+            widget.destroyed.connect(intruder.fail)
+        application.installEventFilter(intruder)
+        intruder.calls = 0
+        raise exception
 
     try:
-        with pytest.raises(ValueError) as caught:
-            launch()
+        with pytest.raises(type(exception)) as caught:
+            run(user, callback)
     finally:
-        application.focusChanged.disconnect(changes.append)
-    assert caught.value is exception and changes
+        application.removeEventFilter(intruder)
+        application.focusChanged.disconnect(intruder.fail)
+    assert caught.value is exception and functions(exception)[-1] == 'callback'
+    exception.__traceback__ = None
+    assert intruder.calls

@@ -135,6 +135,26 @@ def test_a_text_ends_at_its_first_zero_byte_and_a_number_at_32_bits(write):
         write(dialog, 'Prize', ([], 2 ** 31))
 
 
+class Unsure(int):
+    def __bool__(self):
+        raise KeyError('of the script')
+
+
+@pytest.mark.parametrize('take', [
+    lambda dialog: dialog.setValue('Win', Unsure()), lambda dialog: dialog.setValue('Win', True, Unsure()),
+    lambda dialog: dialog.setValues({'Win': Unsure()}), lambda dialog: dialog.displayWidget('Win', Unsure()),
+    lambda dialog: dialog.enableWidget('Win', Unsure()), lambda _: make({'Win': Unsure()}),
+    lambda _: ui.makeXmlFromWidgetList([('ToggleButton', 'Win', '', Unsure())])])
+def test_a_truth_that_raises_is_refused_with_its_own_error_and_changes_nothing(take):
+    dialog = make()
+    dialog.hideWidget('Win')
+    dialog.enableWidget('Win', False)
+    with pytest.raises(KeyError, match='of the script'):
+        take(dialog)
+    assert dialog.getValues() == START
+    assert not dialog.isDisplayed('Win') and not dialog.isEnabled('Win')
+
+
 def test_many_values_are_written_from_top_to_bottom_up_to_the_first_refused():
     dialog = make(widgets=[('TextField', name) for name in 'abc'])
     with pytest.raises(TypeError):

@@ -126,7 +126,6 @@ Dialog::Dialog(std::string const& title, std::string const& xmlString, int width
 
 Dialog::~Dialog()
 {
-    _errorAside.emplace();
     _container->hide();
     _container->clearParent();
     WidgetCbs::releaseAll(_callbacks);

@@ -9,13 +9,11 @@
 #include "base/rcShdPtr.h"
 #include "base/rcStrongPtr.h"
 #include "pyCallables.h"
-#include "pyErrorAside.h"
 #include "pyWidgetCbs.h"
 #include "ui/uiContainer.h"
 #include "ui/uiEventCallback.h"
 #include "ui/uiTopLevel.h"
 
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -148,8 +146,6 @@ private:
 
     KV_LOCAL static std::string const _closeButtonClickedKey;
 
-    /// Filled by the destructor, and the last to go.
-    std::optional<ErrorAside> _errorAside;
     std::string _xml;
     std::string _title;
     int _width;
