@@ -29,7 +29,7 @@ def active():
     """The dialog that takes input while the rest does not; None if there is none."""
     if not APPLICATION:
         return QApplication.activeModalWidget()
-    if APPLICATION.menuBar().isEnabled():
+    if APPLICATION.findChild(QWidget, 'browserPlace').isEnabled():
         return None
     return next((dialog for dialog in reversed(floating()) if dialog.isEnabled()), None)
 

@@ -341,7 +341,7 @@ def test_a_script_that_is_picked_with_keys_alone_learns_what_is_selected(desk, t
         ''')
 
     def run_script():
-        desk.run('key', 'alt+f', 'r', 'ctrl+l')
+        desk.run('key', 'alt+s', 'r', 'ctrl+l')
         desk.run('type', str(tmp_path / 'look.py'))
         desk.run('key', 'Return', 'Tab', 'space')  # the list, OK
         return application.stdout.readline()
