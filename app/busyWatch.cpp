@@ -3,14 +3,16 @@
 #include "stopWindow.h"
 
 #include <QGuiApplication>
-#include <QProcess>
 
 #include <algorithm>
 #include <array>
 #include <csignal>
 #include <fcntl.h>
 #include <poll.h>
+#include <string_view>
 #include <sys/socket.h>
+#include <sys/syscall.h>
+#include <sys/wait.h>
 #include <unistd.h>
 #include <utility>
 
@@ -35,6 +37,44 @@ constexpr milliseconds longestTurn(1000);
 
 /// How often the loop has to come around for the window to answer again.
 constexpr int calmTurns = 8;
+
+/// As the system takes them; null comes last.
+std::vector<char*> getPointers(std::vector<std::string>& words)
+{
+    std::vector<char*> pointers;
+    for (std::string& word : words)
+        pointers.push_back(word.data());
+    pointers.push_back(nullptr);
+    return pointers;
+}
+
+/// This program, with another command line.
+[[noreturn]] void become(std::vector<char*> const& command, std::vector<char*> const& environment, int input)
+{
+    // Ctrl-C in the terminal is for the application.
+    setsid();
+    int const nowhere = open("/dev/null", O_RDWR);
+    dup2(input, STDIN_FILENO);
+    dup2(nowhere, STDOUT_FILENO);
+    dup2(nowhere, STDERR_FILENO);
+    sigset_t none;
+    sigemptyset(&none);
+    sigprocmask(SIG_SETMASK, &none, nullptr);
+    execve("/proc/self/exe", command.data(), environment.data());
+    _exit(1);
+}
+
+/// As it is before scripts change it, with the platform that is in use.
+std::vector<std::string> makeEnvironment()
+{
+    std::string const platform = "QT_QPA_PLATFORM=";
+    std::vector<std::string> variables;
+    for (char** variable = environ; *variable; ++variable)
+        if (std::string_view(*variable).substr(0, platform.size()) != platform)
+            variables.emplace_back(*variable);
+    variables.push_back(platform + QGuiApplication::platformName().toStdString());
+    return variables;
+}
 
 /// Signals of the process are for the window's thread, where they interrupt what blocks.
 sigset_t blockSignals()
@@ -76,10 +116,9 @@ private:
 };
 
 BusyWatch::BusyWatch(std::function<bool()> isBusy, std::function<void()> stop)
-    : _isBusy(std::move(isBusy)), _stop(std::move(stop)), _environment(QProcessEnvironment::systemEnvironment()),
+    : _isBusy(std::move(isBusy)), _stop(std::move(stop)), _environment(makeEnvironment()),
       _turned(Clock::now().time_since_epoch().count()), _process(getpid())
 {
-    _environment.insert(QStringLiteral("QT_QPA_PLATFORM"), QGuiApplication::platformName());
     sigset_t const former = blockSignals();
     _thread = std::thread([this] { watch(); });
     pthread_sigmask(SIG_SETMASK, &former, nullptr);
@@ -105,6 +144,7 @@ void BusyWatch::setOffer(Offer const& offer)
 {
     std::lock_guard<std::mutex> const lock(_mutex);
     _offer = offer;
+    ++_offers;
 }
 
 void BusyWatch::turn()
@@ -132,17 +172,18 @@ milliseconds BusyWatch::getSilence() const
     return std::chrono::duration_cast<milliseconds>(Clock::now() - turned);
 }
 
-bool BusyWatch::isWanted() const
+bool BusyWatch::isWanted(int offer) const
 {
-    return getSilence() > longestTurn || (_turns < calmTurns && _isBusy());
+    return _offers == offer && (getSilence() > longestTurn || (_turns < calmTurns && _isBusy()));
 }
 
 void BusyWatch::offerStop()
 {
+    int const offer = _offers;
     Connection connection;
     start(connection);
     pollfd answer{connection.getOwn(), POLLIN, 0};
-    while (!waitFor(milliseconds(0)) && isWanted())
+    while (!waitFor(milliseconds(0)) && isWanted(offer))
     {
         char said = 0;
         if (poll(&answer, 1, static_cast<int>(glance.count())) <= 0)
@@ -153,7 +194,7 @@ void BusyWatch::offerStop()
             continue;
         }
         auto const end = Clock::now() + respite;
-        while (Clock::now() < end && isWanted() && !waitFor(glance))
+        while (Clock::now() < end && isWanted(offer) && !waitFor(glance))
         {
         }
         return;
@@ -162,25 +203,25 @@ void BusyWatch::offerStop()
 
 void BusyWatch::start(Connection& connection)
 {
-    QProcess window;
-    window.setProgram(QStringLiteral("/proc/self/exe"));
+    std::vector<std::string> words;
     {
         std::lock_guard<std::mutex> const lock(_mutex);
-        window.setArguments(StopWindow::makeArguments(_offer));
+        words = StopWindow::makeCommand(_offer);
     }
-    window.setProcessEnvironment(_environment);
-    window.setStandardOutputFile(QProcess::nullDevice());
-    window.setStandardErrorFile(QProcess::nullDevice());
-    window.setChildProcessModifier(
-        [end = connection.getOther()]
-        {
-            dup2(end, STDIN_FILENO);
-            sigset_t none;
-            sigemptyset(&none);
-            pthread_sigmask(SIG_SETMASK, &none, nullptr);
-        });
-    // No child of this process, which a script may wait for.
-    window.startDetached();
+    std::vector<char*> const command = getPointers(words);
+    std::vector<char*> const environment = getPointers(_environment);
+    // Neither the process between nor that of the window can be met by a script that waits for any child of its own: the
+    // one ends without a signal, the other is no child. Between here and the program only what is safe in a copy of a
+    // process with several threads is called.
+    auto const between = static_cast<pid_t>(syscall(SYS_clone, 0, nullptr, nullptr, nullptr, nullptr));
+    if (between == 0)
+    {
+        if (_Fork() == 0)
+            become(command, environment, connection.getOther());
+        _exit(0);
+    }
+    if (between > 0)
+        waitpid(between, nullptr, __WCLONE);
     connection.closeOther();
 }
 

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <QPoint>
-#include <QProcessEnvironment>
 
 #include <atomic>
 #include <chrono>
@@ -10,6 +9,7 @@
 #include <mutex>
 #include <string>
 #include <thread>
+#include <vector>
 
 #include <sys/types.h>
 
@@ -36,6 +36,7 @@ public:
     BusyWatch& operator=(BusyWatch const&) = delete;
     ~BusyWatch();
 
+    /// To be called when a script begins: the window for another one goes.
     void setOffer(Offer const& offer);
 
     /// The loop of the window's thread has come around.
@@ -49,14 +50,14 @@ private:
     /// True at the end of the watch.
     bool waitFor(std::chrono::milliseconds time);
     std::chrono::milliseconds getSilence() const;
-    bool isWanted() const;
+    bool isWanted(int offer) const;
     /// Blocks for as long as the window is wanted.
     void offerStop();
     void start(Connection& connection);
 
     std::function<bool()> _isBusy;
     std::function<void()> _stop;
-    QProcessEnvironment _environment;
+    std::vector<std::string> _environment;
     std::atomic<Clock::rep> _turned;
     /// How often the loop has come around since it did not for a while.
     std::atomic<int> _turns{0};
@@ -64,6 +65,7 @@ private:
     std::mutex _mutex;
     std::condition_variable _changed;
     Offer _offer;
+    std::atomic<int> _offers{0};
     bool _ending = false;
     std::thread _thread;
 };

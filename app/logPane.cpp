@@ -24,8 +24,10 @@ namespace Velmora
 namespace
 {
 
-/// How long what is printed may stay unseen while the window's thread is busy, in milliseconds.
-constexpr int patience = 200;
+/// What of a script's time its output may take to be seen at once, and how much of that can be saved up, in nanoseconds.
+constexpr qint64 shareOfTime = 5;
+constexpr qint64 maxCredit = 60'000'000;
+
 constexpr int timeAir = 8;
 
 /// What is kept of a line beside its text.
@@ -231,6 +233,7 @@ LogPane::LogPane(QWidget* parent, ScriptOutput& output)
     : QWidget(parent), _output(output), _view(new LogView), _wanted(new QLineEdit), _found(new QLabel)
 {
     layOut();
+    _sinceCredit.start();
     connect(_wanted, &QLineEdit::textChanged, this,
             [this]
             {
@@ -316,21 +319,27 @@ QAbstractButton* LogPane::makeButton(QString const& text, QString const& tip, vo
 
 void LogPane::onPrinted()
 {
-    bool const isOwn = QThread::currentThread() == thread();
-    if (!isOwn || (_shown.isValid() && !_shown.hasExpired(patience)) || !isVisible() || isPainting(*window()))
+    if (QThread::currentThread() == thread() && isVisible() && !isPainting(*window()) && hasCredit())
     {
-        QMetaObject::invokeMethod(
-            this, [this] { showNew(); }, Qt::QueuedConnection);
+        showNew();
+        repaint();
+        _credit -= _sinceCredit.nsecsElapsed();
         return;
     }
-    showNew();
-    repaint();
+    QMetaObject::invokeMethod(
+        this, [this] { showNew(); }, Qt::QueuedConnection);
+}
+
+bool LogPane::hasCredit()
+{
+    _credit = std::min(maxCredit, _credit + _sinceCredit.nsecsElapsed() / shareOfTime);
+    _sinceCredit.start();
+    return _credit > 0;
 }
 
 void LogPane::showNew()
 {
     _view->append(_output.take());
-    _shown.start();
 }
 
 void LogPane::copy()

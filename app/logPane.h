@@ -40,6 +40,8 @@ private:
     void layOut();
     QAbstractButton* makeButton(QString const& text, QString const& tip, void (LogPane::*run)());
     void onPrinted();
+    /// Whether what is printed can be shown before the loop comes around.
+    bool hasCredit();
     void showNew();
     void copy();
     void clear();
@@ -50,7 +52,8 @@ private:
     QLineEdit* _wanted;
     QLabel* _found;
     std::vector<QWidget*> _tools;
-    QElapsedTimer _shown;
+    qint64 _credit = 0;
+    QElapsedTimer _sinceCredit;
 };
 
 } // namespace Velmora

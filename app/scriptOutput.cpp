@@ -16,7 +16,7 @@ namespace
 using Kind = LogLine::Kind;
 
 /// How long lines may wait before they are told of again.
-constexpr std::chrono::milliseconds patience(200);
+constexpr std::chrono::milliseconds patience(50);
 
 /// In bytes. A longer line is cut into several.
 constexpr std::size_t maxLine = 4000;

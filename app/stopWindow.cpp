@@ -69,10 +69,10 @@ void fill(QDialog& window, QString const& script)
 
 } // namespace
 
-QStringList makeArguments(BusyWatch::Offer const& offer)
+std::vector<std::string> makeCommand(BusyWatch::Offer const& offer)
 {
-    return {QString::fromLatin1(option), QString::fromStdString(offer.script), QString::number(offer.middle.x()),
-            QString::number(offer.middle.y()), QString::number(offer.window)};
+    return {"velmora", option, offer.script, std::to_string(offer.middle.x()), std::to_string(offer.middle.y()),
+            std::to_string(offer.window)};
 }
 
 bool isWanted(int argc, char** argv)

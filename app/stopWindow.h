@@ -2,7 +2,8 @@
 
 #include "busyWatch.h"
 
-#include <QStringList>
+#include <string>
+#include <vector>
 
 namespace Velmora
 {
@@ -12,8 +13,8 @@ namespace Velmora
 namespace StopWindow
 {
 
-/// What the process is started with. Its standard input is the connection to the application.
-QStringList makeArguments(BusyWatch::Offer const& offer);
+/// The command line of the process. Its standard input is the connection to the application.
+std::vector<std::string> makeCommand(BusyWatch::Offer const& offer);
 
 /// Whether that is what the process was started for.
 bool isWanted(int argc, char** argv);
