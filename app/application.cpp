@@ -244,7 +244,7 @@ void Application::loadFocused(Kv::EvEvent&)
 void Application::runFocused(Kv::EvEvent&)
 {
     std::filesystem::path const path = _browser->getInputFocusPath().toString();
-    if (path.extension() == ".py")
+    if (Kv::BrBrowser::isScript(path.filename()))
         startScript(ScriptCall::makeFile(path, {}), false);
     else
         _window.tell(QObject::tr("%1 is neither a composition nor a script").arg(toText(path.filename())));

@@ -27,7 +27,8 @@ namespace Velmora
 class Application final : private Kv::UiCompositionWorkspaceListener
 {
 public:
-    /// Throws `Kv::ExBase` with words where windows cannot be shown. What is remembered of former runs is used only where this one is remembered too.
+    /// Throws `Kv::ExBase` with words where windows cannot be shown. What is remembered of former runs is used only
+    /// where this one is remembered too.
     explicit Application(bool remembers);
     ~Application() override;
 

@@ -210,9 +210,9 @@ void BusyWatch::start(Connection& connection)
     }
     std::vector<char*> const command = getPointers(words);
     std::vector<char*> const environment = getPointers(_environment);
-    // Neither the process between nor that of the window can be met by a script that waits for any child of its own: the
-    // one ends without a signal, the other is no child. Between here and the program only what is safe in a copy of a
-    // process with several threads is called.
+    // Neither the process between nor that of the window can be met by a script that waits for any child of its own:
+    // the one ends without a signal, the other is no child. Between here and the program only what is safe in a copy of
+    // a process with several threads is called.
     auto const between = static_cast<pid_t>(syscall(SYS_clone, 0, nullptr, nullptr, nullptr, nullptr));
     if (between == 0)
     {

@@ -323,8 +323,8 @@ void Interpreter::stop() const
 bool Interpreter::isRunning() const
 {
     InterpreterHold const hold;
-    bp::handle<> const frame(bp::allow_null(
-        reinterpret_cast<PyObject*>(PyThreadState_GetFrame(static_cast<PyThreadState*>(_threadState)))));
+    bp::handle<> const frame(
+        bp::allow_null(reinterpret_cast<PyObject*>(PyThreadState_GetFrame(static_cast<PyThreadState*>(_threadState)))));
     return frame.get();
 }
 

@@ -24,7 +24,8 @@ namespace Velmora
 namespace
 {
 
-/// What of a script's time its output may take to be seen at once, and how much of that can be saved up, in nanoseconds.
+/// What of a script's time its output may take to be seen at once, and how much of that can be saved up, in
+/// nanoseconds.
 constexpr qint64 shareOfTime = 5;
 constexpr qint64 maxCredit = 60'000'000;
 
@@ -84,7 +85,8 @@ public:
         connect(this, &QPlainTextEdit::updateRequest, _margin, [this] { _margin->update(); });
         QScrollBar* const bar = verticalScrollBar();
         connect(bar, &QScrollBar::valueChanged, this, [this, bar] { _follows = bar->value() == bar->maximum(); });
-        connect(bar, &QScrollBar::rangeChanged, this, [this, bar] { bar->setValue(_follows ? bar->maximum() : bar->value()); });
+        connect(bar, &QScrollBar::rangeChanged, this,
+                [this, bar] { bar->setValue(_follows ? bar->maximum() : bar->value()); });
     }
 
     void setUsable(bool usable)

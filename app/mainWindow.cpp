@@ -234,8 +234,8 @@ void MainWindow::makeScriptMenu()
 {
     QMenu& scripts = *menuBar()->addMenu(tr("&Script"));
     _own->addAction(addCommand(scripts, tr("&Run Script…"), QKeySequence(tr("Ctrl+R")), _commands.runScript));
-    _runAgain = addCommand(scripts, tr("Run Script &Again"), QKeySequence(tr("Ctrl+Shift+R")),
-                           _commands.runScriptAgain);
+    _runAgain =
+        addCommand(scripts, tr("Run Script &Again"), QKeySequence(tr("Ctrl+Shift+R")), _commands.runScriptAgain);
     _runAgain->setEnabled(false);
     _own->addAction(_runAgain);
     QMenu& recent = *scripts.addMenu(tr("R&ecent Scripts"));
@@ -296,7 +296,8 @@ void MainWindow::showRecentScripts(QMenu& menu)
     for (std::string const& path : scripts)
     {
         QFileInfo const file(QString::fromStdString(path));
-        QString const folder = fontMetrics().elidedText(QDir::toNativeSeparators(file.path()), Qt::ElideMiddle, menuWidth);
+        QString const folder =
+            fontMetrics().elidedText(QDir::toNativeSeparators(file.path()), Qt::ElideMiddle, menuWidth);
         QString text = file.fileName() + QStringLiteral("    ") + folder;
         text.replace(QLatin1Char('&'), QLatin1String("&&"));
         addCommand(menu, QStringLiteral("&%1  %2").arg(++place % 10).arg(text), {},

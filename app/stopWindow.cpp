@@ -71,7 +71,11 @@ void fill(QDialog& window, QString const& script)
 
 std::vector<std::string> makeCommand(BusyWatch::Offer const& offer)
 {
-    return {"velmora", option, offer.script, std::to_string(offer.middle.x()), std::to_string(offer.middle.y()),
+    return {"velmora",
+            option,
+            offer.script,
+            std::to_string(offer.middle.x()),
+            std::to_string(offer.middle.y()),
             std::to_string(offer.window)};
 }
 
@@ -91,7 +95,8 @@ int run(char** argv)
     window.setWindowTitle(QObject::tr("Script Is Busy"));
     fill(window, QString::fromUtf8(argv[2]));
     QSize const size = window.sizeHint();
-    window.setGeometry(QRect(QPoint(std::stoi(argv[3]), std::stoi(argv[4])) - QPoint(size.width(), size.height()) / 2, size));
+    window.setGeometry(
+        QRect(QPoint(std::stoi(argv[3]), std::stoi(argv[4])) - QPoint(size.width(), size.height()) / 2, size));
     // What is typed for another window must not stop anything.
     window.setAttribute(Qt::WA_ShowWithoutActivating);
     window.winId();

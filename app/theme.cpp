@@ -23,7 +23,8 @@ public:
                        QWidget const* widget) const override
     {
         QProxyStyle::drawPrimitive(element, option, painter, widget);
-        if (element != PE_Frame || !(option->state & State_HasFocus) || !qobject_cast<QAbstractScrollArea const*>(widget))
+        if (element != PE_Frame || !(option->state & State_HasFocus) ||
+            !qobject_cast<QAbstractScrollArea const*>(widget))
             return;
         painter->save();
         painter->setPen(option->palette.color(QPalette::Active, QPalette::Highlight));
