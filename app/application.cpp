@@ -114,7 +114,11 @@ Commands Application::makeCommands()
     commands.getRecentScripts = [this] { return _settings.getScripts(); };
     commands.runRecentScript = [this](std::string const& path) { runRecentScript(path); };
     commands.forgetRecentScripts = [this] { _settings.clearScripts(); };
-    commands.stopScript = [this] { stopScript(); };
+    commands.stopScript = [this]
+    {
+        stopScript();
+        Kv::WsNative::getPlatform().interruptLoop();
+    };
     commands.goToBrowser = [this] { _hostWindow->getRootContainer()->setFocusWidget(_browser); };
     commands.showBuildInfo = [this] { showBuildInfo(); };
     commands.makeCurrent = [this](int place) { makeCurrent(place); };

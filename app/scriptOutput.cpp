@@ -34,8 +34,9 @@ def tap(name, feed):
 
     class Tapped(base):
         def write(self, data):
+            count = base.write(self, data)
             feed(data)
-            return base.write(self, data)
+            return count
 
     encoding, errors, lineBuffering, mode = stream.encoding, stream.errors, stream.line_buffering, stream.mode
     buffer = stream.detach()
