@@ -32,6 +32,19 @@ QString toText(std::string const& bytes)
     return QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()));
 }
 
+/// Whether somebody looks at the windows.
+bool hasScreen()
+{
+    QString const name = QGuiApplication::platformName();
+    return name != QLatin1String("offscreen") && name != QLatin1String("minimal");
+}
+
+/// By which other processes know a window; 0 where they cannot.
+quint64 getWindowNumber(QWidget const& window)
+{
+    return QGuiApplication::platformName() == QLatin1String("xcb") ? window.winId() : 0;
+}
+
 Kv::UiConstraint makeFilling()
 {
     using Kv::UiConstraint;
@@ -44,9 +57,12 @@ Kv::UiConstraint makeFilling()
 
 } // namespace
 
-Application::Application()
-    : _window(makeCommands()), _loadCb(this, &Application::loadFocused), _fileCb(this, &Application::refuseFocused)
+Application::Application(bool remembers)
+    : _settings(remembers), _window(makeCommands(), _output), _loadCb(this, &Application::loadFocused),
+      _fileCb(this, &Application::runFocused)
 {
+    _interpreter.attempt([this] { _output.tapStreams(); });
+    _window.restoreLook(_settings);
     makeHost();
     _showTimer.setSingleShot(true);
     QObject::connect(&_showTimer, &QTimer::timeout, &_window, [this] { showCompositions(); });
@@ -56,6 +72,7 @@ Application::Application()
 
 Application::~Application()
 {
+    _watch.reset();
     // Scripts leave dialogs in the window.
     _interpreter.finish(0);
     _workspace->setListener(nullptr);
@@ -75,8 +92,12 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
     if (script)
         startScript(*script, exit);
     _signalTimer.start(signalInterval);
+    if (hasScreen())
+        _watch.emplace([this] { return _scriptRuns || _interpreter.isRunning(); }, [this] { stopScript(); });
     int const status = QApplication::exec();
+    _watch.reset();
     _signalTimer.stop();
+    _window.saveLook(_settings);
     // What scripts have left for their end can open no dialog any more: nobody would see it.
     Kv::WsNative::getPlatform().closeLoops();
     return _interpreter.finish(status);
@@ -90,6 +111,15 @@ Commands Application::makeCommands()
     commands.closeComposition = [this] { closeComposition(); };
     commands.runScript = [this] { askScript(); };
     commands.runScriptAgain = [this] { startScript(*_lastScript, false); };
+    commands.getRecentScripts = [this] { return _settings.getScripts(); };
+    commands.runRecentScript = [this](std::string const& path) { runRecentScript(path); };
+    commands.forgetRecentScripts = [this] { _settings.clearScripts(); };
+    commands.stopScript = [this]
+    {
+        stopScript();
+        Kv::WsNative::getPlatform().interruptLoop();
+    };
+    commands.goToBrowser = [this] { _hostWindow->getRootContainer()->setFocusWidget(_browser); };
     commands.showBuildInfo = [this] { showBuildInfo(); };
     commands.makeCurrent = [this](int place) { makeCurrent(place); };
     commands.step = [this](int places) { step(places); };
@@ -141,31 +171,58 @@ int Application::runScript(ScriptCall const& script)
     }
     _scriptRuns = true;
     _lastScript = script;
+    if (script.kind == ScriptCall::Kind::File)
+        _settings.addScript(script.target);
     QString const name = QFileInfo(toText(script.target)).fileName();
+    if (_watch)
+        _watch->setOffer({name.toStdString(), _window.frameGeometry().center(), getWindowNumber(_window)});
+    _window.setRunning(true);
     _window.tell(QObject::tr("%1 is running").arg(name));
+    _window.note(QObject::tr("%1 is running").arg(name));
     _window.paintNow();
     int const status = _interpreter.run(script);
     _scriptRuns = false;
-    _window.setRunAgainEnabled(true);
+    checkSignals();
+    _window.setRunning(false);
     std::string const& failure = _interpreter.getFailure();
+    QString outcome = QObject::tr("%1 has ended").arg(name);
     if (!failure.empty())
-        _window.tell(QObject::tr("%1 has failed: %2").arg(name, toText(failure).simplified()));
-    else
-        _window.tell(QObject::tr("%1 has ended").arg(name));
+        outcome = status == interruptedStatus
+                      ? QObject::tr("%1 was stopped").arg(name)
+                      : QObject::tr("%1 has failed: %2").arg(name, toText(failure).simplified());
+    _window.tell(outcome);
+    _window.note(outcome);
     return status;
 }
 
 void Application::checkSignals()
 {
+    if (_watch)
+        _watch->turn();
     // A script that runs hears of its signals itself.
-    if (!_scriptRuns && _interpreter.isInterrupted())
+    if (!_scriptRuns && isInterrupted())
         interrupt();
 }
 
-std::string Application::askPath(QString const& title)
+bool Application::isInterrupted()
+{
+    std::lock_guard<std::mutex> const lock(_stopping);
+    // What was to stop a script that has come to its end meanwhile stops nothing else.
+    bool const isLate = std::exchange(_stopAsked, false);
+    return _interpreter.isInterrupted() && !isLate;
+}
+
+void Application::stopScript()
+{
+    std::lock_guard<std::mutex> const lock(_stopping);
+    _stopAsked = true;
+    _interpreter.stop();
+}
+
+std::string Application::askPath(QString const& title, std::string const& place)
 {
     std::string path;
-    auto const ask = [&] { path = PathQuestion(title.toUtf8().constData(), _browser->getPath().toString()).ask(); };
+    auto const ask = [&] { path = PathQuestion(title.toUtf8().constData(), place).ask(); };
     bool answered = true;
     attempt([&] { answered = _interpreter.attempt(ask); });
     if (!answered)
@@ -188,24 +245,43 @@ void Application::loadFocused(Kv::EvEvent&)
         &_window, [this, path] { attempt([&] { openComposition(path); }); }, Qt::QueuedConnection);
 }
 
-void Application::refuseFocused(Kv::EvEvent&)
+void Application::runFocused(Kv::EvEvent&)
 {
-    QString const name = QFileInfo(toText(_browser->getInputFocusPath().toString())).fileName();
-    _window.tell(QObject::tr("%1 is no composition. File > Run Script runs scripts.").arg(name));
+    std::filesystem::path const path = _browser->getInputFocusPath().toString();
+    if (Kv::BrBrowser::isScript(path.filename()))
+        startScript(ScriptCall::makeFile(path, {}), false);
+    else
+        _window.tell(QObject::tr("%1 is neither a composition nor a script").arg(toText(path.filename())));
 }
 
 void Application::askComposition()
 {
-    std::string const path = askPath(QObject::tr("Open Composition"));
+    std::string const path = askPath(QObject::tr("Open Composition"), _browser->getPath().toString());
     if (!path.empty())
         attempt([&] { openComposition(path); });
 }
 
 void Application::askScript()
 {
-    std::string const path = askPath(QObject::tr("Run Script"));
+    std::vector<std::string> const recent = _settings.getScripts();
+    std::string const last = recent.empty() ? "" : std::filesystem::path(recent.front()).parent_path();
+    std::error_code error;
+    bool const isThere = std::filesystem::is_directory(last, error);
+    std::string const path = askPath(QObject::tr("Run Script"), isThere ? last : _browser->getPath().toString());
     if (!path.empty())
         startScript(ScriptCall::makeFile(path, {}), false);
+}
+
+void Application::runRecentScript(std::string const& path)
+{
+    std::error_code error;
+    if (std::filesystem::exists(path, error))
+    {
+        startScript(ScriptCall::makeFile(path, {}), false);
+        return;
+    }
+    _settings.removeScript(path);
+    _window.tell(QObject::tr("%1 is not there any more").arg(toText(path)));
 }
 
 void Application::saveComposition()

@@ -1,8 +1,11 @@
 #pragma once
 
+#include "busyWatch.h"
 #include "commandLine.h"
 #include "interpreter.h"
 #include "mainWindow.h"
+#include "scriptOutput.h"
+#include "settings.h"
 
 #include "appUi/brBrowser.h"
 #include "appUi/uiCompositionWorkspace.h"
@@ -12,7 +15,9 @@
 
 #include <QTimer>
 
+#include <atomic>
 #include <memory>
+#include <mutex>
 #include <optional>
 
 namespace Velmora
@@ -22,8 +27,9 @@ namespace Velmora
 class Application final : private Kv::UiCompositionWorkspaceListener
 {
 public:
-    /// Throws `Kv::ExBase` with words where windows cannot be shown.
-    Application();
+    /// Throws `Kv::ExBase` with words where windows cannot be shown. What is remembered of former runs is used only
+    /// where this one is remembered too.
+    explicit Application(bool remembers);
     ~Application() override;
 
     /// Throws `Kv::ExBase` with words for a file that is no composition.
@@ -43,13 +49,20 @@ private:
     void startScript(ScriptCall const& script, bool exit);
     int runScript(ScriptCall const& script);
     void checkSignals();
+    /// True after Ctrl-C.
+    bool isInterrupted();
     /// Ctrl-C: the application ends, unless the user wants to keep changes.
     void interrupt();
 
-    /// Asks for a file; empty if none was chosen.
-    std::string askPath(QString const& title);
+    void runRecentScript(std::string const& path);
+    /// For any thread.
+    void stopScript();
+
+    /// Asks for a file, beginning at a path; empty if none was chosen.
+    std::string askPath(QString const& title, std::string const& place);
     void loadFocused(Kv::EvEvent& event);
-    void refuseFocused(Kv::EvEvent& event);
+    /// Runs the file in focus, if it is a script.
+    void runFocused(Kv::EvEvent& event);
     void askComposition();
     void askScript();
     void saveComposition();
@@ -76,6 +89,8 @@ private:
     void currentCompositionChanged() override;
     void compositionChanged(Composition const& composition) override;
 
+    Settings _settings;
+    ScriptOutput _output;
     Interpreter _interpreter;
     MainWindow _window;
     Kv::RCShdPtr<Kv::UiMainWindow> _hostWindow;
@@ -86,8 +101,11 @@ private:
     QTimer _signalTimer;
     QTimer _showTimer;
     std::optional<ScriptCall> _lastScript;
-    bool _scriptRuns = false;
+    std::atomic<bool> _scriptRuns{false};
+    std::mutex _stopping;
+    bool _stopAsked = false;
     bool _closing = false;
+    std::optional<BusyWatch> _watch;
 };
 
 } // namespace Velmora

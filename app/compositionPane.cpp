@@ -15,13 +15,12 @@ namespace Velmora
 namespace
 {
 
-QLabel* makeTitle(QString const& text, QWidget* buddy)
+QLabel* makeTitle(QString const& text)
 {
     auto* const title = new QLabel(text);
     QFont font = title->font();
     font.setBold(true);
     title->setFont(font);
-    title->setBuddy(buddy);
     return title;
 }
 
@@ -50,9 +49,9 @@ CompositionPane::CompositionPane(QWidget* parent, std::function<void(int)> onCho
     constexpr int gap = 6;
     column->setContentsMargins(gap, gap, gap, gap);
     column->setSpacing(gap);
-    column->addWidget(makeTitle(tr("Com&positions"), _list));
+    column->addWidget(makeTitle(tr("Compositions")));
     column->addWidget(_list, 1);
-    column->addWidget(makeTitle(tr("&Nodes"), _nodes));
+    column->addWidget(makeTitle(tr("Nodes")));
     column->addWidget(_nodes, 2);
     // Later: the list is filled anew then, which is in the middle of the item's event now.
     auto const choose = [this](QListWidgetItem* item)

@@ -31,6 +31,10 @@ public:
 
     void showCompositions(std::vector<CompositionEntry> const& entries);
 
+    /// They give the keyboard to one of the two.
+    void goToList() { _list->setFocus(Qt::ShortcutFocusReason); }
+    void goToNodes() { _nodes->setFocus(Qt::ShortcutFocusReason); }
+
     /// Null for no graph.
     void showNodes(Kv::RCShdPtr<const Kv::PiGraph> const& graph);
 

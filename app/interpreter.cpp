@@ -3,6 +3,7 @@
 #include "interpreter.h"
 
 #include <cerrno>
+#include <csignal>
 #include <cstdio>
 #include <cstring>
 #include <filesystem>
@@ -234,11 +235,20 @@ void setExceptionHook()
     getSys().attr("excepthook") = bp::import("functools").attr("partial")(original);
 }
 
+/// What stops a script. Ctrl-C's own is ignored in a process that a shell has started in the background, and a script
+/// may do with it what it likes.
+int getStopSignal()
+{
+    return SIGRTMAX - 1;
+}
+
 } // namespace
 
-Interpreter::Interpreter()
+Interpreter::Interpreter() : _thread(pthread_self())
 {
     start();
+    bp::object const signals = bp::import("signal");
+    signals.attr("signal")(getStopSignal(), bp::object(signals.attr("default_int_handler")));
     bp::list path = bp::extract<bp::list>(getSys().attr("path"));
     path.append(toPython(getModuleFolder()));
     setExceptionHook();
@@ -303,6 +313,19 @@ bool Interpreter::isInterrupted()
             if (PyErr_CheckSignals() != 0)
                 bp::throw_error_already_set();
         });
+}
+
+void Interpreter::stop() const
+{
+    pthread_kill(_thread, getStopSignal());
+}
+
+bool Interpreter::isRunning() const
+{
+    InterpreterHold const hold;
+    bp::handle<> const frame(
+        bp::allow_null(reinterpret_cast<PyObject*>(PyThreadState_GetFrame(static_cast<PyThreadState*>(_threadState)))));
+    return frame.get();
 }
 
 void Interpreter::loadModules()

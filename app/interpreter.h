@@ -5,6 +5,8 @@
 #include <functional>
 #include <string>
 
+#include <pthread.h>
+
 namespace Velmora
 {
 
@@ -33,6 +35,13 @@ public:
     /// Runs what is pending for the interpreter. True if that is Ctrl-C.
     bool isInterrupted();
 
+    /// Raises a `KeyboardInterrupt` where the thread of this interpreter is, also in what blocks there. It is not lost
+    /// if Python does not run then, but is met by the next who runs it. For any thread, as the next one.
+    void stop() const;
+
+    /// True if Python runs on the thread of this interpreter, or has called what runs there. Waits for the lock.
+    bool isRunning() const;
+
     /// Makes the module `ui` and all that it brings along be loaded. Throws `std::runtime_error`.
     void loadModules();
 
@@ -45,6 +54,7 @@ private:
     int takeError();
 
     std::string _failure;
+    pthread_t _thread;
     void* _threadState = nullptr;
 };
 

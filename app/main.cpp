@@ -2,6 +2,7 @@
 #include "buildInfo.h"
 #include "commandLine.h"
 #include "interpreter.h"
+#include "stopWindow.h"
 #include "theme.h"
 
 #include "base/exBase.h"
@@ -46,7 +47,8 @@ int run(CommandLine const& line)
     // The toolkit starts here.
     Kv::WsNative::getPlatform();
     applyTheme();
-    Application application;
+    // A script that has the application to itself finds it as it is for everybody.
+    Application application(!line.exit);
     for (std::string const& path : line.compositions)
         application.openComposition(path);
     return application.run(line.script, line.exit);
@@ -67,6 +69,8 @@ int main(int argc, char** argv)
     openStandardStreams();
     try
     {
+        if (StopWindow::isWanted(argc, argv))
+            return StopWindow::run(argv);
         return run(readCommandLine(argc, argv));
     }
     catch (UsageError const& error)

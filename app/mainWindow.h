@@ -1,10 +1,12 @@
 #pragma once
 
 #include "compositionPane.h"
+#include "logPane.h"
 
 #include <QActionGroup>
 #include <QLabel>
 #include <QMainWindow>
+#include <QSplitter>
 
 #include <functional>
 #include <vector>
@@ -13,6 +15,7 @@ namespace Velmora
 {
 
 class NodeView;
+class Settings;
 
 /// What the user can ask the application for.
 struct Commands
@@ -22,6 +25,12 @@ struct Commands
     std::function<void()> closeComposition;
     std::function<void()> runScript;
     std::function<void()> runScriptAgain;
+    /// The scripts that ran last, by their paths, and to run one of them.
+    std::function<std::vector<std::string>()> getRecentScripts;
+    std::function<void(std::string const&)> runRecentScript;
+    std::function<void()> forgetRecentScripts;
+    std::function<void()> stopScript;
+    std::function<void()> goToBrowser;
     std::function<void()> showBuildInfo;
     /// By the place among the open ones.
     std::function<void(int)> makeCurrent;
@@ -31,26 +40,34 @@ struct Commands
     std::function<bool()> quit;
 };
 
-/// The window: the file browser, the main panel in which dialogs float, and the compositions. Of the first two it makes
-/// only the place.
+/// The window: the file browser, the main panel in which dialogs float, the compositions, and the log. Of the first two
+/// it makes only the place.
 class MainWindow final : public QMainWindow
 {
 public:
-    explicit MainWindow(Commands commands);
+    /// `output`, borrowed, is what the log shows.
+    MainWindow(Commands commands, ScriptOutput& output);
 
     QWidget* getPanel() const { return _panel; }
     QWidget* getBrowserPlace() const { return _browserPlace; }
 
-    /// Enables and disables all that the window has of its own.
+    /// Enables and disables all that the window has of its own, but that a script can be stopped and the log scrolled.
     void setOwnEnabled(bool enabled);
+
+    /// How large the window is, and how that is shared out, from one run to the next.
+    void restoreLook(Settings const& settings);
+    void saveLook(Settings& settings) const;
 
     void showCompositions(std::vector<CompositionEntry> const& entries);
 
     /// The nodes of the current composition; null for none.
     void showGraph(Kv::RCShdPtr<const Kv::PiGraph> const& graph);
 
-    /// Whether there is a script to be run again.
-    void setRunAgainEnabled(bool enabled) { _runAgain->setEnabled(enabled); }
+    /// Whether a script runs, which then can be stopped, and afterwards be run again.
+    void setRunning(bool running);
+
+    /// Says something of a script in the log.
+    void note(QString const& text) { _log->note(text); }
 
     /// Says something in the line at the bottom, until the next.
     void tell(QString const& text);
@@ -66,7 +83,13 @@ protected:
 
 private:
     void makeMenus();
-    void makePanes();
+    void makeScriptMenu();
+    void makeViewMenu();
+    void makePanes(ScriptOutput& output);
+    void showRecentScripts(QMenu& menu);
+    void showLog(bool shown);
+    /// Gives the keyboard to the uppermost of the dialogs that float in the main panel.
+    void goToDialog();
     void showInMenu(std::vector<CompositionEntry> const& entries);
 
     Commands _commands;
@@ -74,9 +97,16 @@ private:
     QWidget* _browserPlace = nullptr;
     NodeView* _nodeView = nullptr;
     CompositionPane* _compositions = nullptr;
+    LogPane* _log = nullptr;
+    QSplitter* _columns = nullptr;
+    QSplitter* _rows = nullptr;
     QMenu* _compositionMenu = nullptr;
     QAction* _runAgain = nullptr;
+    QAction* _stop = nullptr;
+    QAction* _showsLog = nullptr;
     QLabel* _message = nullptr;
+    /// Those that are not there while a dialog runs.
+    QActionGroup* _own = nullptr;
     /// Those that need a composition.
     QActionGroup* _onComposition = nullptr;
     QActionGroup* _openOnes = nullptr;

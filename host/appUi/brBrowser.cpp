@@ -62,6 +62,11 @@ bool BrBrowser::isComposition(std::string const& name)
     return std::filesystem::path(name).extension() == ".vmcomposition";
 }
 
+bool BrBrowser::isScript(std::string const& name)
+{
+    return std::filesystem::path(name).extension() == ".py";
+}
+
 RttiType const& BrBrowser::getClassType()
 {
     return RttiGenType1<BrBrowser, UiWidget>::getInstance();
@@ -230,8 +235,9 @@ void BrBrowser::onActivated()
 void BrBrowser::showCollapsing()
 {
     if (_native)
-        _native->setCollapsing([sequences = _sequencesCollapsed, compositions = _compositionsCollapsed](
-                                   std::string const& name) { return isComposition(name) ? compositions : sequences; });
+        _native->setCollapsing(
+            [sequences = _sequencesCollapsed, compositions = _compositionsCollapsed](std::string const& name)
+            { return isComposition(name) ? compositions : sequences && !isScript(name); });
 }
 
 RCShdPtr<SnSelection> BrBrowser::makeSelection() const

@@ -30,6 +30,9 @@ public:
     /// True for the name of a file that is a composition, which it is by its extension.
     static bool isComposition(std::string const& name);
 
+    /// The same for a script.
+    static bool isScript(std::string const& name);
+
     ~BrBrowser() override;
 
     static RttiType const& getClassType();
@@ -41,7 +44,8 @@ public:
     /// How entries are shown.
     void setViewType(BrTypes::ViewType);
 
-    /// Whether numbered files, as "frame.0001.exr" and those after it, are one entry; at first they are.
+    /// Whether numbered files, as "frame.0001.exr" and those after it, are one entry; at first they are. Scripts never
+    /// are: each is one to be run.
     void setSequencesCollapsed(bool collapsed);
 
     /// The same for numbered compositions, which are never part of another sequence; at first each is an entry.

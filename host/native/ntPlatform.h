@@ -117,6 +117,10 @@ public:
     /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.
     virtual void endLoop() = 0;
 
+    /// Runs what is pending for the interpreter now, before other people's functions are called; what comes of it is
+    /// thrown out of the innermost loop. Without a loop, nothing happens.
+    virtual void interruptLoop() = 0;
+
     /// The application closes: ends all loops, each by setting its `*end`. One that begins later throws an `ExBase`; a
     /// script that goes on trying is interrupted.
     virtual void closeLoops() = 0;

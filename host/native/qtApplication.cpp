@@ -2,6 +2,7 @@
 
 #include "base/exBase.h"
 #include "native/displayProbe.h"
+#include "native/windowIcon.h"
 
 #include <QApplication>
 #include <QByteArray>
@@ -44,6 +45,7 @@ QCoreApplication* makeApplication(QString const& platform)
     count = static_cast<int>(arguments.size()) - 1;
     auto* const application = new QApplication(count, arguments.data());
     QApplication::setQuitOnLastWindowClosed(false);
+    QApplication::setWindowIcon(makeWindowIcon());
     return application;
 }
 

@@ -216,6 +216,12 @@ void QtPlatform::endLoop()
         loop->end();
 }
 
+void QtPlatform::interruptLoop()
+{
+    if (QtGuard::getInstance().getInnermostLoop())
+        QtGuard::getInstance().checkSignals();
+}
+
 void QtPlatform::closeLoops()
 {
     _closed = true;

@@ -42,6 +42,7 @@ public:
 
     void runLoop(bool const volatile* until, bool volatile* end) override;
     void endLoop() override;
+    void interruptLoop() override;
     void closeLoops() override;
 
 private:

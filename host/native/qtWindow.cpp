@@ -3,6 +3,7 @@
 #include "native/qtGuard.h"
 #include "native/qtInputDrop.h"
 #include "native/qtText.h"
+#include "native/windowIcon.h"
 #include "native/windowWidget.h"
 
 #include <QApplication>
@@ -57,6 +58,9 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, std::strin
     // No screen shows more, and a window system can end the process for it.
     constexpr int maxTitle = 4096;
     native->setWindowTitle(toQString(title).left(maxTitle));
+    // Where the application is a script's own, it has no icon as a rule.
+    if (QApplication::windowIcon().isNull())
+        native->setWindowIcon(makeWindowIcon());
     native->setGeometry(frame);
     native->setContent(_content->getNative());
 }

@@ -30,13 +30,23 @@ class Desk:
 
     def wait_for_window(self, title):
         """Waits until a window of that title has the keyboard, and gives its identity."""
+        return self._wait(title, lambda found: found and found == self.run('getwindowfocus', '-f'))[0]
+
+    def find_window(self, title):
+        """The same where another window may have the keyboard."""
+        return self._wait(title, lambda found: found)[0]
+
+    def wait_until_gone(self, title):
+        self._wait(title, lambda found: not found)
+
+    def _wait(self, title, condition):
         end = time.monotonic() + PATIENCE
         while time.monotonic() < end:
             found = self.run('search', '--onlyvisible', '--name', '^%s$' % title)
-            if found and found == self.run('getwindowfocus', '-f'):
-                return found[0]
+            if condition(found):
+                return found
             time.sleep(0.02)
-        raise AssertionError('no window "%s" has the keyboard' % title)
+        raise AssertionError('the window "%s" does not come, or go, or get the keyboard' % title)
 
     def click(self, x, y):
         self.run('mousemove', x, y, 'click', 1)

@@ -12,8 +12,10 @@ CHOOSES_DISPLAY = ('DISPLAY', 'QT_QPA_PLATFORM', 'WAYLAND_DISPLAY', 'WAYLAND_SOC
 
 
 def environment(**changes):
-    """This process's environment without what chooses a display, but with `changes`, and the tests' own modules."""
+    """This process's environment without what chooses a display, but with `changes`, and the tests' own modules. The
+    application remembers nothing in it."""
     result = {name: value for name, value in os.environ.items() if name not in CHOOSES_DISPLAY}
+    result['XDG_CONFIG_HOME'] = '/dev/null'
     result['PYTHONPATH'] = os.pathsep.join([HERE, result.get('PYTHONPATH', '')])
     return {**result, **changes}
 

@@ -32,7 +32,7 @@ def active():
         panel = window.findChild(QWidget, 'panel') if window else None
         # The window of a run that has come to its end drops its input before it goes.
         return window if panel is None or panel.isVisible() else None
-    if APPLICATION.menuBar().isEnabled():
+    if APPLICATION.findChild(QWidget, 'browserPlace').isEnabled():
         return None
     return next((dialog for dialog in reversed(floating()) if dialog.isEnabled()), None)
 

@@ -63,20 +63,20 @@ def write(folder, **texts):
         (folder / (name + '.py')).write_text(textwrap.dedent(text))
 
 
-def run(folder, *command, platform='offscreen', **options):
+def run(folder, *command, platform='offscreen', **changes):
     """Runs a program to its end, and gives its status, as a shell tells it, and what it said."""
     chosen = {'QT_QPA_PLATFORM': platform} if platform else {}
-    settings = environment(QT_LOGGING_RULES='default.warning=false', **chosen)
-    done = subprocess.run(command, cwd=folder, env=settings, capture_output=True, timeout=60, **options)
+    settings = environment(QT_LOGGING_RULES='default.warning=false', **chosen, **changes)
+    done = subprocess.run(command, cwd=folder, env=settings, capture_output=True, timeout=60)
     status = done.returncode if done.returncode >= 0 else 128 - done.returncode
-    return status, done.stdout.decode(), done.stderr.decode()
+    return status, done.stdout.decode(errors='surrogateescape'), done.stderr.decode()
 
 
-def run_inside(folder, script, *options, plan=''):
+def run_inside(folder, script, *options, plan='', **changes):
     """Runs a script in the application until that ends, and gives its status, the lines that it printed, and what it
     said of errors."""
     write(folder, script=script, watching=WATCHING + textwrap.dedent(plan))
-    status, printed, errors = run(folder, PROGRAM, *options, 'script.py')
+    status, printed, errors = run(folder, PROGRAM, *options, 'script.py', **changes)
     return status, printed.splitlines(), errors
 
 
@@ -343,7 +343,7 @@ def test_a_script_that_is_picked_with_keys_alone_learns_what_is_selected(desk, t
         ''')
 
     def run_script():
-        desk.run('key', 'alt+f', 'r', 'ctrl+l')
+        desk.run('key', 'alt+s', 'r', 'ctrl+l')
         desk.run('type', str(tmp_path / 'look.py'))
         desk.run('key', 'Return', 'Tab', 'space')  # the list, OK
         return application.stdout.readline()

@@ -151,7 +151,8 @@ def test_what_has_no_room_scrolls_under_the_title():
 def states():
     """What of the application takes input, and what does so of the dialogs."""
     main = stage.APPLICATION
-    own = [main.menuBar(), main.findChild(QTreeView, 'Browser.list'), main.findChild(QWidget, 'compositions')]
+    own = [main.menuBar().actions()[0], main.findChild(QTreeView, 'Browser.list'),
+           main.findChild(QWidget, 'compositions')]
     return [widget.isEnabled() for widget in own], {stage.title_of(one): one.isEnabled() for one in stage.dialogs()}
 
 

@@ -1,0 +1,27 @@
+#pragma once
+
+#include "busyWatch.h"
+
+#include <string>
+#include <vector>
+
+namespace Velmora
+{
+
+/// The window by which a script is stopped that keeps the application's own window from answering. It is all that its
+/// process shows.
+namespace StopWindow
+{
+
+/// The command line of the process. Its standard input is the connection to the application.
+std::vector<std::string> makeCommand(BusyWatch::Offer const& offer);
+
+/// Whether that is what the process was started for.
+bool isWanted(int argc, char** argv);
+
+/// Runs the window, and gives the exit status.
+int run(char** argv);
+
+} // namespace StopWindow
+
+} // namespace Velmora

@@ -1,0 +1,12 @@
+#pragma once
+
+#include <QIcon>
+
+namespace Kv
+{
+
+/// What stands for our windows in title bars and lists of windows: two nodes that lead into a third, on a ground of its
+/// own, so that it is seen on light and on dark.
+QIcon makeWindowIcon();
+
+} // namespace Kv
