@@ -28,10 +28,7 @@ def dialogs():
 def active():
     """The dialog that takes input while the rest does not; None if there is none."""
     if not APPLICATION:
-        window = QApplication.activeModalWidget()
-        panel = window.findChild(QWidget, 'panel') if window else None
-        # The window of a run that has come to its end drops its input before it goes.
-        return window if panel is None or panel.isVisible() else None
+        return QApplication.activeModalWidget()
     if APPLICATION.findChild(QWidget, 'browserPlace').isEnabled():
         return None
     return next((dialog for dialog in reversed(floating()) if dialog.isEnabled()), None)
