@@ -2,6 +2,8 @@
 
 #include "base/kvExport.h"
 
+#include <string>
+
 namespace Kv
 {
 
@@ -33,6 +35,30 @@ public:
 
     /// Configuration, processor and compiler, joined by dots.
     virtual char const* getBuildFlavour() const = 0;
+};
+
+/// Build information of the libraries around the module, which all come from one build.
+class KV_API InLibraryBuildInfo : public InBuildInfo
+{
+public:
+    /// `buildDate` is `__DATE__` of the library.
+    InLibraryBuildInfo(std::string libraryName, char const* buildDate);
+
+    char const* getProductName() const override { return "Quorvane Velmora Library"; }
+    char const* getLibraryName() const override { return _libraryName.c_str(); }
+    char const* getReleaseYear() const override { return "2013"; }
+    char const* getVersionString() const override { return "8.0"; }
+    char const* getVersionSuffix() const override { return getReleaseStage() == 3 ? "dev" : ""; }
+    int getMajorVersion() const override { return 8; }
+    int getMinorVersion() const override { return 0; }
+    int getReleaseStage() const override { return 42; }
+    char const* getBuildNumber() const override { return "2600"; }
+    char const* getBuildDate() const override { return _buildDate.c_str(); }
+    char const* getBuildFlavour() const override;
+
+private:
+    std::string _libraryName;
+    std::string _buildDate;
 };
 
 } // namespace Kv

@@ -1,6 +1,7 @@
 #include "base/inBuildInfoUtil.h"
 
-#include "base/inPackageRegistry.h"
+#include "base/inPackageInit.h"
+#include "base/rcExUtil.h"
 
 #include <atomic>
 #include <utility>
@@ -17,12 +18,21 @@ std::atomic<ApplicationModes> applicationMode{ApplicationModes::NonInteractive};
 
 InBuildInfo& InBuildInfoUtil::registerInfo(OPtr<InBuildInfo> info)
 {
-    return InPackageRegistry::getInstance().addInfo(std::move(info));
+    if (!info)
+        RCExUtil::throwExNullPtr(typeid(InBuildInfo*).name());
+    InPackageInit* const package = InPackageInit::getCurrent();
+    if (!package)
+        throw ExBase(__FILE__, __LINE__, "Build information can be registered only while its package is set up");
+    package->setBuildInfo(std::move(info));
+    return *package->getBuildInfo();
 }
 
 std::vector<InPackageInfo> InBuildInfoUtil::getInfos()
 {
-    return InPackageRegistry::getInstance().getInfos();
+    std::vector<InPackageInfo> infos;
+    for (InPackageInit const* const package : InPackageInit::getPackages())
+        infos.push_back({package->getName(), package->getBuildInfo()});
+    return infos;
 }
 
 ApplicationModes InBuildInfoUtil::getApplicationMode()

@@ -13,9 +13,9 @@ namespace Kv
 class KV_API XmlDocument
 {
 public:
-    /// Reads `text`, which is the document itself, in UTF-8, and no file name. Throws `XmlError` with the line for
-    /// whatever is not well-formed, for a document type definition, for an encoding declared as another than UTF-8, and
-    /// for elements nested deeper than 1024.
+    /// Reads `text`, which is the document itself and no file name, in UTF-8 or in the other encodings that the parser
+    /// knows. Throws `XmlError` with the line for whatever is not well-formed, for a document type definition, and for
+    /// elements nested deeper than 1024.
     explicit XmlDocument(std::string const& text);
     XmlDocument(XmlDocument const&) = delete;
     XmlDocument& operator=(XmlDocument const&) = delete;

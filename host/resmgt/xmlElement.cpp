@@ -5,41 +5,32 @@
 #include "resmgt/xmlSyntax.h"
 #include "resmgt/xmlTree.h"
 
-#include <cstring>
 #include <utility>
 
 namespace Kv
 {
 
-namespace
-{
-
-bool isText(pugi::xml_node node)
-{
-    return node.type() == pugi::node_pcdata || node.type() == pugi::node_cdata;
-}
-
-} // namespace
-
-XmlElement::XmlElement(std::shared_ptr<XmlTree const> tree, pugi::xml_node_struct* node)
-    : _tree(std::move(tree)), _node(node)
+XmlElement::XmlElement(std::shared_ptr<XmlTree const> tree, std::uint32_t index) : _tree(std::move(tree)), _index(index)
 {
 }
 
 std::string XmlElement::getName() const
 {
-    return pugi::xml_node(_node).name();
+    return std::string(_tree->get(_tree->elements[_index].name));
 }
 
 int XmlElement::getLine() const
 {
-    return _tree->getLine(pugi::xml_node(_node).name());
+    return _tree->elements[_index].line;
 }
 
 std::optional<std::string> XmlElement::findAttribute(std::string const& name) const
 {
-    pugi::xml_attribute const attribute = pugi::xml_node(_node).attribute(name.c_str());
-    return attribute ? std::optional<std::string>(attribute.value()) : std::nullopt;
+    XmlTree::Element const& element = _tree->elements[_index];
+    for (std::uint32_t i = element.firstAttribute; i < element.attributesEnd; ++i)
+        if (_tree->get(_tree->attributes[i].name) == name)
+            return std::string(_tree->get(_tree->attributes[i].value));
+    return std::nullopt;
 }
 
 std::string XmlElement::getAttribute(std::string const& name) const
@@ -54,43 +45,38 @@ std::string XmlElement::getAttribute(std::string const& name) const
 std::vector<std::string> XmlElement::getAttributeNames() const
 {
     std::vector<std::string> names;
-    for (pugi::xml_attribute const attribute : pugi::xml_node(_node).attributes())
-        names.emplace_back(attribute.name());
+    XmlTree::Element const& element = _tree->elements[_index];
+    for (std::uint32_t i = element.firstAttribute; i < element.attributesEnd; ++i)
+        names.emplace_back(_tree->get(_tree->attributes[i].name));
     return names;
 }
 
 std::vector<XmlElement> XmlElement::getChildren() const
 {
     std::vector<XmlElement> children;
-    for (pugi::xml_node const child : pugi::xml_node(_node))
-        if (child.type() == pugi::node_element)
-            children.emplace_back(_tree, child.internal_object());
+    std::vector<XmlTree::Element> const& elements = _tree->elements;
+    for (std::uint32_t i = _index + 1; i < elements[_index].end; i = elements[i].end)
+        children.emplace_back(_tree, i);
     return children;
 }
 
 std::optional<XmlElement> XmlElement::findChild(std::string const& name) const
 {
-    for (pugi::xml_node const child : pugi::xml_node(_node))
-        if (child.type() == pugi::node_element && name == child.name())
-            return XmlElement(_tree, child.internal_object());
+    std::vector<XmlTree::Element> const& elements = _tree->elements;
+    for (std::uint32_t i = _index + 1; i < elements[_index].end; i = elements[i].end)
+        if (_tree->get(elements[i].name) == name)
+            return XmlElement(_tree, i);
     return std::nullopt;
 }
 
 std::string XmlElement::getText() const
 {
-    std::string text;
-    for (pugi::xml_node const child : pugi::xml_node(_node))
-        if (isText(child))
-            text += child.value();
-    return text;
+    return std::string(_tree->get(_tree->elements[_index].text));
 }
 
 bool XmlElement::hasText() const
 {
-    for (pugi::xml_node const child : pugi::xml_node(_node))
-        if (isText(child) && child.value()[std::strspn(child.value(), XmlSyntax::blanks)] != '\0')
-            return true;
-    return false;
+    return _tree->get(_tree->elements[_index].text).find_first_not_of(XmlSyntax::blanks) != std::string_view::npos;
 }
 
 } // namespace Kv

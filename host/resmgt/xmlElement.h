@@ -3,28 +3,24 @@
 #include "base/kvExport.h"
 #include "base/rcBase.h"
 
+#include <cstdint>
 #include <memory>
 #include <optional>
 #include <string>
 #include <vector>
 
-namespace pugi
-{
-struct xml_node_struct;
-} // namespace pugi
-
 namespace Kv
 {
 
-class XmlTree;
+struct XmlTree;
 
 /// An element of a document that has been read. Cheap to copy; each keeps the whole document alive. All texts are
 /// UTF-8 with their references decoded.
 class KV_API XmlElement : public RCBase<LkCounter<int>>
 {
 public:
-    /// `node` is an element of `tree`. `XmlDocument` makes the first one, the elements give the others.
-    XmlElement(std::shared_ptr<XmlTree const> tree, pugi::xml_node_struct* node);
+    /// `index` is that of the element in the tree. `XmlDocument` makes the first one, the elements give the others.
+    XmlElement(std::shared_ptr<XmlTree const> tree, std::uint32_t index);
 
     std::string getName() const;
 
@@ -54,7 +50,7 @@ public:
 
 private:
     std::shared_ptr<XmlTree const> _tree;
-    pugi::xml_node_struct* _node;
+    std::uint32_t _index;
 };
 
 } // namespace Kv

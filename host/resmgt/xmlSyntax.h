@@ -1,8 +1,8 @@
 #pragma once
 
 #include <cstddef>
-#include <cstdint>
 #include <optional>
+#include <string>
 #include <string_view>
 
 /// The rules of XML that the reader and the writer share.
@@ -22,11 +22,8 @@ struct Offence
     char const* words;
 };
 
-/// True for the code points that may stand in a document.
-bool isCharacter(std::uint32_t codePoint);
-
 /// True for what may name an element or an attribute. Any bytes may be asked about.
-bool isName(std::string_view text);
+bool isName(std::string const& text);
 
 /// Nothing for a text of well-formed UTF-8 that is made of allowed characters.
 std::optional<Offence> findOffence(std::string_view text);

@@ -1,39 +1,53 @@
 #pragma once
 
-#include "resmgt/xmlLines.h"
-
-#include <pugixml.hpp>
+#include <cstdint>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace Kv
 {
 
-/// The nodes of a document that has been read and found good, and the text that they point into.
-class XmlTree
+/// A document that has been read. The elements stand in the order in which they begin, so what is in one follows it.
+struct XmlTree
 {
-public:
-    /// Throws `XmlError` with the line for what `XmlDocument` refuses.
-    explicit XmlTree(std::string const& text);
-    XmlTree(XmlTree const&) = delete;
-    XmlTree& operator=(XmlTree const&) = delete;
-    ~XmlTree();
+    /// A stretch of `texts`.
+    struct Stretch
+    {
+        std::uint32_t begin;
+        std::uint32_t size;
+    };
 
-    /// The root element, or a null node. All values in the tree are decoded.
-    pugi::xml_node getRoot() const;
+    struct Attribute
+    {
+        Stretch name;
+        Stretch value;
+    };
 
-    /// The line, from 1, of a place in the text, such as a node's name.
-    int getLine(char const* place) const;
+    struct Element
+    {
+        Stretch name;
+        Stretch text;
+        /// The attributes are those from the first up to the one at the end.
+        std::uint32_t firstAttribute;
+        std::uint32_t attributesEnd;
+        /// The first element that is no longer in this one.
+        std::uint32_t end;
+        int line;
+    };
 
-private:
-    explicit XmlTree(std::string_view text);
+    std::string_view get(Stretch stretch) const { return std::string_view(texts).substr(stretch.begin, stretch.size); }
 
-    void parse(std::string_view original, std::size_t begin);
+    Stretch append(std::string_view text)
+    {
+        Stretch const stretch{static_cast<std::uint32_t>(texts.size()), static_cast<std::uint32_t>(text.size())};
+        texts.append(text);
+        return stretch;
+    }
 
-    // The parser works in place: names and values are stretches of this text, ended by zero bytes of their own.
-    std::string _text;
-    XmlLines _lines;
-    pugi::xml_document _document;
+    std::string texts;
+    std::vector<Attribute> attributes;
+    std::vector<Element> elements;
 };
 
 } // namespace Kv

@@ -3,7 +3,6 @@
 #include "base/constIterator.h"
 #include "base/inBuildInfoUtil.h"
 #include "base/inInit.h"
-#include "base/inLibraryBuildInfo.h"
 #include "base/iterator.h"
 #include "base/rcShdPtr.h"
 #include "base/rcStrongPtr.h"
@@ -12,8 +11,6 @@
 #include "base/uPtr.h"
 
 #include <algorithm>
-#include <cstdio>
-#include <cstdlib>
 #include <gtest/gtest.h>
 #include <memory>
 #include <sstream>
@@ -330,15 +327,12 @@ public:
             InPackageInit::addDependency(dependency);
     }
 
-    void prepareInit() override { happened.push_back("prepare " + std::to_string(number)); }
     void initPackage() override
     {
         happened.push_back("init " + std::to_string(number));
         if (_hasInfo)
             InBuildInfoUtil::registerInfo(std::make_unique<InLibraryBuildInfo>(getName(), __DATE__));
     }
-    void prepareFinish() override { static_cast<void>(std::fputs("prepare, ", stderr)); }
-    void finishPackage() override { static_cast<void>(std::fprintf(stderr, "finish %d, ", number)); }
 
 private:
     bool _hasInfo;
@@ -357,16 +351,16 @@ Words packagesNow()
 TEST(Packages, AreSetUpOnceBehindThoseThatTheyDependOn)
 {
     happened.clear();
-    TestPackage<1> const one({&typeid(TestPackage<2>), &typeid(TestPackage<9>)}, false);
-    TestPackage<2> const two({&typeid(TestPackage<3>)});
+    TestPackage<1> one({&typeid(TestPackage<2>), &typeid(TestPackage<9>)}, false);
+    TestPackage<2> two({&typeid(TestPackage<3>)});
     {
-        TestPackage<3> const three({});
+        TestPackage<3> three({});
         EXPECT_EQ(packagesNow(), (Words{"base", "3", "2", "1 without information"})) << "9 is not loaded";
-        EXPECT_EQ(happened, (Words{"prepare 1", "prepare 2", "prepare 3", "init 3", "init 2", "init 1"}));
-        EXPECT_EQ(two.getDependencies(), (std::vector<InVariableBase*>{const_cast<TestPackage<3>*>(&three)}));
+        EXPECT_EQ(happened, (Words{"init 3", "init 2", "init 1"}));
+        EXPECT_EQ(two.getDependencies(), (std::vector<InVariableBase*>{&three}));
     }
     EXPECT_TRUE(two.getDependencies().empty());
-    TestPackage<9> const late({});
+    TestPackage<9> late({});
     EXPECT_EQ(packagesNow(), (Words{"base", "2", "1 without information", "9"}));
     EXPECT_EQ(happened.back(), "init 9");
     EXPECT_EQ(std::count(happened.begin(), happened.end(), "init 2"), 1);
@@ -375,24 +369,12 @@ TEST(Packages, AreSetUpOnceBehindThoseThatTheyDependOn)
 TEST(Packages, ComeOutOfARingOfDependencies)
 {
     happened.clear();
-    TestPackage<1> const one({&typeid(TestPackage<2>)});
-    TestPackage<2> const two({&typeid(TestPackage<3>), &typeid(TestPackage<2>)});
-    TestPackage<3> const three({&typeid(TestPackage<1>)});
+    TestPackage<1> one({&typeid(TestPackage<2>)});
+    TestPackage<2> two({&typeid(TestPackage<3>), &typeid(TestPackage<2>)});
+    TestPackage<3> three({&typeid(TestPackage<1>)});
     EXPECT_EQ(packagesNow().size(), 4U);
     EXPECT_EQ(std::count(happened.begin(), happened.end(), "init 2"), 1);
-    EXPECT_EQ(happened.size(), 6U);
-}
-
-TEST(Packages, AreTakenDownInTheOppositeOrderWhenTheProcessEnds)
-{
-    auto const endProcess = []
-    {
-        static TestPackage<1> const one({&typeid(TestPackage<2>)});
-        static TestPackage<2> const two({});
-        InBuildInfoUtil::getInfos();
-        std::exit(0); // NOLINT(concurrency-mt-unsafe)
-    };
-    EXPECT_EXIT(endProcess(), testing::ExitedWithCode(0), "prepare, prepare, finish 1, finish 2, $");
+    EXPECT_EQ(happened.size(), 3U);
 }
 
 TEST(BuildInfo, IsTakenOnlyOfAPackageThatIsBeingSetUp)

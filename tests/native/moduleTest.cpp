@@ -1,8 +1,8 @@
 #include <boost/python.hpp>
 
 #include "base/inBuildInfoUtil.h"
+#include "base/inInit.h"
 #include "gfx/wsCursorRegistry.h"
-#include "pyui/src/inPyextUi.h"
 #include "pyui/src/pyManagedDialog.h"
 #include "pyui/src/pyUiError.h"
 #include "resmgt/osFilePath.h"

@@ -156,7 +156,8 @@ TEST(XmlWriter, RefusesWhatXmlCannotHoldAndGoesOnAsBefore)
         expectContains(wordsOf<XmlError>([&] { writer.writeAttrib("b", text); }), LiStringUtil::getPrintable(text));
         expectContains(wordsOf<XmlError>([&] { writer.writeTag("Text", text); }), LiStringUtil::getPrintable(text));
     }
-    for (std::string const& name : {""s, "a b"s, "1"s, "-a"s, "a<"s, "a\0"s, "a\n"s, "a=''"s, "\xff"s, "\xc3\x97"s})
+    for (std::string const& name :
+         {""s, "a b"s, "1"s, "-a"s, "a<"s, "a\0"s, "a\n"s, "a=''"s, "\xff"s, "\xc3\x97"s, "\xf0\x90\x80\x80"s})
     {
         SCOPED_TRACE(LiStringUtil::getPrintable(name));
         expectContains(wordsOf<XmlError>([&] { writer.openTag(name); }), LiStringUtil::getPrintable(name));
@@ -228,7 +229,9 @@ TEST(XmlDocument, RefusesWhatIsNotOneWholeElement)
     expectRefused("<a/>\n&#32;", 2, "text outside");
     expectRefused("\n<![CDATA[]]><a/>", 2, "text outside");
     expectRefused("\xef\xbb\xbf\xef\xbb\xbf<a/>", 1, "byte order mark");
+    expectRefused("\n'x\ny", 2, "text outside");
     expectRefused("<a/>\n<b/>", 2, "second root element: 'b'");
+    expectRefused("<a>\n<b>\n<c>\n</b>", 4, "element 'c' of line 3 is not closed");
     for (char const* const text : {"<", "\n <", "<a", "<a>", "<a/", "<a></b>", "</a>", "<a></a", "<a/><", "<a/> <",
                                    "<a><b></a></b>", "<!-- a", "<a><![CDATA[x</a>", "<a><?p</a>"})
         expectRefused(text, text[0] == '\n' ? 2 : 1, "no well-formed XML");
@@ -267,7 +270,21 @@ TEST(XmlDocument, RefusesForbiddenCharactersAndReferences)
     }
 }
 
-TEST(XmlDocument, TakesOnlyDeclarationsOfUtf8)
+TEST(XmlDocument, ReadsTheEncodingsThatItsParserKnows)
+{
+    std::string const utf8 = "<a b='\xc3\xa9'>\xe2\x82\xac</a>";
+    std::string wide;
+    for (char16_t const unit : u"\ufeff<a b='\u00e9'>\u20ac</a>"s)
+        wide.append({static_cast<char>(unit & 0xff), static_cast<char>(unit >> 8)});
+    for (std::string const& text : {utf8, wide})
+        EXPECT_EQ(rootOf(text).getAttribute("b") + rootOf(text).getText(), "\xc3\xa9\xe2\x82\xac");
+    EXPECT_EQ(rootOf("<?xml version='1.0' encoding='iso-8859-1'?><a>\xe9</a>").getText(), "\xc3\xa9");
+    expectRefused("<?xml version='1.0' encoding='iso-8859-1'?>" + utf8, 1, "'iso-8859-1', but is UTF-8");
+    expectRefused("<?xml version='1.0' encoding='utf-16'?>" + utf8, 1, "declares: 'utf-16'");
+    expectRefused("<?xml version='1.0' encoding='us-ascii'?>\n" + utf8, 2, "in the encoding 'us-ascii'");
+}
+
+TEST(XmlDocument, TakesOnlyDeclarationsOfItsEncodings)
 {
     for (char const* const rest : {"version='1.0'", R"(version="1.1" )", "version='1.0' encoding='US-ascii'",
                                    "version = '1.0'\nencoding = 'Utf-8' standalone='no'"})
@@ -301,7 +318,7 @@ TEST(XmlLimits, ReaderAndWriterStopAtTheSameDepth)
 
     expectRefused(repeated(maximumDepth + 1, "<a>\n") + repeated(maximumDepth + 1, "</a>"), maximumDepth + 1, "1024");
     expectRefused(repeated(100000, "<a>") + repeated(100000, "</a>"), 1, "1024");
-    expectRefused(repeated(100000, "<a>"), 1, "no well-formed XML");
+    expectRefused(repeated(100000, "<a>"), 1, "1024");
 }
 
 TEST(XmlLimits, LargeDocumentsCostWhatTheyHold)
@@ -321,6 +338,10 @@ TEST(XmlLimits, LargeDocumentsCostWhatTheyHold)
         wide += "\nb" + std::to_string(i) + "=''";
     EXPECT_EQ(rootOf(wide + "/>").getAttributeNames().size(), static_cast<std::size_t>(rows));
     expectRefused(wide + "\nb7=''/>", rows + 2, "'b7' stands twice");
+
+    std::string const much = repeated(rows, " a value, a comment and a text that go on and on");
+    XmlElement const element = rootOf("<a b='" + much + "'><!--" + much + "-->" + much + "</a>");
+    EXPECT_TRUE(element.getAttribute("b") == much && element.getText() == much);
 }
 
 TEST(LiStringSubstituter, ReplacesEveryOccurrenceOnce)

@@ -1,15 +1,9 @@
 #include <boost/python.hpp>
 
-#include "appUi/inAppUi.h"
 #include "appUi/uiAppMgr.h"
-#include "base/inBase.h"
 #include "base/inBuildInfoUtil.h"
-#include "framework/inFramework.h"
-#include "gfx/inGfx.h"
-#include "inPyextUi.h"
-#include "internalAPI/inInternalApi.h"
+#include "base/inInit.h"
 #include "internalAPI/piBrowserSchemes.h"
-#include "pluginAPI/inPluginApi.h"
 #include "pyArgumentNote.h"
 #include "pyCompat.h"
 #include "pyConvenienceFunctions.h"
@@ -17,12 +11,7 @@
 #include "pyUiError.h"
 #include "pyWorkspace.h"
 #include "pyextUiDocs.h"
-#include "pygraph/inPyextGraph.h"
-#include "pyinit/inPyextInit.h"
 #include "pyinit/pySharedClass.h"
-#include "resmgt/inResmgt.h"
-#include "scriptingAPI/inScriptingApi.h"
-#include "ui/inUi.h"
 #include "ui/uiCursorGuard.h"
 
 #include <memory>
@@ -55,39 +44,13 @@ public:
 
 } // namespace
 
-template <> std::type_info const* InInit<KvInit::pyextUi>::getType()
-{
-    return &typeid(InInit);
-}
-
-template <> InInit<KvInit::pyextUi>::InInit() : InPackageInit("pyextUi")
-{
-    registerPackage();
-    addDependency(InInit<KvInit::pyextGraph>::getType());
-    addDependency(InInit<KvInit::pyextInit>::getType());
-    addDependency(InInit<KvInit::appUi>::getType());
-    addDependency(InInit<KvInit::gfx>::getType());
-    addDependency(InInit<KvInit::ui>::getType());
-    addDependency(InInit<KvInit::internalAPI>::getType());
-    addDependency(InInit<KvInit::framework>::getType());
-    addDependency(InInit<KvInit::scriptingAPI>::getType());
-    addDependency(InInit<KvInit::resmgt>::getType());
-    addDependency(InInit<KvInit::pluginAPI>::getType());
-    addDependency(InInit<KvInit::base>::getType());
-}
+KV_PACKAGE(pyextUi, pyextGraph, pyextInit, appUi, gfx, ui, internalAPI, framework, scriptingAPI, resmgt, pluginAPI,
+           base)
 
 template <> void InInit<KvInit::pyextUi>::initPackage()
 {
     InBuildInfoUtil::registerInfo(std::make_unique<LibraryBuildInfo>());
 }
-
-namespace
-{
-
-/// Before every other static object of the module.
-InInit<KvInit::pyextUi> const packageRecord __attribute__((init_priority(101)));
-
-} // namespace
 
 } // namespace Kv
 
