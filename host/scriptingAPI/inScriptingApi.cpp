@@ -5,6 +5,7 @@
 #include "base/inLibraryBuildInfo.h"
 #include "gfx/inGfx.h"
 #include "resmgt/inResmgt.h"
+#include "ui/inUi.h"
 
 #include <memory>
 
@@ -19,6 +20,7 @@ template <> std::type_info const* InInit<KvInit::scriptingAPI>::getType()
 template <> InInit<KvInit::scriptingAPI>::InInit() : InPackageInit("scriptingAPI")
 {
     registerPackage();
+    addDependency(InInit<KvInit::ui>::getType());
     addDependency(InInit<KvInit::gfx>::getType());
     addDependency(InInit<KvInit::resmgt>::getType());
     addDependency(InInit<KvInit::base>::getType());
