@@ -70,8 +70,8 @@ QtWindow::~QtWindow()
 
 void QtWindow::setContentSize(int width, int height)
 {
-    if (QWidget* const content = _content->getNative())
-        content->resize(width, height);
+    if (WindowWidget* const native = getNative())
+        native->setContentSize(width, height);
 }
 
 void QtWindow::show()
