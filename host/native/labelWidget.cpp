@@ -68,6 +68,7 @@ void LabelWidget::enterEvent(QEnterEvent* event)
         return;
     // Only now: what makes a text selectable is costly, and few texts are ever selected in.
     setTextInteractionFlags(Qt::TextSelectableByMouse);
+    setFocusPolicy(Qt::NoFocus);
     setCursor(Qt::IBeamCursor);
     // A selected text is drawn by Qt, from the top of its room: where the lines stand that are seen.
     setContentsMargins({});

@@ -55,7 +55,8 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, std::strin
     WindowWidget* const native = getNative();
     // No screen shows more, and a window system can end the process for it.
     constexpr int maxTitle = 4096;
-    native->setWindowTitle(toQString(title).left(maxTitle));
+    // Doubled, what marks a changed document for Qt stands for itself.
+    native->setWindowTitle(toQString(title).left(maxTitle).replace(QLatin1String("[*]"), QLatin1String("[*][*]")));
     native->setGeometry(frame);
     native->setContent(_content->getNative());
 }
