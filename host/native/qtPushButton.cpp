@@ -77,7 +77,10 @@ private:
     {
         QStyleOptionButton option;
         initStyleOption(&option);
-        return style()->subElementRect(QStyle::SE_PushButtonContents, &option, this);
+        QRect const room = style()->subElementRect(QStyle::SE_PushButtonContents, &option, this);
+        // The edge of the button is none for a text to begin at.
+        constexpr int indent = 6;
+        return _align == NtAlign::Left ? room.adjusted(indent, 0, 0, 0) : room;
     }
 
     TextLines getLines() const { return breakIntoLines(_words, font(), getRoom().size()); }

@@ -26,8 +26,9 @@ namespace
 UiConstraint at(int row, int column, int columns = 1)
 {
     using Edge = UiConstraint::Edge;
-    auto const edge = [](int value, UiConstraint::Target target)
-    { return Edge{static_cast<float>(value), UiConstraint::Pixels, target, {}}; };
+    auto const edge = [](int value, UiConstraint::Target target) {
+        return Edge{static_cast<float>(value), UiConstraint::Pixels, target, {}};
+    };
     return UiConstraint({edge(100 * column, UiConstraint::ParentLow), edge(28 * row, UiConstraint::ParentLow),
                          edge(100 * columns, UiConstraint::OwnOpposite), edge(28, UiConstraint::OwnOpposite)});
 }
@@ -76,12 +77,11 @@ protected:
         return labels;
     }
 
-    RCShdPtr<UiTopLevel> window =
-        UiTopLevel::create("window", "A title",
-                           WsWindowStyleUtils::getNormalWindowStyle({0, 600, 0, 300}, 0, BorderStyle(0),
-                                                                    TitleBarStyle(0), TaskBarStyle(0), StackingStyle(0),
-                                                                    CloseButtonStyle(1)),
-                           nullptr);
+    RCShdPtr<UiTopLevel> window = UiTopLevel::create(
+        "window", "A title",
+        WsWindowStyleUtils::getNormalWindowStyle({0, 600, 0, 300}, 0, BorderStyle(0), TitleBarStyle(0), TaskBarStyle(0),
+                                                 StackingStyle(0), CloseButtonStyle(1)),
+        nullptr);
     RCShdPtr<UiContainer> parent = window->getRootContainer();
 };
 
