@@ -14,6 +14,8 @@ class Ballot:
         self.dialog = ui.createDialog('Votes', xml, 400, 168)
         self.dialog.addCallback('Vote', ui.EventType.STATE, self.onVote)
         self.dialog.addCallback('CloseButton_Send', ui.EventType.ACTIVATE, self.onSend)
+        for name in ('Vote', 'Name', 'Film', 'CloseButton_Send'):
+            self.dialog.setWidgetResourceName(name, 'votes')
         self.enableFields(False)
 
     def enableFields(self, enable):

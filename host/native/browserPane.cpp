@@ -101,10 +101,10 @@ void BrowserPane::makeNames(QString const& name)
 {
     for (auto const& [widget, part] : std::initializer_list<std::pair<QWidget*, char const*>>{
              {_up, ".up"}, {_path, ".path"}, {_list, ".list"}, {_message, ".message"}})
-    {
         widget->setObjectName(name + QLatin1String(part));
-        widget->setAccessibleName(widget->objectName());
-    }
+    _up->setAccessibleName(QStringLiteral("Up"));
+    _path->setAccessibleName(QStringLiteral("Folder"));
+    _list->setAccessibleName(QStringLiteral("Files"));
 }
 
 void BrowserPane::layOut()

@@ -1,5 +1,7 @@
 #include "native/contentArea.h"
 
+#include "native/captions.h"
+
 #include <QPointer>
 
 #include <utility>
@@ -38,6 +40,28 @@ void ContentArea::tellRoom()
             return;
     }
     _telling = false;
+}
+
+void ContentArea::setContentSize(int width, int height)
+{
+    if (!widget())
+        return;
+    widget()->resize(width, height);
+    nameValuesIn(*widget());
+}
+
+void ContentArea::nameValuesSoon()
+{
+    if (!std::exchange(_naming, true))
+        QMetaObject::invokeMethod(
+            this,
+            [this]
+            {
+                _naming = false;
+                if (widget())
+                    nameValuesIn(*widget());
+            },
+            Qt::QueuedConnection);
 }
 
 void ContentArea::resizeEvent(QResizeEvent* event)

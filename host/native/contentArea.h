@@ -17,6 +17,12 @@ public:
     /// Tells the room if it is another than was told last; none is told while the area is hidden.
     void tellRoom();
 
+    /// Gives the content its size, in pixels, once all in it has its place.
+    void setContentSize(int width, int height);
+
+    /// The widgets in the content are called anew by what stands beside them, once the event that is handled is over.
+    void nameValuesSoon();
+
     /// The room is told anew, whatever it was.
     void forgetRoom() { _told = QSize(); }
 
@@ -27,6 +33,7 @@ private:
     std::function<void(int, int)> _onRoom;
     QSize _told;
     bool _telling = false;
+    bool _naming = false;
 };
 
 } // namespace Kv

@@ -1,11 +1,11 @@
 #include "native/floatWidget.h"
 
 #include "native/floatStack.h"
+#include "native/labelWidget.h"
 #include "native/qtFocusOrder.h"
 
 #include <QApplication>
 #include <QKeyEvent>
-#include <QLabel>
 #include <QPainter>
 
 #include <algorithm>
@@ -76,20 +76,20 @@ FloatWidget* FloatWidget::findAround(QWidget& widget)
     return nullptr;
 }
 
+void FloatWidget::setContentSize(int width, int height)
+{
+    if (_area)
+        _area->setContentSize(width, height);
+}
+
 void FloatWidget::pin(QWidget& widget)
 {
     widget.setParent(this);
     widget.show();
     if (_edge)
         _edge->raise();
-    auto* const title = qobject_cast<QLabel*>(&widget);
-    if (!title)
-        return;
-    constexpr int indent = 8;
-    title->setIndent(indent);
-    QFont font = title->font();
-    font.setBold(true);
-    title->setFont(font);
+    if (auto* const title = dynamic_cast<LabelWidget*>(&widget))
+        title->makeTitle();
 }
 
 void FloatWidget::askIntoView(QWidget const& widget) const

@@ -25,6 +25,7 @@ public:
 
     /// Where the widgets in it stand; scrolled where it is larger.
     QWidget* getContent() const { return _area ? _area->widget() : nullptr; }
+    void setContentSize(int width, int height);
 
     /// Keeps a widget of the content in place when that scrolls. A text in it becomes a title.
     void pin(QWidget& widget);

@@ -201,6 +201,7 @@ class NtPushButton : public virtual NtPeer
 {
 public:
     virtual void setText(std::string const& text) = 0;
+    virtual void setAlign(NtAlign align) = 0;
 };
 
 /// What a browser hears. Names and paths are bytes of the file system.

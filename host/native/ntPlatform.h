@@ -78,7 +78,8 @@ public:
     virtual void setCursor(NtCursor cursor) = 0;
 
     /// Makes a window, not yet shown, and its content peer of the name `contentName`. `frame` is where its content goes
-    /// on the screen, in pixels, y growing upward; it is moved and made smaller as far as the screen asks for it.
+    /// on the screen, in pixels, y growing upward; it is moved and made smaller as far as the screen asks for it, and
+    /// larger by the scroll bar that this asks for.
     /// `owner`, which can be null, is the window that it stays above. Throws an `ExBase` that says why and what to set
     /// where windows cannot be shown.
     virtual std::unique_ptr<NtWindow> createWindow(std::string const& name, std::string const& title,

@@ -28,8 +28,8 @@ void QtFloat::raise()
 
 void QtFloat::setContentSize(int width, int height)
 {
-    if (QWidget* const content = getContent())
-        content->resize(width, height);
+    if (FloatWidget* const native = getNative())
+        native->setContentSize(width, height);
 }
 
 QWidget* QtFloat::getContent() const

@@ -17,10 +17,10 @@ namespace
 {
 
 /// A widget and where it stands.
-struct Stop
+struct Place
 {
     QWidget* widget;
-    QRect place;
+    QRect rect;
 };
 
 bool takesFocus(QWidget const& widget)
@@ -29,36 +29,21 @@ bool takesFocus(QWidget const& widget)
            widget.isVisibleTo(widget.window());
 }
 
-std::vector<Stop> findStops(QWidget const& root)
+std::vector<QWidget*> findStops(QWidget const& root)
 {
     QWidget const* const window = root.window();
     // Where the keyboard is now counts also if it cannot stay there: the step goes from there.
     QWidget const* const current = window->focusWidget();
-    std::vector<Stop> stops;
+    std::vector<QWidget*> stops;
     for (QWidget* const widget : root.findChildren<QWidget*>())
         if (widget->window() == window && (widget == current || takesFocus(*widget)))
-            stops.push_back({widget, QRect(widget->mapTo(window, QPoint(0, 0)), widget->size())});
+            stops.push_back(widget);
     return stops;
 }
 
 bool inOneRow(QRect const& a, QRect const& b)
 {
     return 2 * std::abs(a.center().y() - b.center().y()) <= std::min(a.height(), b.height());
-}
-
-/// Sorts from top to bottom, then each row, which its uppermost widget makes, from left to right.
-void sortAsTheEyeGoes(std::vector<Stop>& stops)
-{
-    std::stable_sort(stops.begin(), stops.end(),
-                     [](Stop const& a, Stop const& b) { return a.place.center().y() < b.place.center().y(); });
-    for (auto row = stops.begin(); row != stops.end();)
-    {
-        auto const end =
-            std::find_if_not(row, stops.end(), [&](Stop const& stop) { return inOneRow(row->place, stop.place); });
-        auto const next = end == row ? std::next(row) : end;
-        std::stable_sort(row, next, [](Stop const& a, Stop const& b) { return a.place.x() < b.place.x(); });
-        row = next;
-    }
 }
 
 constexpr char const* valueMark = "kvHoldsValue";
@@ -70,13 +55,31 @@ bool isPushButton(QWidget const& widget)
 
 } // namespace
 
+std::vector<QtFocusOrder::Row> QtFocusOrder::sortIntoRows(std::vector<QWidget*> const& widgets)
+{
+    std::vector<Place> places;
+    places.reserve(widgets.size());
+    for (QWidget* const widget : widgets)
+        places.push_back({widget, QRect(widget->mapTo(widget->window(), QPoint(0, 0)), widget->size())});
+    std::stable_sort(places.begin(), places.end(),
+                     [](Place const& a, Place const& b) { return a.rect.center().y() < b.rect.center().y(); });
+    std::vector<Row> rows;
+    for (auto first = places.begin(); first != places.end();)
+    {
+        auto const end = std::find_if_not(std::next(first), places.end(),
+                                          [&](Place const& place) { return inOneRow(first->rect, place.rect); });
+        std::stable_sort(first, end, [](Place const& a, Place const& b) { return a.rect.x() < b.rect.x(); });
+        Row& row = rows.emplace_back();
+        std::transform(first, end, std::back_inserter(row), [](Place const& place) { return place.widget; });
+        first = end;
+    }
+    return rows;
+}
+
 QtFocusOrder::QtFocusOrder(QWidget const& root) : _root(&root)
 {
-    std::vector<Stop> stops = findStops(root);
-    sortAsTheEyeGoes(stops);
-    _stops.reserve(stops.size());
-    std::transform(stops.begin(), stops.end(), std::back_inserter(_stops),
-                   [](Stop const& stop) { return stop.widget; });
+    for (Row const& row : sortIntoRows(findStops(root)))
+        _stops.insert(_stops.end(), row.begin(), row.end());
 }
 
 bool QtFocusOrder::step(bool next) const

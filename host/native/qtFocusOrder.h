@@ -11,6 +11,11 @@ namespace Kv
 class QtFocusOrder
 {
 public:
+    using Row = std::vector<QWidget*>;
+
+    /// Sorts widgets of one window as they are laid out now. A row is what stands beside its uppermost widget.
+    static std::vector<Row> sortIntoRows(std::vector<QWidget*> const& widgets);
+
     /// The order in a widget as it is laid out now.
     explicit QtFocusOrder(QWidget const& root);
 

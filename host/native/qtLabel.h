@@ -1,9 +1,8 @@
 #pragma once
 
+#include "native/labelWidget.h"
 #include "native/ntPeers.h"
 #include "native/qtPeer.h"
-
-#include <QLabel>
 
 namespace Kv
 {
@@ -12,7 +11,7 @@ namespace Kv
 Qt::Alignment toQtAlignment(NtAlign align);
 
 /// Text as it is, without markup or shortcuts.
-class QtLabel final : public QtPeer<NtLabel, QLabel>
+class QtLabel final : public QtPeer<NtLabel, LabelWidget>
 {
 public:
     /// `parent`, which owns the widget natively, can be null.

@@ -1,5 +1,6 @@
 #include "native/qtMenu.h"
 
+#include "native/longText.h"
 #include "native/qtFocusOrder.h"
 #include "native/qtLabel.h"
 #include "native/qtText.h"
@@ -48,14 +49,20 @@ public:
     }
 
 protected:
+    bool event(QEvent* event) override
+    {
+        if (event->type() == QEvent::ToolTip && fontMetrics().horizontalAdvance(currentText()) > getTextWidth())
+            return showWhole(*this, *event, currentText());
+        return QComboBox::event(event);
+    }
+
     void paintEvent(QPaintEvent*) override
     {
         QStylePainter painter(this);
         QStyleOptionComboBox option;
         initStyleOption(&option);
         painter.drawComplexControl(QStyle::CC_ComboBox, option);
-        QRect const place = style()->subControlRect(QStyle::CC_ComboBox, &option, QStyle::SC_ComboBoxEditField, this);
-        option.currentText = fontMetrics().elidedText(option.currentText, Qt::ElideRight, place.width());
+        option.currentText = fontMetrics().elidedText(option.currentText, Qt::ElideRight, getTextWidth());
         option.textAlignment = toQtAlignment(_align);
         painter.drawControl(QStyle::CE_ComboBoxLabel, option);
     }
@@ -89,6 +96,13 @@ private:
         int const needed = list->sizeHintForColumn(0) + list->verticalScrollBar()->sizeHint().width() + margins.left() +
                            margins.right();
         list->setMinimumWidth(std::min(needed, screen()->availableSize().width()));
+    }
+
+    int getTextWidth() const
+    {
+        QStyleOptionComboBox option;
+        initStyleOption(&option);
+        return style()->subControlRect(QStyle::CC_ComboBox, &option, QStyle::SC_ComboBoxEditField, this).width();
     }
 
     void tellPicked(int index) const

@@ -2,6 +2,7 @@
 
 #include "native/bottomLine.h"
 #include "native/floatWidget.h"
+#include "native/longText.h"
 #include "native/qtFocusOrder.h"
 #include "native/qtGuard.h"
 #include "native/qtPeer.h"
@@ -9,7 +10,6 @@
 #include "native/qtText.h"
 
 #include <QCoreApplication>
-#include <QTextDocument>
 
 #include <algorithm>
 
@@ -32,9 +32,7 @@ QtNative::QtNative(QWidget* widget, std::string const& name, int inset) : _widge
 {
     if (!_widget)
         return;
-    QString const text = toQString(name);
-    _widget->setObjectName(text);
-    _widget->setAccessibleName(text);
+    _widget->setObjectName(toQString(name));
     if (_widget->isWindow())
         return;
     _widget->setGeometry(0, 0, 0, 0);
@@ -79,11 +77,12 @@ void QtNative::setEnabled(bool enabled) const
 
 void QtNative::setTooltip(std::string const& text) const
 {
-    QString tip = toQString(text);
-    if (Qt::mightBeRichText(tip))
-        tip = Qt::convertFromPlainText(tip, Qt::WhiteSpaceNormal);
-    if (QWidget* const widget = get())
-        widget->setToolTip(tip);
+    QWidget* const widget = get();
+    if (!widget)
+        return;
+    QString const tip = toQString(text);
+    widget->setToolTip(toTooltip(tip));
+    widget->setAccessibleDescription(tip);
 }
 
 void QtNative::raise() const

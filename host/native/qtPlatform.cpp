@@ -20,6 +20,7 @@
 #include <QApplication>
 #include <QFontMetricsF>
 #include <QScreen>
+#include <QStyle>
 
 #include <algorithm>
 #include <cmath>
@@ -72,8 +73,14 @@ QRect fitToScreen(GeRectangle<int> const& frame)
         return {frame.xMin, 0, frame.getWidth(), frame.getHeight()};
     QRect const all = screen->geometry();
     QRect const room = screen->availableGeometry();
-    int const width = std::clamp(frame.getWidth(), 1, room.width());
-    int const height = std::clamp(frame.getHeight(), 1, std::max(1, room.height() - titleBarRoom));
+    int const highest = std::max(1, room.height() - titleBarRoom);
+    // The scroll bar of what is cut one way has a place of its own the other way: else it would bring the other bar
+    // too.
+    int const bar = QApplication::style()->pixelMetric(QStyle::PM_ScrollBarExtent);
+    int const barBeside = frame.getHeight() > highest ? bar : 0;
+    int const barBelow = frame.getWidth() > room.width() ? bar : 0;
+    int const width = std::clamp(frame.getWidth() + barBeside, 1, room.width());
+    int const height = std::clamp(frame.getHeight() + barBelow, 1, highest);
     int const x = all.x() + frame.xMin;
     int const y = all.y() + all.height() - frame.yMax;
     return {std::clamp(x, room.x(), room.x() + room.width() - width),

@@ -1,8 +1,12 @@
 #include "native/qtPushButton.h"
 
+#include "native/longText.h"
+#include "native/qtLabel.h"
 #include "native/qtText.h"
 
 #include <QKeyEvent>
+#include <QStyleOptionButton>
+#include <QStylePainter>
 
 namespace Kv
 {
@@ -21,7 +25,38 @@ public:
         connect(this, &QPushButton::clicked, this, [this] { tellPressed(); });
     }
 
+    void setWords(QString const& words)
+    {
+        _words = words;
+        // A lone ampersand would become the mark of a shortcut.
+        setText(QString(words).replace(QLatin1Char('&'), QLatin1String("&&")));
+    }
+
+    void setAlign(NtAlign align)
+    {
+        _align = align;
+        update();
+    }
+
 protected:
+    bool event(QEvent* event) override
+    {
+        if (event->type() == QEvent::ToolTip && getLines().isCut)
+            return showWhole(*this, *event, _words);
+        return QPushButton::event(event);
+    }
+
+    void paintEvent(QPaintEvent*) override
+    {
+        QStylePainter painter(this);
+        QStyleOptionButton option;
+        initStyleOption(&option);
+        option.text.clear();
+        painter.drawControl(QStyle::CE_PushButton, option);
+        painter.drawItemText(getRoom(), static_cast<int>(toQtAlignment(_align)), palette(), isEnabled(),
+                             getLines().lines.join(QLatin1Char('\n')), QPalette::ButtonText);
+    }
+
     void keyPressEvent(QKeyEvent* event) override
     {
         // A key that is held down presses once: what the button opens must not be pressed away again.
@@ -38,7 +73,21 @@ private:
             _handle.tell(&NtPushButtonListener::onPressed);
     }
 
+    QRect getRoom() const
+    {
+        QStyleOptionButton option;
+        initStyleOption(&option);
+        QRect const room = style()->subElementRect(QStyle::SE_PushButtonContents, &option, this);
+        // The edge of the button is none for a text to begin at.
+        constexpr int indent = 6;
+        return _align == NtAlign::Left ? room.adjusted(indent, 0, 0, 0) : room;
+    }
+
+    TextLines getLines() const { return breakIntoLines(_words, font(), getRoom().size()); }
+
     QtListenerHandle<NtPushButtonListener> _handle;
+    QString _words;
+    NtAlign _align = NtAlign::Center;
 };
 
 } // namespace
@@ -61,9 +110,14 @@ QtPushButton::~QtPushButton()
 
 void QtPushButton::setText(std::string const& text)
 {
-    // A lone ampersand would become the mark of a shortcut.
-    if (QPushButton* const button = getNative())
-        button->setText(toQString(text).replace(QLatin1Char('&'), QLatin1String("&&")));
+    if (auto* const button = static_cast<PushButton*>(getNative()))
+        button->setWords(toQString(text));
+}
+
+void QtPushButton::setAlign(NtAlign align)
+{
+    if (auto* const button = static_cast<PushButton*>(getNative()))
+        button->setAlign(align);
 }
 
 } // namespace Kv

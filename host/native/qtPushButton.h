@@ -18,6 +18,7 @@ public:
     ~QtPushButton() override;
 
     void setText(std::string const& text) override;
+    void setAlign(NtAlign align) override;
 
 private:
     QtPushButton(QWidget* parent, std::string const& name, QtListenerHandle<NtPushButtonListener> const& handle);

@@ -57,7 +57,8 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, std::strin
     WindowWidget* const native = getNative();
     // No screen shows more, and a window system can end the process for it.
     constexpr int maxTitle = 4096;
-    native->setWindowTitle(toQString(title).left(maxTitle));
+    // Doubled, what marks a changed document for Qt stands for itself.
+    native->setWindowTitle(toQString(title).left(maxTitle).replace(QLatin1String("[*]"), QLatin1String("[*][*]")));
     // Where the application is a script's own, it has no icon as a rule.
     if (QApplication::windowIcon().isNull())
         native->setWindowIcon(makeWindowIcon());
@@ -75,8 +76,8 @@ QtWindow::~QtWindow()
 
 void QtWindow::setContentSize(int width, int height)
 {
-    if (QWidget* const content = _content->getNative())
-        content->resize(width, height);
+    if (WindowWidget* const native = getNative())
+        native->setContentSize(width, height);
 }
 
 void QtWindow::show()

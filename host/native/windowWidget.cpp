@@ -76,6 +76,12 @@ void WindowWidget::letOthersIn()
         modal->activateWindow();
 }
 
+void WindowWidget::setContentSize(int width, int height)
+{
+    if (_area)
+        _area->setContentSize(width, height);
+}
+
 void WindowWidget::showEvent(QShowEvent* event)
 {
     QWidget::showEvent(event);

@@ -34,6 +34,7 @@ public:
 
     /// Takes the content, which the window scrolls where it is larger.
     void setContent(QWidget* content) { _area->setWidget(content); }
+    void setContentSize(int width, int height);
 
 protected:
     void showEvent(QShowEvent* event) override;

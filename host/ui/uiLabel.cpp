@@ -1,6 +1,5 @@
 #include "ui/uiLabel.h"
 
-#include "gfx/wsFontRegistry.h"
 #include "native/ntPlatform.h"
 #include "ui/uiContainer.h"
 #include "ui/uiWidgetElement.h"
@@ -46,10 +45,7 @@ RttiType const& UiLabel::getRttiType() const
 
 int UiLabel::getLeastWidth() const
 {
-    // A title gives way: it is as wide as what it stands on, and what is too long of it is left out.
-    if (isGrip())
-        return 0;
-    return static_cast<int>(WsFontRegistry::getInstance().getDefaultFont()->getStringWidth(_label.getString().c_str()));
+    return 0;
 }
 
 UiString& UiLabel::getLabel()

@@ -22,7 +22,7 @@ public:
     static RttiType const& getClassType();
     RttiType const& getRttiType() const override;
 
-    /// The width of its text; nothing for one that the pointer moves something by.
+    /// None: what has no room of the text is left out.
     int getLeastWidth() const override;
 
     /// The text on its face.

@@ -30,7 +30,7 @@ void UiPushButton::build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& e
     button->setConstraint(element.getConstraint());
     if (std::optional<std::string> const text = element.takeLabelString())
         button->getLabel().setString(text->c_str());
-    element.takeAlign(NtAlign::Center);
+    button->setAlign(element.takeAlign(NtAlign::Center));
 }
 
 RttiType const& UiPushButton::getClassType()
@@ -41,6 +41,14 @@ RttiType const& UiPushButton::getClassType()
 RttiType const& UiPushButton::getRttiType() const
 {
     return getClassType();
+}
+
+void UiPushButton::setAlign(NtAlign align)
+{
+    requireUiThread();
+    _align = align;
+    if (_native)
+        _native->setAlign(align);
 }
 
 void UiPushButton::press()
@@ -54,6 +62,7 @@ std::unique_ptr<NtPeer> UiPushButton::createPeer(NtPlatform& platform, NtContain
 {
     std::unique_ptr<NtPushButton> peer = platform.createPushButton(parent, getName(), *this);
     peer->setText(_label.getString());
+    peer->setAlign(_align);
     _native = peer.get();
     return peer;
 }

@@ -25,6 +25,9 @@ public:
     /// The text on its face.
     UiString& getLabel() { return _label; }
 
+    /// How the text sits in the widget from left to right.
+    void setAlign(NtAlign align);
+
     /// Does what a click of the user does: nothing where a user could not click.
     void press();
 
@@ -39,6 +42,7 @@ private:
     void onPressed() override { press(); }
 
     UiString _label;
+    NtAlign _align = NtAlign::Center;
     NtPushButton* _native = nullptr;
 };
 

@@ -7,6 +7,7 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
+#include <utility>
 #include <vector>
 
 namespace Kv
@@ -26,29 +27,35 @@ fs::path installedFolder()
     return fs::path(info.dli_fname).parent_path() / "../resources/tooltips";
 }
 
-std::vector<fs::path> candidatesFor(fs::path const& name)
+std::function<std::string()>& scriptFolder()
 {
-    std::vector<fs::path> bases{name};
-    if (!name.has_parent_path())
-        bases.push_back(installedFolder() / name);
-    std::vector<fs::path> candidates;
-    for (fs::path const& base : bases)
-    {
-        candidates.push_back(base);
-        candidates.push_back(fs::path(base) += ".xml");
-    }
-    return candidates;
+    static std::function<std::string()> find = [] { return std::string(); };
+    return find;
+}
+
+/// Where a resource can lie, the extension left open.
+std::vector<fs::path> placesOf(fs::path const& name)
+{
+    if (name.has_parent_path())
+        return {name};
+    std::string const beside = scriptFolder()();
+    std::vector<fs::path> places{installedFolder() / name};
+    if (!beside.empty())
+        places.push_back(fs::path(beside) / name);
+    return places;
 }
 
 std::optional<fs::path> findFile(std::string const& resourceName)
 {
     if (!resourceName.empty())
-        for (fs::path const& candidate : candidatesFor(resourceName))
-        {
-            std::error_code error;
-            if (fs::is_regular_file(candidate, error))
-                return candidate;
-        }
+        for (fs::path const& place : placesOf(resourceName))
+            for (char const* const extension : {".xml", ""})
+            {
+                fs::path const candidate = fs::path(place) += extension;
+                std::error_code error;
+                if (fs::is_regular_file(candidate, error))
+                    return candidate;
+            }
     return std::nullopt;
 }
 
@@ -88,6 +95,11 @@ UiResTable UiResTable::load(std::string const& resourceName)
             throw ExBase(__FILE__, __LINE__, "Tooltip resource " + file->string() + ": " + error.getReason());
         }
     return table;
+}
+
+void UiResTable::setScriptFolder(std::function<std::string()> find)
+{
+    scriptFolder() = std::move(find);
 }
 
 std::optional<std::string> UiResTable::findTooltip(std::string const& widgetName) const

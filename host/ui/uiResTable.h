@@ -2,6 +2,7 @@
 
 #include "base/kvExport.h"
 
+#include <functional>
 #include <optional>
 #include <string>
 #include <unordered_map>
@@ -14,10 +15,13 @@ namespace Kv
 class KV_API UiResTable
 {
 public:
-    /// Reads the resource of that name: a path, or a bare name that is looked for in the application's folder of
-    /// tooltips, each with or without the extension ".xml". One that is not there gives an empty table. Throws an
-    /// `ExBase` with file and line for a file that is no tooltip resource.
+    /// Reads the resource of that name: a path, or a bare name, which is looked for in the application's folder of
+    /// tooltips and then beside the script; each with the extension ".xml" and then without it. One that is not there
+    /// gives an empty table. Throws an `ExBase` with file and line for a file that is no tooltip resource.
     static UiResTable load(std::string const& resourceName);
+
+    /// `find` gives the folder of the script that runs; empty if there is none.
+    static void setScriptFolder(std::function<std::string()> find);
 
     std::optional<std::string> findTooltip(std::string const& widgetName) const;
 

@@ -123,9 +123,8 @@ public:
     std::string const& getTooltip() const { return _tooltip; }
     void setTooltip(std::string const& text);
 
-    /// Loads the tooltips of a resource and gives the widget the one under its name. The resource is a path, or a bare
-    /// name to be found in the application's folder of tooltips, with or without extension. One that is not there, or
-    /// does not name the widget, is no error and changes nothing.
+    /// Gives the widget the tooltip that a resource has under its name; `UiResTable::load` tells how that is found. One
+    /// that is not there, or does not name the widget, is no error and changes nothing.
     static void setWidgetResTable(RCShdPtr<UiWidget> const& widget, std::string const& resourceName);
 
     /// What others have attached to the widget, in the order in which it came. An array, borrowed, valid until more is
@@ -157,9 +156,6 @@ protected:
 
     /// The widget has been put above its siblings.
     virtual void cameToFront() {}
-
-    /// True if the pointer moves something by the widget.
-    bool isGrip() const { return _pointerCallbacks.operator bool(); }
 
     /// A point of the window, in pixels, with y growing downward, as one with y growing upward.
     GeVector2<int> turnOver(int x, int y) const;

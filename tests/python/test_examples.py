@@ -39,12 +39,13 @@ def test_the_demo_plays_itself_where_there_is_no_display_and_leaves_pictures(tmp
 
 
 def test_a_vote_needs_the_box_and_a_name(patient, capsys):
-    patient.plan(lambda user: user.click('CloseButton_Send'), lambda user: user.click('Vote'),
+    tips = []
+    patient.plan(lambda user: tips.append(user.find('Vote').toolTip()), lambda user: user.click('CloseButton_Send'), lambda user: user.click('Vote'),
                  lambda user: user.click('CloseButton_Send'), lambda user: user.close(),
                  lambda user: user.click('Name'), lambda user: user.type('Ada'),
                  lambda user: user.click('CloseButton_Send'))
     run('votes.py')
-    assert capsys.readouterr().out == 'Ada votes for The Long Take.\n'
+    assert capsys.readouterr().out == 'Ada votes for The Long Take.\n' and tips[0]
 
 
 def test_a_review_is_sent_with_its_note(patient, capsys):

@@ -175,8 +175,8 @@ Example::
     xml = ui.makeXmlFromWidgetList( [ ( 'ToggleButton', 'Vote', 'Do you vote ?' ) ], [ 'OK', 'Cancel' ] )
     dialog = ui.createDialog( 'MyDialog', xml, 400, 84 )
     dialog.addCallback( 'Vote', ui.EventType.ACTIVATE, myCallbackFunction1 )
-    dialog.launch()
-    print( dialog.getValues() ))";
+    if dialog.launch() == 'CloseButton_OK':
+        print( dialog.getValues() ))";
 
 constexpr char const* launch =
     R"(Shows the dialog and blocks until one of its close buttons is pressed. It can be launched any number of times; its
