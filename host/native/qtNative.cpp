@@ -11,6 +11,7 @@
 #include <QTextDocument>
 
 #include <algorithm>
+#include <utility>
 
 namespace Kv
 {
@@ -102,16 +103,15 @@ void QtNative::setBackground(NtColor const& color) const
     widget->setAutoFillBackground(true);
 }
 
-void QtNative::setLineBelow(bool drawn) const
+void QtNative::setLineBelow(bool drawn)
 {
     QWidget* const widget = get();
     if (!widget)
         return;
-    auto* const line = widget->findChild<BottomLine*>(QString(), Qt::FindDirectChildrenOnly);
-    if (drawn && !line)
-        makeNative<BottomLine>(widget);
+    if (drawn && !_line)
+        _line = makeNative<BottomLine>(widget);
     else if (!drawn)
-        QtGuard::getInstance().destroy(line);
+        QtGuard::getInstance().destroy(std::exchange(_line, nullptr));
 }
 
 void QtNative::setPointerListener(NtPointerListener& listener)

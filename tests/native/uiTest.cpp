@@ -1,6 +1,7 @@
 #include "base/exBase.h"
 #include "gfx/wsCursorRegistry.h"
 #include "ui/piWidget.h"
+#include "ui/uiColorRegistry.h"
 #include "ui/uiContainer.h"
 #include "ui/uiCursorGuard.h"
 #include "ui/uiDualState.h"
@@ -8,6 +9,10 @@
 #include "ui/uiMenu.h"
 #include "ui/uiTextField.h"
 #include "ui/uiTopLevel.h"
+
+#include <QApplication>
+#include <QLabel>
+#include <QPointer>
 
 #include <functional>
 #include <gtest/gtest.h>
@@ -206,6 +211,21 @@ TEST(UiContainer, IsTakenDownFromTheScreenWithoutAnEvent)
     // Whoever owned the handlers may be gone with the parent.
     toggle->setState(false, true);
     EXPECT_TRUE(heard.empty());
+}
+
+TEST(UiContainer, KeepsWhatStandsInItWhenItGetsAColour)
+{
+    RCShdPtr<UiTopLevel> const window = makeWindow();
+    RCShdPtr<UiContainer> const panel = UiContainer::create(window->getRootContainer(), "panel", nullptr);
+    RCShdPtr<UiLabel> const label = UiLabel::create(panel, "label", nullptr);
+    window->show();
+    QPointer<QLabel> const native = QApplication::activeModalWidget()->findChild<QLabel*>("label");
+    panel->setColor(UiWidget::BackgroundColor, UiColorRegistry::getInstance().getColor(UiColorRegistry::Grey65));
+    EXPECT_TRUE(native && native->isVisible());
+    panel->setFrame(makeShd<UiFrameLineBottom>(), UiWidget::DefaultFrame);
+    panel->setFrame(nullptr, UiWidget::DefaultFrame);
+    EXPECT_TRUE(native && native->isVisible());
+    window->hide();
 }
 
 TEST(UiCursorGuard, GivesTheCursorBackAlsoOnTheWayOutOfAnException)
