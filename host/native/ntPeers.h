@@ -33,12 +33,13 @@ struct NtForeignWidget
 };
 
 /// What a widget hears of the pointer: its moves and the left button, also outside of the widget for as long as the
-/// button that was pressed on it is down. In pixels of the window, y growing downward.
+/// button that was pressed on it is down. In pixels of the window, y growing downward. The release can go elsewhere:
+/// then the next move tells that the button is up.
 class NtPointerListener
 {
 public:
     virtual ~NtPointerListener() = default;
-    virtual void onPointerMoved(int x, int y) = 0;
+    virtual void onPointerMoved(int x, int y, bool isButtonDown) = 0;
     virtual void onPointerDown(int x, int y) = 0;
     virtual void onPointerUp(int x, int y) = 0;
 };

@@ -81,6 +81,13 @@ void UiMoveContainer::show()
 }
 
 void UiMoveContainer::arm(EvPointerButtonDownEvent const& event)
+void UiMoveContainer::display(bool displayed)
+{
+    if (!displayed)
+        _drag.reset();
+    UiContainer::display(displayed);
+}
+
 {
     if (RCShdPtr<UiContainer> const parent = getParent())
         parent->front(this);
@@ -98,6 +105,8 @@ void UiMoveContainer::mmove(EvPointerMoveEvent const& event)
 }
 
 void UiMoveContainer::disarm(EvPointerButtonUpEvent const&)
+    if (!event.isButtonDown())
+        _drag.reset();
 {
     _drag.reset();
 }
@@ -105,7 +114,10 @@ void UiMoveContainer::disarm(EvPointerButtonUpEvent const&)
 void UiMoveContainer::followInputLevel(int level)
 {
     _inputLevel = std::min(_inputLevel, level);
-    setBlocked(_inputLevel < level);
+    bool const isBlocked = _inputLevel < level;
+    if (isBlocked)
+        _drag.reset();
+    setBlocked(isBlocked);
 }
 
 std::unique_ptr<NtPeer> UiMoveContainer::createPeer(NtPlatform& platform, NtContainer& parent)

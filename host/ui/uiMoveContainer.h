@@ -33,9 +33,11 @@ public:
 
     GeRectangle<int> getFrame() const override;
     void setRect(GeRectangle<int> const& rect, bool layOut) override;
+    void display(bool displayed) override;
     void show() override;
 
-    /// Brings the container to the front and begins to move it with the pointer.
+    /// Brings the container to the front and begins to move it with the pointer. That ends with the release of the
+    /// button, wherever that goes, and once the container is hidden or takes no input any more.
     void arm(EvPointerButtonDownEvent const& event) override;
     void mmove(EvPointerMoveEvent const& event) override;
     void disarm(EvPointerButtonUpEvent const& event) override;
