@@ -102,10 +102,16 @@ void FloatWidget::askIntoView(QWidget const& widget) const
         _handle.tell(&NtFloatListener::onMoveWanted, right, down);
 }
 
-QEvent::Type FloatWidget::getHiddenEvent()
+void FloatWidget::resumeKeyboard()
 {
-    static auto const type = static_cast<QEvent::Type>(QEvent::registerEventType());
-    return type;
+    // Qt remembers that for every widget with others in it.
+    QWidget* const last = focusWidget();
+    if (last && last != this && QtFocusOrder::canHold(*last))
+        last->setFocus(Qt::OtherFocusReason);
+    else if (QWidget* const first = QtFocusOrder(*this).getFirst())
+        QtFocusOrder::give(*first, Qt::TabFocusReason);
+    else
+        setFocus(Qt::OtherFocusReason);
 }
 
 void FloatWidget::showEvent(QShowEvent* event)
@@ -124,8 +130,7 @@ void FloatWidget::hideEvent(QHideEvent* event)
         return;
     if (_area)
         _area->forgetRoom();
-    QEvent hidden(getHiddenEvent());
-    QCoreApplication::sendEvent(window(), &hidden);
+    FloatStack::getInstance().settleKeyboard(*window());
 }
 
 void FloatWidget::moveEvent(QMoveEvent* event)

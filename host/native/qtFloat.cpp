@@ -2,6 +2,8 @@
 
 #include "native/floatStack.h"
 
+#include <QStyle>
+
 namespace Kv
 {
 
@@ -24,6 +26,12 @@ void QtFloat::raise()
 {
     if (FloatWidget* const native = getNative())
         FloatStack::getInstance().bringToFront(*native);
+}
+
+void QtFloat::resumeKeyboard()
+{
+    if (FloatWidget* const native = getNative())
+        native->resumeKeyboard();
 }
 
 void QtFloat::setContentSize(int width, int height)

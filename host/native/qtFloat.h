@@ -17,6 +17,7 @@ public:
 
     void raise() override;
     void focusFirst() override { focusFirstInContent(); }
+    void resumeKeyboard() override;
     void setContentSize(int width, int height) override;
     QWidget* getContent() const override;
 

@@ -25,8 +25,7 @@ struct Stop
 
 bool takesFocus(QWidget const& widget)
 {
-    return (widget.focusPolicy() & Qt::TabFocus) && !widget.focusProxy() && widget.isEnabled() &&
-           widget.isVisibleTo(widget.window());
+    return (widget.focusPolicy() & Qt::TabFocus) && !widget.focusProxy() && QtFocusOrder::canHold(widget);
 }
 
 std::vector<Stop> findStops(QWidget const& root)
@@ -117,6 +116,11 @@ void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
     for (QWidget* parent = widget.parentWidget(); parent; parent = parent->parentWidget())
         if (auto* const area = qobject_cast<QScrollArea*>(parent))
             area->ensureWidgetVisible(&widget);
+bool QtFocusOrder::canHold(QWidget const& widget)
+{
+    return widget.isEnabled() && widget.isVisibleTo(widget.window());
+}
+
     if (FloatWidget const* const floating = FloatWidget::findAround(widget))
         floating->askIntoView(widget);
 }

@@ -91,8 +91,8 @@ void UiMoveContainer::display(bool displayed)
 {
     if (RCShdPtr<UiContainer> const parent = getParent())
         parent->front(this);
-    if (!hasKeyboard())
-        focusFirst();
+    if (_float && !hasKeyboard())
+        _float->resumeKeyboard();
     _drag = Drag{event.getPosition(), getRect()};
 }
 
