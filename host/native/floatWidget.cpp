@@ -80,6 +80,8 @@ void FloatWidget::pin(QWidget& widget)
 {
     widget.setParent(this);
     widget.show();
+    if (_area)
+        _area->setCover(widget);
     if (_edge)
         _edge->raise();
     auto* const title = qobject_cast<QLabel*>(&widget);
@@ -95,9 +97,10 @@ void FloatWidget::pin(QWidget& widget)
 void FloatWidget::askIntoView(QWidget const& widget) const
 {
     QWidget const* const room = parentWidget();
-    QPoint const place = widget.mapTo(room, QPoint(0, 0));
-    int const right = getShift(place.x(), widget.width(), room->width());
-    int const down = getShift(place.y(), widget.height(), room->height());
+    // What is scrolled out of sight comes by no move.
+    QRect const seen = rect().intersected({widget.mapTo(this, QPoint(0, 0)), widget.size()}).translated(pos());
+    int const right = getShift(seen.x(), seen.width(), room->width());
+    int const down = getShift(seen.y(), seen.height(), room->height());
     if (right != 0 || down != 0)
         _handle.tell(&NtFloatListener::onMoveWanted, right, down);
 }

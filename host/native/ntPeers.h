@@ -119,6 +119,9 @@ public:
 
     /// Size of the content in pixels.
     virtual void setContentSize(int width, int height) = 0;
+
+    /// How much room a scroll bar takes beside the content, in pixels.
+    virtual int getBarThickness() const = 0;
 };
 
 /// What a container hears whose place the application's own window decides.

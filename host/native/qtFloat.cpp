@@ -40,6 +40,12 @@ void QtFloat::setContentSize(int width, int height)
         content->resize(width, height);
 }
 
+int QtFloat::getBarThickness() const
+{
+    FloatWidget const* const native = getNative();
+    return native ? native->style()->pixelMetric(QStyle::PM_ScrollBarExtent, nullptr, native) : 0;
+}
+
 QWidget* QtFloat::getContent() const
 {
     FloatWidget const* const native = getNative();

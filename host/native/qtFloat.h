@@ -19,6 +19,7 @@ public:
     void focusFirst() override { focusFirstInContent(); }
     void resumeKeyboard() override;
     void setContentSize(int width, int height) override;
+    int getBarThickness() const override;
     QWidget* getContent() const override;
 
 private:

@@ -67,6 +67,16 @@ bool holdsValue(QWidget const* widget)
     return widget->property(valueMark).toBool();
 }
 
+/// Scrolls a widget into view; of one that is larger than the room, its beginning.
+void reveal(QScrollArea& area, QWidget const& widget)
+{
+    // So much of what is around it is seen too: a row of it above and below, and the title that lies over the content.
+    constexpr QSize margin(7, 56);
+    QSize const half = widget.size().boundedTo(area.viewport()->size() / 2) / 2;
+    QPoint const middle = widget.mapTo(area.widget(), QPoint(half.width(), half.height()));
+    area.ensureVisible(middle.x(), middle.y(), half.width() + margin.width(), half.height() + margin.height());
+}
+
 bool isPushButton(QWidget const* widget)
 {
     return qobject_cast<QPushButton const*>(widget);
@@ -106,6 +116,11 @@ QWidget* QtFocusOrder::getFirst() const
     return nullptr;
 }
 
+bool QtFocusOrder::canHold(QWidget const& widget)
+{
+    return widget.isEnabled() && widget.isVisibleTo(widget.window());
+}
+
 void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
 {
     widget.setFocus(reason);
@@ -115,12 +130,7 @@ void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
         field->selectAll();
     for (QWidget* parent = widget.parentWidget(); parent; parent = parent->parentWidget())
         if (auto* const area = qobject_cast<QScrollArea*>(parent))
-            area->ensureWidgetVisible(&widget);
-bool QtFocusOrder::canHold(QWidget const& widget)
-{
-    return widget.isEnabled() && widget.isVisibleTo(widget.window());
-}
-
+            reveal(*area, widget);
     if (FloatWidget const* const floating = FloatWidget::findAround(widget))
         floating->askIntoView(widget);
 }

@@ -7,6 +7,7 @@
 #include "ui/uiDualState.h"
 #include "ui/uiLabel.h"
 #include "ui/uiMenu.h"
+#include "ui/uiMoveContainer.h"
 #include "ui/uiTextField.h"
 #include "ui/uiTopLevel.h"
 
@@ -225,6 +226,24 @@ TEST(UiContainer, KeepsWhatStandsInItWhenItGetsAColour)
     panel->setFrame(makeShd<UiFrameLineBottom>(), UiWidget::DefaultFrame);
     panel->setFrame(nullptr, UiWidget::DefaultFrame);
     EXPECT_TRUE(native && native->isVisible());
+    window->hide();
+}
+
+TEST(UiMoveContainer, StandsWhereItIsToldToAlsoWhereItsParentIsSmaller)
+{
+    RCShdPtr<UiTopLevel> const window = makeWindow();
+    RCShdPtr<UiContainer> const root = window->getRootContainer();
+    RCShdPtr<UiMoveContainer> const floating = UiMoveContainer::create(root, "floating", nullptr);
+    RCShdPtr<UiLabel> const label = UiLabel::create(floating, "label", nullptr);
+    label->setConstraint(row(edge(0, UiConstraint::ParentHigh)));
+    window->show();
+    GeRectangle<int> const large{-50, 250, -60, 90};
+    floating->setRect(large, true);
+    EXPECT_EQ(floating->getRect(), large);
+    EXPECT_EQ(label->getRect().getWidth(), large.getWidth());
+    floating->arm(EvPointerButtonDownEvent({20, 20}));
+    floating->mmove(EvPointerMoveEvent({30, 20}, true));
+    EXPECT_EQ(floating->getRect(), large);
     window->hide();
 }
 
