@@ -88,11 +88,22 @@ bool QtMainWindow::eventFilter(QObject* watched, QEvent* event)
     return QObject::eventFilter(watched, event);
 }
 
-void QtMainWindow::onFocusChanged(QWidget* to) const
+void QtMainWindow::onFocusChanged(QWidget* to)
 {
     QWidget const* const native = _content.getNative();
-    if (to && to != native && to->window() == native && !FloatWidget::findAround(*to))
+    if (!to)
+        // Later: Qt is in the middle of taking it from what is disabled.
+        QMetaObject::invokeMethod(
+            this, [this] { replaceLostHolder(); }, Qt::QueuedConnection);
+    else if (to != native && to->window() == native && !FloatWidget::findAround(*to))
         FloatStack::getInstance().rememberOwn(*to);
+}
+
+void QtMainWindow::replaceLostHolder() const
+{
+    QWidget* const native = _content.getNative();
+    if (native && native->isActiveWindow() && !native->focusWidget())
+        FloatStack::getInstance().settleKeyboard(*native);
 }
 
 QWidget* QtMainWindow::findHolder() const

@@ -34,7 +34,9 @@ public:
 
 private:
     void tellSize() const;
-    void onFocusChanged(QWidget* to) const;
+    void onFocusChanged(QWidget* to);
+    /// Gives the keyboard to another where Qt has taken it from its holder and given it to nobody.
+    void replaceLostHolder() const;
     /// The float, or the widget of the application's own, that has the keyboard whenever the window has it.
     QWidget* findHolder() const;
 

@@ -312,7 +312,7 @@ def states():
     """What of the application takes input, and what does so of the dialogs."""
     main = stage.APPLICATION
     own = [main.menuBar(), main.findChild(QTreeView, 'Browser.list'), main.findChild(QWidget, 'compositions')]
-    return [widget.isEnabled() for widget in own], {stage.title_of(one): one.isEnabled() for one in stage.dialogs()}
+    return [widget.isEnabled() for widget in own], {stage.title_of(one): one.isEnabled() for one in stage.floating()}
 
 
 def test_the_application_takes_no_input_during_a_run_and_is_afterwards_as_before(patient):
@@ -331,7 +331,7 @@ def test_the_application_takes_no_input_during_a_run_and_is_afterwards_as_before
 
     def disturb(user):
         seen.append(states())
-        beneath = {stage.title_of(one): one for one in stage.dialogs()}['bystander']
+        beneath = {stage.title_of(one): one for one in stage.floating()}['bystander']
         QTest.mouseClick(beneath.findChild(QWidget, 'Button'), Qt.MouseButton.LeftButton)
         QTest.keyClick(files, Qt.Key.Key_Down)
 
@@ -366,6 +366,15 @@ def test_when_a_dialog_goes_the_front_most_has_the_keyboard_where_it_was(user):
     for gone, holder in ('Text', holders['Menu']), ('Menu', holders['Toggle']), ('Toggle', files):
         del dialogs[gone]
         assert QApplication.focusWidget() is holder
+
+
+def test_the_keyboard_stays_in_a_dialog_whose_callback_disables_what_had_it_and_all_around_it(user):
+    dialog = make_dialog()
+    dialog.addCallback('Text', ui.EventType.VALUE_CHANGED,
+                       lambda given, *_: given.enableWidget('UserDefinedWidgetsContainer', False))
+    user.plan(lambda user: (user.type('a'), user.press(Qt.Key.Key_Return)),
+              lambda user: QTest.keyClick(QApplication.focusWidget() or stage.APPLICATION, Qt.Key.Key_Escape))
+    assert dialog.launch() == 'CloseButton_Cancel'
 
 
 def test_a_dialog_made_in_a_callback_is_usable_while_the_outer_one_runs(patient):
