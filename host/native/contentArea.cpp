@@ -3,7 +3,9 @@
 #include "native/captions.h"
 
 #include <QPointer>
+#include <QScrollBar>
 
+#include <algorithm>
 #include <utility>
 
 namespace Kv
@@ -15,6 +17,9 @@ namespace
 /// How often a layout may make scroll bars come and go before it is left as it is.
 constexpr int maxRounds = 4;
 
+/// Height of a row of a form, in pixels.
+constexpr int rowHeight = 28;
+
 } // namespace
 
 ContentArea::ContentArea(QWidget* parent, std::function<void(int, int)> onRoom)
@@ -23,6 +28,7 @@ ContentArea::ContentArea(QWidget* parent, std::function<void(int, int)> onRoom)
     setFrameShape(QFrame::NoFrame);
     // Tab stops at widgets only.
     setFocusPolicy(Qt::NoFocus);
+    connect(verticalScrollBar(), &QScrollBar::actionTriggered, this, [this](int action) { turnPage(action); });
 }
 
 void ContentArea::tellRoom()
@@ -68,6 +74,18 @@ void ContentArea::resizeEvent(QResizeEvent* event)
 {
     QScrollArea::resizeEvent(event);
     tellRoom();
+}
+
+void ContentArea::turnPage(int action)
+{
+    if (action != QScrollBar::SliderPageStepAdd && action != QScrollBar::SliderPageStepSub)
+        return;
+    // Qt has turned it by all that it shows of the content. What was covered, or a row that was cut off, would be
+    // passed over.
+    int const covered = _cover && !_cover->isHidden() ? _cover->height() : 0;
+    QScrollBar& bar = *verticalScrollBar();
+    int const step = std::max(bar.pageStep() - covered - rowHeight, bar.singleStep());
+    bar.setSliderPosition(bar.value() + (action == QScrollBar::SliderPageStepAdd ? step : -step));
 }
 
 } // namespace Kv

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QPointer>
 #include <QScrollArea>
 
 #include <functional>
@@ -26,12 +27,18 @@ public:
     /// The room is told anew, whatever it was.
     void forgetRoom() { _told = QSize(); }
 
+    /// `cover`, borrowed, is not in the content, and lies over the upper edge of what is seen of that.
+    void setCover(QWidget& cover) { _cover = &cover; }
+
 protected:
     void resizeEvent(QResizeEvent* event) override;
 
 private:
+    void turnPage(int action);
+
     std::function<void(int, int)> _onRoom;
     QSize _told;
+    QPointer<QWidget> _cover;
     bool _telling = false;
     bool _naming = false;
 };

@@ -1,5 +1,8 @@
 #include "native/floatStack.h"
 
+#include "native/floatWidget.h"
+#include "native/qtFocusOrder.h"
+
 #include <QRegion>
 
 #include <algorithm>
@@ -18,6 +21,12 @@ QRect getVisibleRect(QWidget const& floating)
     return seen.translated(parent.mapTo(floating.window(), QPoint(0, 0)));
 }
 
+/// Null for what is no float, or gone.
+FloatWidget* toFloat(QWidget* widget)
+{
+    return dynamic_cast<FloatWidget*>(widget);
+}
+
 } // namespace
 
 FloatStack& FloatStack::getInstance()
@@ -27,33 +36,77 @@ FloatStack& FloatStack::getInstance()
     return *stack;
 }
 
-void FloatStack::bringToFront(QWidget& floating)
+void FloatStack::bringToFront(FloatWidget& floating)
 {
     floating.raise();
-    _floats.erase(std::remove(_floats.begin(), _floats.end(), &floating), _floats.end());
-    _floats.push_back(&floating);
+    forget(floating);
+    _places.emplace_back(&floating);
     cutHoles();
 }
 
-void FloatStack::remove(QWidget& floating)
+void FloatStack::remove(FloatWidget& floating)
 {
-    _floats.erase(std::remove(_floats.begin(), _floats.end(), &floating), _floats.end());
+    forget(floating);
     cutHoles();
+}
+
+void FloatStack::rememberOwn(QWidget& holder)
+{
+    for (QPointer<QWidget> const& place : _places)
+        if (place && !toFloat(place) && place->window() == holder.window())
+        {
+            forget(*place);
+            break;
+        }
+    _places.emplace_back(&holder);
 }
 
 void FloatStack::cutHoles() const
 {
-    for (auto lower = _floats.begin(); lower != _floats.end(); ++lower)
+    for (auto lower = _places.begin(); lower != _places.end(); ++lower)
     {
-        QWidget const* const window = (*lower)->parentWidget();
-        if (!window->isWindow())
+        FloatWidget* const floating = toFloat(*lower);
+        QWidget const* const window = floating ? floating->parentWidget() : nullptr;
+        if (!window || !window->isWindow())
             continue;
         QRegion hole;
-        for (auto upper = lower + 1; upper != _floats.end(); ++upper)
-            if ((*upper)->isVisible() && (*upper)->window() == window && (*upper)->parentWidget() != window)
-                hole += getVisibleRect(**upper);
-        cutHole(**lower, hole);
+        for (auto place = lower + 1; place != _places.end(); ++place)
+            if (FloatWidget const* const upper = toFloat(*place);
+                upper && upper->isVisible() && upper->window() == window && upper->parentWidget() != window)
+                hole += getVisibleRect(*upper);
+        cutHole(*floating, hole);
     }
+}
+
+bool FloatStack::giveKeyboard(QWidget* place)
+{
+    if (!place || !QtFocusOrder::canHold(*place))
+        return false;
+    if (FloatWidget* const floating = toFloat(place))
+        floating->resumeKeyboard();
+    else
+        place->setFocus(Qt::OtherFocusReason);
+    return true;
+}
+
+void FloatStack::settleKeyboard(QWidget& window) const
+{
+    QWidget const* const holder = window.focusWidget();
+    if (holder && holder != &window && QtFocusOrder::canHold(*holder))
+        return;
+    // A copy: who gets the keyboard comes to the front.
+    std::vector<QPointer<QWidget>> const places = _places;
+    auto const takesIt = [&window](QPointer<QWidget> const& place)
+    { return place && place->window() == &window && giveKeyboard(place); };
+    if (std::find_if(places.rbegin(), places.rend(), takesIt) == places.rend())
+        window.setFocus(Qt::OtherFocusReason);
+}
+
+void FloatStack::forget(QWidget const& widget)
+{
+    _places.erase(std::remove_if(_places.begin(), _places.end(),
+                                 [&widget](QPointer<QWidget> const& place) { return !place || place == &widget; }),
+                  _places.end());
 }
 
 void FloatStack::cutHole(QWidget& floating, QRegion const& hole)

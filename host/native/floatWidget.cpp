@@ -86,6 +86,8 @@ void FloatWidget::pin(QWidget& widget)
 {
     widget.setParent(this);
     widget.show();
+    if (_area)
+        _area->setCover(widget);
     if (_edge)
         _edge->raise();
     if (auto* const title = dynamic_cast<LabelWidget*>(&widget))
@@ -95,17 +97,24 @@ void FloatWidget::pin(QWidget& widget)
 void FloatWidget::askIntoView(QWidget const& widget) const
 {
     QWidget const* const room = parentWidget();
-    QPoint const place = widget.mapTo(room, QPoint(0, 0));
-    int const right = getShift(place.x(), widget.width(), room->width());
-    int const down = getShift(place.y(), widget.height(), room->height());
+    // What is scrolled out of sight comes by no move.
+    QRect const seen = rect().intersected({widget.mapTo(this, QPoint(0, 0)), widget.size()}).translated(pos());
+    int const right = getShift(seen.x(), seen.width(), room->width());
+    int const down = getShift(seen.y(), seen.height(), room->height());
     if (right != 0 || down != 0)
         _handle.tell(&NtFloatListener::onMoveWanted, right, down);
 }
 
-QEvent::Type FloatWidget::getHiddenEvent()
+void FloatWidget::resumeKeyboard()
 {
-    static auto const type = static_cast<QEvent::Type>(QEvent::registerEventType());
-    return type;
+    // Qt remembers that for every widget with others in it.
+    QWidget* const last = focusWidget();
+    if (last && last != this && QtFocusOrder::canHold(*last))
+        last->setFocus(Qt::OtherFocusReason);
+    else if (QWidget* const first = QtFocusOrder(*this).getFirst())
+        QtFocusOrder::give(*first, Qt::TabFocusReason);
+    else
+        setFocus(Qt::OtherFocusReason);
 }
 
 void FloatWidget::showEvent(QShowEvent* event)
@@ -124,8 +133,7 @@ void FloatWidget::hideEvent(QHideEvent* event)
         return;
     if (_area)
         _area->forgetRoom();
-    QEvent hidden(getHiddenEvent());
-    QCoreApplication::sendEvent(window(), &hidden);
+    FloatStack::getInstance().settleKeyboard(*window());
 }
 
 void FloatWidget::moveEvent(QMoveEvent* event)

@@ -5,15 +5,14 @@
 #include "native/qtListenerHandle.h"
 #include "native/qtStage.h"
 
-#include <QEvent>
 #include <QPointer>
 #include <QWidget>
 
 namespace Kv
 {
 
-/// The toolkit's side of a floating container: has a ground and an edge of its own, walks the keyboard through the
-/// widgets in it, passes on Escape, and tells its window when it is hidden.
+/// Qt's side of a floating container: has a ground and an edge of its own, walks the keyboard through the widgets in
+/// it, remembers which of them had it, and passes on Escape.
 class FloatWidget final : public QWidget, public QtStage
 {
 public:
@@ -33,8 +32,8 @@ public:
     /// Asks to be moved so that a widget in it is seen.
     void askIntoView(QWidget const& widget) const;
 
-    /// The type of the event that a window gets when a float in it has been hidden.
-    static QEvent::Type getHiddenEvent();
+    /// Gives the keyboard to the widget in it that had it last, else to the one that has it first.
+    void resumeKeyboard();
 
 protected:
     void showEvent(QShowEvent* event) override;

@@ -34,12 +34,13 @@ struct NtForeignWidget
 };
 
 /// What a widget hears of the pointer: its moves and the left button, also outside of the widget for as long as the
-/// button that was pressed on it is down. In pixels of the window, y growing downward.
+/// button that was pressed on it is down. In pixels of the window, y growing downward. The release can go elsewhere:
+/// then the next move tells that the button is up.
 class NtPointerListener
 {
 public:
     virtual ~NtPointerListener() = default;
-    virtual void onPointerMoved(int x, int y) = 0;
+    virtual void onPointerMoved(int x, int y, bool isButtonDown) = 0;
     virtual void onPointerDown(int x, int y) = 0;
     virtual void onPointerUp(int x, int y) = 0;
 };
@@ -111,13 +112,20 @@ public:
     virtual void onFirstTurn() = 0;
 };
 
-/// Floats above its siblings and keeps Tab within itself. The keyboard goes back to where it was when it is hidden.
-/// Where the content is larger, the user can scroll it.
+/// Floats above its siblings and keeps Tab within itself. When it is hidden, the keyboard goes to the front-most that
+/// takes input, a float or what else had it, and there to the widget that had it last. Where the content is larger, the
+/// user can scroll it.
 class NtFloat : public NtContainer
 {
 public:
+    /// Gives the keyboard to the widget in it that had it last, else as `focusFirst` does.
+    virtual void resumeKeyboard() = 0;
+
     /// Size of the content in pixels.
     virtual void setContentSize(int width, int height) = 0;
+
+    /// How much room a scroll bar takes beside the content, in pixels.
+    virtual int getBarThickness() const = 0;
 };
 
 /// What a container hears whose place the application's own window decides.
@@ -281,7 +289,7 @@ class NtMainWindow : public NtWindow
 {
 public:
     /// Keeps input from what is the application's own in the window, but not from what the host has in it, until
-    /// `admitInput`, which also gives the keyboard back to the widget that had it.
+    /// `admitInput`. Nobody has the keyboard after the first; after the second the front-most that takes input has it.
     virtual void refuseInput() = 0;
     virtual void admitInput() = 0;
 };

@@ -2,6 +2,8 @@
 
 #include "native/floatStack.h"
 
+#include <QStyle>
+
 namespace Kv
 {
 
@@ -26,10 +28,22 @@ void QtFloat::raise()
         FloatStack::getInstance().bringToFront(*native);
 }
 
+void QtFloat::resumeKeyboard()
+{
+    if (FloatWidget* const native = getNative())
+        native->resumeKeyboard();
+}
+
 void QtFloat::setContentSize(int width, int height)
 {
     if (FloatWidget* const native = getNative())
         native->setContentSize(width, height);
+}
+
+int QtFloat::getBarThickness() const
+{
+    FloatWidget const* const native = getNative();
+    return native ? native->style()->pixelMetric(QStyle::PM_ScrollBarExtent, nullptr, native) : 0;
 }
 
 QWidget* QtFloat::getContent() const

@@ -17,7 +17,9 @@ public:
 
     void raise() override;
     void focusFirst() override { focusFirstInContent(); }
+    void resumeKeyboard() override;
     void setContentSize(int width, int height) override;
+    int getBarThickness() const override;
     QWidget* getContent() const override;
 
 private:

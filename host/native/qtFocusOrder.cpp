@@ -25,8 +25,7 @@ struct Place
 
 bool takesFocus(QWidget const& widget)
 {
-    return (widget.focusPolicy() & Qt::TabFocus) && !widget.focusProxy() && widget.isEnabled() &&
-           widget.isVisibleTo(widget.window());
+    return (widget.focusPolicy() & Qt::TabFocus) && !widget.focusProxy() && QtFocusOrder::canHold(widget);
 }
 
 std::vector<QWidget*> findStops(QWidget const& root)
@@ -51,6 +50,16 @@ constexpr char const* valueMark = "kvHoldsValue";
 bool isPushButton(QWidget const& widget)
 {
     return qobject_cast<QPushButton const*>(&widget);
+}
+
+/// Scrolls a widget into view; of one that is larger than the room, its beginning.
+void reveal(QScrollArea& area, QWidget const& widget)
+{
+    // So much of what is around it is seen too: a row of it above and below, and the title that lies over the content.
+    constexpr QSize margin(7, 56);
+    QSize const half = widget.size().boundedTo(area.viewport()->size() / 2) / 2;
+    QPoint const middle = widget.mapTo(area.widget(), QPoint(half.width(), half.height()));
+    area.ensureVisible(middle.x(), middle.y(), half.width() + margin.width(), half.height() + margin.height());
 }
 
 } // namespace
@@ -111,6 +120,11 @@ QWidget* QtFocusOrder::getFirst() const
     return nullptr;
 }
 
+bool QtFocusOrder::canHold(QWidget const& widget)
+{
+    return widget.isEnabled() && widget.isVisibleTo(widget.window());
+}
+
 void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
 {
     widget.setFocus(reason);
@@ -120,7 +134,7 @@ void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
         field->selectAll();
     for (QWidget* parent = widget.parentWidget(); parent; parent = parent->parentWidget())
         if (auto* const area = qobject_cast<QScrollArea*>(parent))
-            area->ensureWidgetVisible(&widget);
+            reveal(*area, widget);
     if (FloatWidget const* const floating = FloatWidget::findAround(widget))
         floating->askIntoView(widget);
 }

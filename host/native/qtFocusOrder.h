@@ -32,6 +32,9 @@ public:
     /// The first widget that holds a value, else the first push button, else null.
     QWidget* getFirst() const;
 
+    /// True for a widget that takes input whenever its window is on the screen.
+    static bool canHold(QWidget const& widget);
+
     /// Gives a widget the keyboard as Tab would, and scrolls it into view.
     static void give(QWidget& widget, Qt::FocusReason reason);
 

@@ -1,5 +1,6 @@
 #include "native/qtMainWindow.h"
 
+#include "native/floatStack.h"
 #include "native/floatWidget.h"
 #include "native/qtGuard.h"
 #include "native/qtInputDrop.h"
@@ -58,9 +59,13 @@ void QtMainWindow::flushInput()
 
 void QtMainWindow::refuseInput()
 {
-    QWidget const* const native = _content.getNative();
-    _holders.emplace_back(native ? native->focusWidget() : nullptr);
-    if (native && _holders.size() == 1)
+    QWidget* const native = _content.getNative();
+    _holders.emplace_back(findHolder());
+    if (!native)
+        return;
+    // Qt would look for another holder, and the float would forget this one.
+    native->setFocus(Qt::OtherFocusReason);
+    if (_holders.size() == 1)
         _enableOwn(false);
 }
 
@@ -68,36 +73,49 @@ void QtMainWindow::admitInput()
 {
     QtErrorAside const aside;
     QPointer<QWidget> const holder = _holders.back();
-    if (_content.getNative() && _holders.size() == 1)
-        _enableOwn(true);
     _holders.pop_back();
-    giveKeyboard(holder);
+    QWidget* const native = _content.getNative();
+    if (!native)
+        return;
+    if (_holders.empty())
+        _enableOwn(true);
+    if (!FloatStack::giveKeyboard(holder))
+        FloatStack::getInstance().settleKeyboard(*native);
 }
 
 bool QtMainWindow::eventFilter(QObject* watched, QEvent* event)
 {
     if (event->type() == QEvent::Resize)
         tellSize();
-    else if (event->type() == FloatWidget::getHiddenEvent())
-        giveKeyboard(static_cast<QWidget*>(watched)->focusWidget());
     return QObject::eventFilter(watched, event);
 }
 
 void QtMainWindow::onFocusChanged(QWidget* to)
 {
-    // While input is refused the toolkit moves the keyboard on its own.
-    if (to && _holders.empty() && to->window() == _content.getNative() && !FloatWidget::findAround(*to))
-        _home = to;
+    QWidget const* const native = _content.getNative();
+    if (!to)
+        // Later: Qt is in the middle of taking it from what is disabled.
+        QMetaObject::invokeMethod(
+            this, [this] { replaceLostHolder(); }, Qt::QueuedConnection);
+    else if (to != native && to->window() == native && !FloatWidget::findAround(*to))
+        FloatStack::getInstance().rememberOwn(*to);
 }
 
-void QtMainWindow::giveKeyboard(QWidget* holder) const
+void QtMainWindow::replaceLostHolder() const
 {
-    for (QWidget* const candidate : {holder, _home.data()})
-        if (candidate && candidate->isEnabled() && candidate->isVisibleTo(candidate->window()))
-        {
-            candidate->setFocus(Qt::OtherFocusReason);
-            return;
-        }
+    QWidget* const native = _content.getNative();
+    if (native && native->isActiveWindow() && !native->focusWidget())
+        FloatStack::getInstance().settleKeyboard(*native);
+}
+
+QWidget* QtMainWindow::findHolder() const
+{
+    QWidget const* const native = _content.getNative();
+    QWidget* const holder = native ? native->focusWidget() : nullptr;
+    if (!holder || holder == native)
+        return nullptr;
+    FloatWidget* const floating = FloatWidget::findAround(*holder);
+    return floating ? floating : holder;
 }
 
 void QtMainWindow::tellSize() const

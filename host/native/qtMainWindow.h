@@ -35,15 +35,14 @@ public:
 private:
     void tellSize() const;
     void onFocusChanged(QWidget* to);
-    /// Gives the keyboard to one who can have it.
-    void giveKeyboard(QWidget* holder) const;
+    /// Gives the keyboard to another where Qt has taken it from its holder and given it to nobody.
+    void replaceLostHolder() const;
+    /// The float, or the widget of the application's own, that has the keyboard whenever the window has it.
+    QWidget* findHolder() const;
 
     QtListenerHandle<NtWindowListener> _handle;
     QtAdoptedContainer _content;
     std::function<void(bool)> _enableOwn;
-
-    /// Who of the application's own had the keyboard last.
-    QPointer<QWidget> _home;
 
     /// Who had the keyboard each time that input was refused.
     std::vector<QPointer<QWidget>> _holders;

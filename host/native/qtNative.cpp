@@ -12,6 +12,7 @@
 #include <QCoreApplication>
 
 #include <algorithm>
+#include <utility>
 
 namespace Kv
 {
@@ -104,16 +105,15 @@ void QtNative::setBackground(NtColor const& color) const
     widget->setAutoFillBackground(true);
 }
 
-void QtNative::setLineBelow(bool drawn) const
+void QtNative::setLineBelow(bool drawn)
 {
     QWidget* const widget = get();
     if (!widget)
         return;
-    auto* const line = widget->findChild<BottomLine*>(QString(), Qt::FindDirectChildrenOnly);
-    if (drawn && !line)
-        makeNative<BottomLine>(widget);
+    if (drawn && !_line)
+        _line = makeNative<BottomLine>(widget);
     else if (!drawn)
-        QtGuard::getInstance().destroy(line);
+        QtGuard::getInstance().destroy(std::exchange(_line, nullptr));
 }
 
 void QtNative::setPointerListener(NtPointerListener& listener)

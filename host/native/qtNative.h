@@ -42,7 +42,7 @@ public:
     void setTooltip(std::string const& text) const;
     void raise() const;
     void setBackground(NtColor const& color) const;
-    void setLineBelow(bool drawn) const;
+    void setLineBelow(bool drawn);
     void setPointerListener(NtPointerListener& listener);
     void takeKeyboard() const;
     bool hasKeyboard() const;
@@ -53,6 +53,7 @@ private:
     int _inset = 0;
     bool _foreign = false;
     std::unique_ptr<QtPointerWatch> _pointerWatch;
+    QPointer<QWidget> _line;
 };
 
 } // namespace Kv

@@ -19,31 +19,32 @@ QtPointerWatch::~QtPointerWatch()
 bool QtPointerWatch::eventFilter(QObject* watched, QEvent* event)
 {
     auto const& widget = static_cast<QWidget const&>(*watched);
-    auto const isLeft = [event] { return static_cast<QMouseEvent const*>(event)->button() == Qt::LeftButton; };
+    auto const mouse = [event]() -> QMouseEvent const& { return static_cast<QMouseEvent const&>(*event); };
+    auto const isLeft = [&mouse] { return mouse().button() == Qt::LeftButton; };
     switch (event->type())
     {
     case QEvent::MouseMove:
-        tell(&NtPointerListener::onPointerMoved, widget, static_cast<QMouseEvent const&>(*event));
+        tell(&NtPointerListener::onPointerMoved, widget, mouse(), mouse().buttons().testFlag(Qt::LeftButton));
         return true;
     case QEvent::MouseButtonPress:
     case QEvent::MouseButtonDblClick:
         if (isLeft())
-            tell(&NtPointerListener::onPointerDown, widget, static_cast<QMouseEvent const&>(*event));
+            tell(&NtPointerListener::onPointerDown, widget, mouse());
         return true;
     case QEvent::MouseButtonRelease:
         if (isLeft())
-            tell(&NtPointerListener::onPointerUp, widget, static_cast<QMouseEvent const&>(*event));
+            tell(&NtPointerListener::onPointerUp, widget, mouse());
         return true;
     default:
         return false;
     }
 }
 
-void QtPointerWatch::tell(void (NtPointerListener::*what)(int, int), QWidget const& widget,
-                          QMouseEvent const& event) const
+template <typename Method, typename... Args>
+void QtPointerWatch::tell(Method what, QWidget const& widget, QMouseEvent const& event, Args const&... args) const
 {
     QPoint const place = widget.window()->mapFromGlobal(event.globalPosition().toPoint());
-    _handle.tell(what, place.x(), place.y());
+    _handle.tell(what, place.x(), place.y(), args...);
 }
 
 } // namespace Kv

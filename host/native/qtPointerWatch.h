@@ -22,7 +22,9 @@ public:
     bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
-    void tell(void (NtPointerListener::*what)(int, int), QWidget const& widget, QMouseEvent const& event) const;
+    /// Calls a member function of the listener with the place of the event, and what it wants besides.
+    template <typename Method, typename... Args>
+    void tell(Method what, QWidget const& widget, QMouseEvent const& event, Args const&... args) const;
 
     QtListenerHandle<NtPointerListener> _handle;
 };

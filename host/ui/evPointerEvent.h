@@ -24,7 +24,16 @@ private:
 class EvPointerMoveEvent : public EvPointerEvent
 {
 public:
-    explicit EvPointerMoveEvent(GeVector2<int> const& position) : EvPointerEvent(PiWidget::PointerMove, position) {}
+    EvPointerMoveEvent(GeVector2<int> const& position, bool isButtonDown)
+        : EvPointerEvent(PiWidget::PointerMove, position), _buttonDown(isButtonDown)
+    {
+    }
+
+    /// Whether the left button is down.
+    bool isButtonDown() const { return _buttonDown; }
+
+private:
+    bool _buttonDown;
 };
 
 /// The left button has been pressed.

@@ -6,6 +6,7 @@
 #include "ui/uiWindow.h"
 
 #include <algorithm>
+#include <tuple>
 
 namespace Kv
 {
@@ -16,6 +17,12 @@ namespace
 // What of a container always stays within reach, in pixels: so much of its width, and so much of it below its top edge.
 constexpr int gripWidth = 48;
 constexpr int gripHeight = 24;
+
+/// The number within the limits that is nearest; the upper limit wins where they leave nothing.
+int keepWithin(int number, int low, int high)
+{
+    return std::min(std::max(number, low), high);
+}
 
 } // namespace
 
@@ -54,24 +61,31 @@ RttiType const& UiMoveContainer::getRttiType() const
 
 void UiMoveContainer::follow(UiContainer const& parent, GeRectangle<int> const& before)
 {
-    GeRectangle<int> const& now = parent.getRect();
-    GeVector2<int> const by{now.xMin - before.xMin, now.yMax - before.yMax};
     for (RCShdPtr<UiWidget> const& child : parent.getChildren())
         if (auto* const floating = dynamic_cast<UiMoveContainer*>(child.get()))
-            floating->setRect(floating->getMoved(floating->getRect(), by), true);
+            floating->setRect(floating->getFollowing(parent.getRect(), before), true);
 }
 
 GeRectangle<int> UiMoveContainer::getFrame() const
 {
-    GeRectangle<int> const& rect = getRect();
-    return {rect.xMin, rect.xMin + _contentSize.x, rect.yMax - _contentSize.y, rect.yMax};
+    GeRectangle<int> const cell = getCell();
+    return {cell.xMin, cell.xMin + _contentSize.x, cell.yMax - _contentSize.y, cell.yMax};
 }
 
 void UiMoveContainer::setRect(GeRectangle<int> const& rect, bool layOut)
 {
-    if (rect.getWidth() != getRect().getWidth() || rect.getHeight() != getRect().getHeight())
+    GeRectangle<int> const before = getCell();
+    GeRectangle<int> const now = getShown(rect);
+    if (now.getWidth() != before.getWidth() || now.getHeight() != before.getHeight())
         _room.reset();
     UiContainer::setRect(rect, layOut);
+}
+
+void UiMoveContainer::display(bool displayed)
+{
+    if (!displayed)
+        _drag.reset();
+    UiContainer::display(displayed);
 }
 
 void UiMoveContainer::show()
@@ -84,13 +98,15 @@ void UiMoveContainer::arm(EvPointerButtonDownEvent const& event)
 {
     if (RCShdPtr<UiContainer> const parent = getParent())
         parent->front(this);
-    if (!hasKeyboard())
-        focusFirst();
+    if (_float && !hasKeyboard())
+        _float->resumeKeyboard();
     _drag = Drag{event.getPosition(), getRect()};
 }
 
 void UiMoveContainer::mmove(EvPointerMoveEvent const& event)
 {
+    if (!event.isButtonDown())
+        _drag.reset();
     if (!_drag)
         return;
     GeVector2<int> const& now = event.getPosition();
@@ -105,7 +121,10 @@ void UiMoveContainer::disarm(EvPointerButtonUpEvent const&)
 void UiMoveContainer::followInputLevel(int level)
 {
     _inputLevel = std::min(_inputLevel, level);
-    setBlocked(_inputLevel < level);
+    bool const isBlocked = _inputLevel < level;
+    if (isBlocked)
+        _drag.reset();
+    setBlocked(isBlocked);
 }
 
 std::unique_ptr<NtPeer> UiMoveContainer::createPeer(NtPlatform& platform, NtContainer& parent)
@@ -130,7 +149,10 @@ bool UiMoveContainer::takesInput() const
 
 void UiMoveContainer::layOutChildren()
 {
-    GeVector2<int> const room = _room.value_or(GeVector2<int>{getRect().getWidth(), getRect().getHeight()});
+    GeVector2<int> const given{getRect().getWidth(), getRect().getHeight()};
+    GeVector2<int> room = _room.value_or(given);
+    if (!(getCell() == getRect()))
+        room = {std::max(room.x, given.x), std::max(room.y, given.y)};
     _contentSize = room;
     UiContainer::layOutChildren();
     GeVector2<int> const overflow = UiLayout::measureOverflow(*this);
@@ -150,16 +172,52 @@ void UiMoveContainer::cameToFront()
     setBlocked(false);
 }
 
+GeRectangle<int> UiMoveContainer::getShown(GeRectangle<int> const& rect) const
+{
+    GeRectangle<int> const room = getParent() ? getParent()->getRect() : rect;
+    bool const isWide = rect.getWidth() > room.getWidth();
+    bool const isHigh = rect.getHeight() > room.getHeight();
+    GeRectangle<int> shown = rect;
+    // A scroll bar stands beside what it was given, if it can: else it would bring the other bar too.
+    int const bar = _float ? _float->getBarThickness() : 0;
+    if (isWide && rect.getHeight() + bar <= room.getHeight())
+        shown.yMin -= bar;
+    if (isHigh && rect.getWidth() + bar <= room.getWidth())
+        shown.xMax += bar;
+    if (isWide)
+        std::tie(shown.xMin, shown.xMax) = std::tie(room.xMin, room.xMax);
+    if (isHigh)
+        std::tie(shown.yMin, shown.yMax) = std::tie(room.yMin, room.yMax);
+    return shown;
+}
+
 GeRectangle<int> UiMoveContainer::getMoved(GeRectangle<int> const& rect, GeVector2<int> const& by) const
 {
     GeRectangle<int> const room = getParent() ? getParent()->getRect() : rect;
     int const width = rect.getWidth();
     int const height = rect.getHeight();
     int const grip = std::min(gripWidth, width);
-    int const left = std::min(std::max(rect.xMin + by.x, room.xMin + grip - width), room.xMax - grip);
-    int const highest = std::max(room.yMax, room.yMin + height);
-    int const top = std::min(std::max(rect.yMax + by.y, room.yMin + gripHeight), highest);
+    int left = rect.xMin;
+    if (width <= room.getWidth())
+        left = keepWithin(left + by.x, room.xMin + grip - width, room.xMax - grip);
+    int top = rect.yMax;
+    if (height <= room.getHeight())
+        top = keepWithin(top + by.y, room.yMin + gripHeight, room.yMax);
     return {left, left + width, top - height, top};
+}
+
+GeRectangle<int> UiMoveContainer::getFollowing(GeRectangle<int> const& now, GeRectangle<int> const& before) const
+{
+    int const width = getRect().getWidth();
+    int const height = getRect().getHeight();
+    int left = getRect().xMin + now.xMin - before.xMin;
+    int top = getRect().yMax + now.yMax - before.yMax;
+    // The user has seen it from edge to edge, and still does where there is room for that now.
+    if (width > before.getWidth() && width <= now.getWidth())
+        left = keepWithin(left, now.xMin, now.xMax - width);
+    if (height > before.getHeight() && height <= now.getHeight())
+        top = keepWithin(top, now.yMin + height, now.yMax);
+    return getMoved({left, left + width, top - height, top}, {0, 0});
 }
 
 void UiMoveContainer::onPointerMoved(EvEvent& event)

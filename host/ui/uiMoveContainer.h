@@ -11,9 +11,9 @@ namespace Kv
 {
 
 /// Container that floats above its siblings and that the user moves: by the widgets whose pointer events its owner
-/// forwards to it, and by all of it that is no widget for input. It stands where it is told to; dragged, it can show
-/// each of its edges and cannot be lost. Escape in it presses the button that it does in a window. What needs more room
-/// than it has scrolls.
+/// forwards to it, and by all of it that is no widget for input. It stands where it is told to; dragged, it cannot be
+/// lost. Where it is wider or higher than its parent, it fills that on the screen, and scrolls. So does what needs more
+/// room than it has. Escape in it presses the button that it does in a window.
 ///
 /// One that nobody but its parent owns goes with the next turn of the loop: its maker has failed.
 class KV_API UiMoveContainer : public UiContainer, private NtFloatListener
@@ -33,9 +33,11 @@ public:
 
     GeRectangle<int> getFrame() const override;
     void setRect(GeRectangle<int> const& rect, bool layOut) override;
+    void display(bool displayed) override;
     void show() override;
 
-    /// Brings the container to the front and begins to move it with the pointer.
+    /// Brings the container to the front and begins to move it with the pointer. That ends with the release of the
+    /// button, wherever that goes, and once the container is hidden or takes no input any more.
     void arm(EvPointerButtonDownEvent const& event) override;
     void mmove(EvPointerMoveEvent const& event) override;
     void disarm(EvPointerButtonUpEvent const& event) override;
@@ -53,6 +55,7 @@ protected:
     /// Not any more once nobody but its parent owns it: who it would call is gone.
     bool takesInput() const override;
 
+    GeRectangle<int> getCell() const override { return getShown(getRect()); }
     void layOutChildren() override;
     void cameToFront() override;
 
@@ -63,8 +66,15 @@ private:
         GeRectangle<int> rect;
     };
 
-    /// The rectangle moved by so many pixels, y growing upward, as far as it stays within reach.
+    /// What the screen has of it when it stands at `rect`: where it is larger than the parent, all of that.
+    GeRectangle<int> getShown(GeRectangle<int> const& rect) const;
+
+    /// The rectangle moved by so many pixels, y growing upward, as far as it stays within reach. One that fills its
+    /// parent does not move.
     GeRectangle<int> getMoved(GeRectangle<int> const& rect, GeVector2<int> const& by) const;
+
+    /// The rectangle after the parent has gone from `before` to `now`.
+    GeRectangle<int> getFollowing(GeRectangle<int> const& now, GeRectangle<int> const& before) const;
 
     void onPointerMoved(EvEvent& event);
     void onPointerDown(EvEvent& event);

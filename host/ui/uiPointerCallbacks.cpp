@@ -12,9 +12,9 @@ void UiPointerCallbacks::clear()
     _upCb = nullptr;
 }
 
-void UiPointerCallbacks::onPointerMoved(int x, int y)
+void UiPointerCallbacks::onPointerMoved(int x, int y, bool isButtonDown)
 {
-    run<EvPointerMoveEvent>(_moveCb, x, y);
+    run<EvPointerMoveEvent>(_moveCb, x, y, isButtonDown);
 }
 
 void UiPointerCallbacks::onPointerDown(int x, int y)
@@ -27,13 +27,14 @@ void UiPointerCallbacks::onPointerUp(int x, int y)
     run<EvPointerButtonUpEvent>(_upCb, x, y);
 }
 
-template <typename Event> void UiPointerCallbacks::run(CbHandler<EvEvent>* handler, int x, int y) const
+template <typename Event, typename... Args>
+void UiPointerCallbacks::run(CbHandler<EvEvent>* handler, int x, int y, Args const&... args) const
 {
     if (!handler || !_widget->takesInput())
         return;
     // What the handler does may end the widget, and with it these.
     RCShdPtr<UiWidget> const keeper(_widget);
-    Event event(_widget->turnOver(x, y));
+    Event event(_widget->turnOver(x, y), args...);
     handler->call(event);
 }
 

@@ -22,12 +22,13 @@ public:
     /// Forgets the handlers.
     void clear();
 
-    void onPointerMoved(int x, int y) override;
+    void onPointerMoved(int x, int y, bool isButtonDown) override;
     void onPointerDown(int x, int y) override;
     void onPointerUp(int x, int y) override;
 
 private:
-    template <typename Event> void run(CbHandler<EvEvent>* handler, int x, int y) const;
+    template <typename Event, typename... Args>
+    void run(CbHandler<EvEvent>* handler, int x, int y, Args const&... args) const;
 
     UiWidget* _widget;
     CbHandler<EvEvent>* _moveCb = nullptr;

@@ -256,7 +256,8 @@ void UiWidget::placePeer()
     if (!_peer || !_parent)
         return;
     GeRectangle<int> const parent = _parent->getFrame();
-    _peer->setCell(_rect.xMin - parent.xMin, parent.yMax - _rect.yMax, _rect.getWidth(), _rect.getHeight());
+    GeRectangle<int> const cell = getCell();
+    _peer->setCell(cell.xMin - parent.xMin, parent.yMax - cell.yMax, cell.getWidth(), cell.getHeight());
 }
 
 void UiWidget::enablePeer()

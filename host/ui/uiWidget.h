@@ -154,6 +154,9 @@ protected:
     /// Lets the native peer go. A widget that points to it forgets it first.
     virtual void dropPeer();
 
+    /// Where the native peer stands in the window, in pixels, y growing upward.
+    virtual GeRectangle<int> getCell() const { return _rect; }
+
     /// The widget has been put above its siblings.
     virtual void cameToFront() {}
 

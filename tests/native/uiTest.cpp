@@ -1,13 +1,19 @@
 #include "base/exBase.h"
 #include "gfx/wsCursorRegistry.h"
 #include "ui/piWidget.h"
+#include "ui/uiColorRegistry.h"
 #include "ui/uiContainer.h"
 #include "ui/uiCursorGuard.h"
 #include "ui/uiDualState.h"
 #include "ui/uiLabel.h"
 #include "ui/uiMenu.h"
+#include "ui/uiMoveContainer.h"
 #include "ui/uiTextField.h"
 #include "ui/uiTopLevel.h"
+
+#include <QApplication>
+#include <QLabel>
+#include <QPointer>
 
 #include <functional>
 #include <gtest/gtest.h>
@@ -206,6 +212,39 @@ TEST(UiContainer, IsTakenDownFromTheScreenWithoutAnEvent)
     // Whoever owned the handlers may be gone with the parent.
     toggle->setState(false, true);
     EXPECT_TRUE(heard.empty());
+}
+
+TEST(UiContainer, KeepsWhatStandsInItWhenItGetsAColour)
+{
+    RCShdPtr<UiTopLevel> const window = makeWindow();
+    RCShdPtr<UiContainer> const panel = UiContainer::create(window->getRootContainer(), "panel", nullptr);
+    RCShdPtr<UiLabel> const label = UiLabel::create(panel, "label", nullptr);
+    window->show();
+    QPointer<QLabel> const native = QApplication::activeModalWidget()->findChild<QLabel*>("label");
+    panel->setColor(UiWidget::BackgroundColor, UiColorRegistry::getInstance().getColor(UiColorRegistry::Grey65));
+    EXPECT_TRUE(native && native->isVisible());
+    panel->setFrame(makeShd<UiFrameLineBottom>(), UiWidget::DefaultFrame);
+    panel->setFrame(nullptr, UiWidget::DefaultFrame);
+    EXPECT_TRUE(native && native->isVisible());
+    window->hide();
+}
+
+TEST(UiMoveContainer, StandsWhereItIsToldToAlsoWhereItsParentIsSmaller)
+{
+    RCShdPtr<UiTopLevel> const window = makeWindow();
+    RCShdPtr<UiContainer> const root = window->getRootContainer();
+    RCShdPtr<UiMoveContainer> const floating = UiMoveContainer::create(root, "floating", nullptr);
+    RCShdPtr<UiLabel> const label = UiLabel::create(floating, "label", nullptr);
+    label->setConstraint(row(edge(0, UiConstraint::ParentHigh)));
+    window->show();
+    GeRectangle<int> const large{-50, 250, -60, 90};
+    floating->setRect(large, true);
+    EXPECT_EQ(floating->getRect(), large);
+    EXPECT_EQ(label->getRect().getWidth(), large.getWidth());
+    floating->arm(EvPointerButtonDownEvent({20, 20}));
+    floating->mmove(EvPointerMoveEvent({30, 20}, true));
+    EXPECT_EQ(floating->getRect(), large);
+    window->hide();
 }
 
 TEST(UiCursorGuard, GivesTheCursorBackAlsoOnTheWayOutOfAnException)

@@ -386,3 +386,54 @@ def test_a_dialog_is_dragged_by_its_title_filled_in_by_keys_and_closed_where_it_
     assert application.communicate()[0] == (
         "[('CloseButtonClicked', 'CloseButton_OK'), ('Show', 'Oscars'), ('Win', True)]\n")
     assert application.returncode == 0
+
+
+def test_a_box_gives_the_keyboard_back_a_drag_ends_and_a_long_form_is_scrolled_to_its_buttons(desk, tmp_path):
+    write(tmp_path, form='''
+        import stage
+        from quorvane_velmora import ui
+        from PyQt6.QtCore import QPoint, QTimer
+        from PyQt6.QtWidgets import QWidget
+        panel = stage.APPLICATION.findChild(QWidget, 'mainPanel')
+        place = panel.mapToGlobal(QPoint(0, 0))
+        print(place.x(), place.y(), panel.width(), panel.height(), flush=True)
+        dialog = ui.createDialog('Form', ui.makeXmlFromWidgetList([('TextField', 'Show')], ['OK', 'Cancel']), 400, 200)
+        dialog.addCallback('Show', ui.EventType.VALUE_CHANGED, lambda *_: print(
+            ui.showMessageBox('Box', ['Really?'], ['Yes', 'No']), flush=True))
+        window, = stage.dialogs()
+        def tell_when_it_runs():
+            QTimer.singleShot(0, lambda: print('runs', flush=True))
+        for _ in range(3):
+            tell_when_it_runs()
+            print(dialog.launch(), dialog.getValue('Show'), window.x(), window.y(), flush=True)
+        del dialog, window
+        tell_when_it_runs()
+        print(ui.showSimpleDialog('Long', [('TextField', 'row %d' % row) for row in range(60)], 400)['row 0'])
+        ''')
+    def await_run():
+        assert application.stdout.readline() == 'runs\n'
+
+    application = desk.start(PROGRAM, '--exit', str(tmp_path / 'form.py'))
+    left, top, width, height = map(int, application.stdout.readline().split())
+    desk.wait_for_window('Velmora')
+    x, y = width // 2 - 200, height - (height // 2 - 100) - 225
+    await_run()
+    desk.run('type', 'Os')
+    desk.run('key', 'Return', 'Tab', 'Return')
+    assert application.stdout.readline() == 'No\n'
+    desk.run('type', 'cars')
+    desk.run('key', 'Escape')
+    assert application.stdout.readline() == 'CloseButton_Cancel Oscars %d %d\n' % (x, y)
+    await_run()
+    title = left + x + 200, top + y + 13
+    desk.run('mousemove', *title, 'mousedown', 1, 'mousemove', title[0] + 20, title[1] + 10, 'key', 'Escape')
+    assert application.stdout.readline() == 'CloseButton_Cancel Oscars %d %d\n' % (x + 20, y + 10)
+    await_run()
+    desk.run('mousemove', title[0] + 40, title[1] + 15, 'mouseup', 1, 'mousemove', title[0] + 70, title[1] + 5)
+    desk.run('key', 'Escape')
+    assert application.stdout.readline() == 'CloseButton_Cancel Oscars %d %d\n' % (x + 20, y + 10)
+    await_run()
+    desk.run('type', 'first')
+    desk.run('click', '--repeat', 60, 5)
+    desk.click(left + x + 49, top + height - 21)
+    assert application.communicate()[0] == 'first\n' and application.returncode == 0

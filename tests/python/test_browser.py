@@ -188,6 +188,27 @@ def test_a_callback_can_open_a_browser_and_a_dialog_of_its_own(user, files):
 
 
 @pytest.mark.inside
+def test_the_keyboard_is_in_the_list_again_after_the_callback_has_asked(user, files):
+    calls = []
+
+    def refuse(focus, _):
+        calls.append(os.path.basename(focus))
+        with user.meanwhile(lambda inner: inner.press(Qt.Key.Key_Return)):
+            ui.showMessageBox('Not that one', ['?'])
+        return ''
+
+    def press(key):
+        def pressed(user):
+            assert user.focus() == 'Browser.list'
+            user.press(key)
+        return pressed
+
+    assert browse(user, pick('frame', Qt.Key.Key_Return), press(Qt.Key.Key_Down), press(Qt.Key.Key_Return),
+                  press(Qt.Key.Key_Escape), initialPath=files, pathValidationCb=refuse) == ''
+    assert calls == ['frame.0001.exr', 'notes.txt']
+
+
+@pytest.mark.inside
 def test_what_the_callback_opens_is_seen_above_it_and_then_goes(user, files):
     seen = []
 

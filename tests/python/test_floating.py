@@ -4,12 +4,12 @@ import pytest
 
 import stage
 from callback_tools import listen, make_dialog
-from descriptions import close_button, container
+from descriptions import close_button, container, widget
 from quorvane_velmora import ui
 from PyQt6.QtCore import QEvent, QPoint, QPointF, QRect, Qt
-from PyQt6.QtGui import QGuiApplication, QMouseEvent
+from PyQt6.QtGui import QGuiApplication, QMouseEvent, QWheelEvent
 from PyQt6.QtTest import QTest
-from PyQt6.QtWidgets import QApplication, QFrame, QLabel, QScrollBar, QTreeView, QWidget
+from PyQt6.QtWidgets import QApplication, QFrame, QLabel, QScrollBar, QStyle, QTreeView, QWidget
 
 pytestmark = [pytest.mark.inside, pytest.mark.usefixtures('no_wait_is_endless')]
 
@@ -20,21 +20,64 @@ def panel():
     return stage.APPLICATION.findChild(QWidget, 'mainPanel')
 
 
+class Pointer:
+    """In the middle of a widget at first, which hears of it wherever it goes."""
+
+    LEFT, NONE = Qt.MouseButton.LeftButton, Qt.MouseButton.NoButton
+
+    def __init__(self, widget):
+        self.widget = widget
+        self.place = QPointF(widget.mapToGlobal(widget.rect().center()))
+
+    def send(self, kind, button, buttons):
+        local = QPointF(self.widget.mapFromGlobal(self.place.toPoint()))
+        QApplication.sendEvent(self.widget, QMouseEvent(kind, local, self.place, button, buttons,
+                                                        Qt.KeyboardModifier.NoModifier))
+
+    def press(self):
+        self.send(QEvent.Type.MouseButtonPress, self.LEFT, self.LEFT)
+
+    def move(self, x, y, buttons=LEFT):
+        self.place += QPointF(x, y)
+        self.send(QEvent.Type.MouseMove, self.NONE, buttons)
+
+    def release(self):
+        self.send(QEvent.Type.MouseButtonRelease, self.LEFT, self.NONE)
+
+
 def drag(widget, *moves):
     """Presses in the middle of a widget, moves by so many pixels, and lets go."""
-    place = QPointF(widget.mapToGlobal(widget.rect().center()))
+    pointer = Pointer(widget)
+    pointer.press()
+    for move in moves:
+        pointer.move(*move)
+    pointer.release()
+    pointer.move(0, 0, Pointer.NONE)
 
-    def send(kind, button, buttons):
-        local = QPointF(widget.mapFromGlobal(place.toPoint()))
-        QApplication.sendEvent(widget, QMouseEvent(kind, local, place, button, buttons, Qt.KeyboardModifier.NoModifier))
 
-    left, none = Qt.MouseButton.LeftButton, Qt.MouseButton.NoButton
-    send(QEvent.Type.MouseButtonPress, left, left)
-    for x, y in moves:
-        place += QPointF(x, y)
-        send(QEvent.Type.MouseMove, none, left)
-    send(QEvent.Type.MouseButtonRelease, left, none)
-    send(QEvent.Type.MouseMove, none, none)
+def bars(dialog):
+    return {bar.orientation(): bar for bar in dialog.findChildren(QScrollBar) if bar.isVisible()}
+
+
+def turn_wheel(widget, x=0, y=0):
+    """Whoever does not want it leaves it to what holds it: Qt does that for real events alone."""
+    place = QPointF(widget.rect().center())
+    event = QWheelEvent(place, widget.mapToGlobal(place), QPoint(), QPoint(120 * x, 120 * y), Pointer.NONE,
+                        Qt.KeyboardModifier.NoModifier, Qt.ScrollPhase.NoScrollPhase, False)
+    event.ignore()
+    while widget and not event.isAccepted():
+        QApplication.sendEvent(widget, event)
+        widget = widget.parent()
+
+
+@pytest.fixture
+def small_panel():
+    size = stage.APPLICATION.size()
+    stage.APPLICATION.resize(900, 500)
+    QApplication.processEvents()
+    yield panel()
+    stage.APPLICATION.resize(size)
+    QApplication.processEvents()
 
 
 def the_dialog():
@@ -54,6 +97,11 @@ def test_a_dialog_floats_in_the_middle_of_the_panel_from_its_construction_on(wid
     room = panel().size()
     bottom = room.height() // 2 - height // 2
     expected = QRect(room.width() // 2 - width // 2, room.height() - bottom - height - 25, width, height + 25)
+    bar = QApplication.style().pixelMetric(QStyle.PixelMetric.PM_ScrollBarExtent)
+    if width > room.width():
+        expected = QRect(0, expected.y(), room.width(), expected.height() + bar)
+    if height + 25 > room.height():
+        expected = QRect(expected.x(), 0, width + bar, room.height())
     assert the_dialog().geometry() == expected and the_dialog().parent() is panel()
     assert the_dialog().hasFocus() and panel().children()[-1] is the_dialog()
     del dialog
@@ -90,16 +138,129 @@ def test_a_dialog_is_dragged_and_never_out_of_reach(user, grip):
     assert dialog.launch() == 'CloseButton_OK'
 
 
-def test_each_edge_of_a_dialog_larger_than_the_panel_can_be_seen():
-    dialog = ui.createDialog('Large', PLAIN, panel().width() + 300, panel().height() + 200)
-    window, room = the_dialog(), panel().rect()
-    edges = {'left': lambda: window.geometry().left() >= 0, 'right': lambda: window.geometry().right() <= room.right(),
-             'top': lambda: window.geometry().top() >= 0, 'bottom': lambda: window.geometry().bottom() <= room.bottom()}
-    for edge, far in ('left', (9000, 0)), ('right', (-9000, 0)), ('top', (0, 9000)), ('bottom', (0, -9000)):
-        drag(window, far, (-far[0] + (1 if far[0] > 0 else -1) * 700 if far[0] else 0, 0))
-        drag(window, far)
-        assert edges[edge](), edge
-    assert dialog.getValues() == {}
+def press_escape(pointer):
+    QTest.keyClick(pointer.widget.parent(), Qt.Key.Key_Escape)
+
+
+def release_elsewhere(pointer):
+    Pointer(stage.APPLICATION).release()
+    pointer.move(0, 0, Pointer.NONE)
+
+
+def lose_the_grip(pointer):
+    pointer.widget.hide()
+    pointer.widget = pointer.widget.parent()
+    pointer.move(0, 0, Pointer.NONE)
+
+
+def show_a_box(_):
+    ui.showMessageBox('Box', ['?'])
+
+
+@pytest.mark.parametrize('end', [press_escape, release_elsewhere, lose_the_grip, show_a_box],
+                         ids=['hidden', 'released elsewhere', 'grip hidden', 'blocked'])
+def test_a_drag_ends_with_the_release_and_when_its_dialog_is_hidden_or_blocked(patient, end):
+    dialog = make_dialog('Dragged')
+    pointer = Pointer(title_bar(the_dialog()))
+    window, places = the_dialog(), []
+
+    def pull(user):
+        pointer.press()
+        pointer.move(20, 10)
+        end(pointer)
+        places.append(window.pos())
+
+    def go_on(user):
+        for buttons in Pointer.LEFT, Pointer.NONE:
+            pointer.move(30, 40, buttons)
+            places.append(window.pos())
+        user.close()
+
+    start = window.pos()
+    patient.plan(pull)
+    if end is show_a_box:
+        patient.plan(lambda user: user.press(Qt.Key.Key_Return))
+    if end is press_escape:
+        dialog.launch()
+    patient.plan(go_on)
+    dialog.launch()
+    assert places == [start + QPoint(20, 10)] * 3
+
+
+def test_a_dialog_larger_than_the_panel_fills_it_and_scrolls_as_far_as_it_was_made(small_panel):
+    dialog = ui.createDialog('Large', container('c', widget('Label', 'low', '0 u l', '0 u b', '4 u w', '4 u h'),
+                                                widget('Label', 'high', '-4 u r', '-8 u t', '4 u w', '4 u h')),
+                             1000, 800)
+    window = the_dialog()
+    assert window.geometry() == small_panel.rect()
+    drag(title_bar(window), (50, 50))
+    assert window.geometry() == small_panel.rect()
+    QApplication.processEvents()
+    low, high = (window.findChild(QWidget, name) for name in ('low', 'high'))
+    assert [one.mapTo(window, QPoint(0, 0)) for one in (low, high)] == [QPoint(0, 825 - 28), QPoint(1000 - 28, 28)]
+    assert high.visibleRegion().isEmpty() and low.visibleRegion().isEmpty()
+    turn_wheel(low, y=-50)
+    assert not low.visibleRegion().isEmpty()
+    turn_wheel(low, x=-50)
+    turn_wheel(low, y=50)
+    assert not high.visibleRegion().isEmpty() and title_bar(window).pos() == QPoint(0, 0)
+    stage.APPLICATION.resize(1700, 1000)
+    QApplication.processEvents()
+    assert window.geometry() == QRect(0, 0, 1000, 825) and not bars(window)
+    drag(title_bar(window), (50, 50))
+    assert window.pos() == QPoint(50, 50) and dialog.getValues() == {}
+
+
+def test_a_bar_stands_beside_what_a_dialog_was_given(small_panel):
+    for width, height, only in (700, 200, Qt.Orientation.Horizontal), (200, 700, Qt.Orientation.Vertical):
+        dialog = ui.createDialog('Large', PLAIN, width, height)
+        QApplication.processEvents()
+        assert list(bars(the_dialog())) == [only]
+        del dialog
+
+
+def test_no_row_of_a_long_form_is_passed_over_by_pages_and_the_wheel_changes_no_menu(user, small_panel):
+    names = ['row %d' % row for row in range(40)]
+    form = [('Menu' if row % 2 else 'TextField', name, 'row', (['a', 'b'], 0) if row % 2 else 'text')
+            for row, name in enumerate(names)]
+    seen = set()
+
+    def look(user):
+        bottom = title_bar(user.window()).height()
+        for name in [*names, 'CloseButton_OK']:
+            found = user.find(name)
+            top = found.mapTo(user.window(), QPoint(0, 0)).y()
+            if bottom <= top and top + found.height() <= user.window().height():
+                seen.add(name)
+
+    def page(key):
+        def turned(user):
+            look(user)
+            user.press(key)
+            look(user)
+        return turned
+
+    def wheel(user):
+        bar = bars(user.window())[Qt.Orientation.Vertical]
+        assert bar.value() == bar.maximum() and seen == {*names, 'CloseButton_OK'}
+        for name in names[::-2]:  # the menus
+            turn_wheel(user.find(name), y=3)
+        assert bar.value() == 0
+        user.press(Qt.Key.Key_Backtab)
+        assert bar.value() == bar.maximum() and user.focus() == 'CloseButton_OK'
+        user.close()
+
+    user.plan(*[page(Qt.Key.Key_PageDown)] * 4, wheel)
+    values = ui.showSimpleDialog('Long', form, 300)
+    assert values['row 1'] == 'a' and values['row 39'] == 'a'
+
+
+def test_a_field_wider_than_the_panel_opens_with_its_beginning(user, small_panel):
+    user.plan(lambda user: places.append(user.find('Text').mapTo(user.window(), QPoint(0, 0)).x()),
+              lambda user: user.close())
+    places = []
+    ui.showSimpleDialog('Wide', [('TextField', 'Text', 'A caption')], 1200)
+    assert places[0] > 70, 'the caption is seen'
 
 
 def test_dialogs_keep_their_place_and_stay_within_reach_when_the_panel_changes():
@@ -140,11 +301,11 @@ def test_what_has_no_room_scrolls_under_the_title():
     dialog = ui.createDialog('Small', ui.makeXmlFromWidgetList([('TextField', 'row %d' % row, 'row') for row in range(40)]),
                              300, 200)
     QApplication.processEvents()
-    bars = [bar for bar in the_dialog().findChildren(QScrollBar) if bar.isVisible()]
-    assert [bar.orientation() for bar in bars] == [Qt.Orientation.Vertical]
+    (orientation, bar), = bars(the_dialog()).items()
+    assert orientation == Qt.Orientation.Vertical
     button = the_dialog().findChild(QWidget, 'CloseButton_OK')
     assert button.visibleRegion().isEmpty()
-    bars[0].setValue(bars[0].maximum())
+    bar.setValue(bar.maximum())
     assert not button.visibleRegion().isEmpty() and title_bar(the_dialog()).y() == 0
 
 
@@ -153,7 +314,7 @@ def states():
     main = stage.APPLICATION
     own = [main.menuBar().actions()[0], main.findChild(QTreeView, 'Browser.list'),
            main.findChild(QWidget, 'compositions')]
-    return [widget.isEnabled() for widget in own], {stage.title_of(one): one.isEnabled() for one in stage.dialogs()}
+    return [widget.isEnabled() for widget in own], {stage.title_of(one): one.isEnabled() for one in stage.floating()}
 
 
 def test_the_application_takes_no_input_during_a_run_and_is_afterwards_as_before(patient):
@@ -172,7 +333,7 @@ def test_the_application_takes_no_input_during_a_run_and_is_afterwards_as_before
 
     def disturb(user):
         seen.append(states())
-        beneath = {stage.title_of(one): one for one in stage.dialogs()}['bystander']
+        beneath = {stage.title_of(one): one for one in stage.floating()}['bystander']
         QTest.mouseClick(beneath.findChild(QWidget, 'Button'), Qt.MouseButton.LeftButton)
         QTest.keyClick(files, Qt.Key.Key_Down)
 
@@ -190,6 +351,32 @@ def test_the_application_takes_no_input_during_a_run_and_is_afterwards_as_before
         assert states()[0] == [True] * 3 and set(states()[1].values()) <= {True}
         assert QApplication.focusWidget() is files and heard == []
         seen.clear()
+
+
+def test_when_a_dialog_goes_the_front_most_has_the_keyboard_where_it_was(user):
+    files = stage.APPLICATION.findChild(QTreeView, 'Browser.list')
+    dialogs = {title: make_dialog(title) for title in ('Text', 'Toggle', 'Menu')}
+    windows = {stage.title_of(one): one for one in stage.dialogs()}
+    holders = {title: window.findChild(QWidget, title) for title, window in windows.items()}
+    for holder in files, *holders.values():
+        holder.setFocus()
+    user.plan(lambda user: user.close())
+    ui.showMessageBox('Box', ['?'])
+    assert QApplication.focusWidget() is holders['Menu']
+    drag(title_bar(windows['Text']), (1, 1))
+    assert QApplication.focusWidget() is holders['Text']
+    for gone, holder in ('Text', holders['Menu']), ('Menu', holders['Toggle']), ('Toggle', files):
+        del dialogs[gone]
+        assert QApplication.focusWidget() is holder
+
+
+def test_the_keyboard_stays_in_a_dialog_whose_callback_disables_what_had_it_and_all_around_it(user):
+    dialog = make_dialog()
+    dialog.addCallback('Text', ui.EventType.VALUE_CHANGED,
+                       lambda given, *_: given.enableWidget('UserDefinedWidgetsContainer', False))
+    user.plan(lambda user: (user.type('a'), user.press(Qt.Key.Key_Return)),
+              lambda user: QTest.keyClick(QApplication.focusWidget() or stage.APPLICATION, Qt.Key.Key_Escape))
+    assert dialog.launch() == 'CloseButton_Cancel'
 
 
 def test_a_dialog_made_in_a_callback_is_usable_while_the_outer_one_runs(patient):

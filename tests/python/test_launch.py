@@ -8,6 +8,7 @@ import threading
 import pytest
 
 import stage
+from callback_tools import make_dialog, patient  # noqa: F401
 from descriptions import close_button, container, text, widget
 from quorvane_velmora import ui
 from scripts import run_script
@@ -287,6 +288,60 @@ def test_a_dialog_opened_from_a_timer_has_its_own_window_and_those_beneath_take_
               lambda user: user.close())
     assert outer.launch() == 'CloseButton_OK' and answers == ['No']
     assert outer.getValues()['Show'] == 'heard' and not stage.dialogs()
+
+
+def enter(text):
+    """Types into the field that has the keyboard, and ends the edit."""
+    def typed(user):
+        assert user.focus() == 'Text'
+        user.type(text)
+        user.press(Qt.Key.Key_Return)
+    return typed
+
+
+def press(key, focus):
+    def pressed(user):
+        assert user.focus() == focus
+        user.press(key)
+    return pressed
+
+
+def ask():
+    assert ui.showMessageBox('Box', ['?'], ['Yes', 'No']) == 'No'
+
+
+def run_inner(callback):
+    inner = make_dialog('inner')
+    inner.addCallback('Text', ui.EventType.VALUE_CHANGED, callback)
+    return inner.launch()
+
+
+def ask_from_another():
+    assert run_inner(lambda *_: ask()) == 'CloseButton_Cancel'
+
+
+def fail_in_another():
+    with pytest.raises(ZeroDivisionError):
+        run_inner(lambda *_: 1 / 0)
+
+
+ANSWER = [press(Qt.Key.Key_Tab, 'CloseButton_Yes'), press(Qt.Key.Key_Return, 'CloseButton_No')]
+
+
+@pytest.mark.parametrize('interrupt, answer', [
+    (ask, ANSWER), (ask_from_another, [enter('x'), *ANSWER, press(Qt.Key.Key_Escape, 'Text')]),
+    (fail_in_another, [enter('x')]),
+], ids=['box', 'nested', 'exception'])
+def test_the_keyboard_is_after_a_box_where_it_was_before(patient, interrupt, answer):
+    dialog = make_dialog()
+    for name in 'Text', 'Menu':
+        dialog.addCallback(name, ui.EventType.VALUE_CHANGED, lambda *_: interrupt())
+    patient.plan(enter('a'), *answer, enter('b'), *answer, press(Qt.Key.Key_Tab, 'Text'),
+                 press(Qt.Key.Key_Tab, 'Toggle'), press(Qt.Key.Key_Down, 'Menu'), *answer,
+                 press(Qt.Key.Key_Up, 'Menu'), *answer, press(Qt.Key.Key_Down, 'Menu'), *answer,
+                 press(Qt.Key.Key_Escape, 'Menu'))
+    assert dialog.launch() == 'CloseButton_Cancel'
+    assert (dialog.getValue('Text'), dialog.getValue('Menu')) == ('ab', 'b')
 
 
 @pytest.mark.standalone
