@@ -44,8 +44,9 @@ Kv::UiConstraint makeFilling()
 
 } // namespace
 
-Application::Application()
-    : _window(makeCommands()), _loadCb(this, &Application::loadFocused), _fileCb(this, &Application::refuseFocused)
+Application::Application(Interpreter& interpreter)
+    : _interpreter(interpreter), _window(makeCommands()), _loadCb(this, &Application::loadFocused),
+      _fileCb(this, &Application::refuseFocused)
 {
     makeHost();
     _showTimer.setSingleShot(true);
@@ -56,8 +57,6 @@ Application::Application()
 
 Application::~Application()
 {
-    // Scripts leave dialogs in the window.
-    _interpreter.finish(0);
     _workspace->setListener(nullptr);
     Kv::UiWorkspace::setCurrentWorkspace(nullptr);
     Kv::UiAppMgr::getInstance().setApplication(nullptr, nullptr, nullptr);
@@ -79,7 +78,7 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
     _signalTimer.stop();
     // What scripts have left for their end can open no dialog any more: nobody would see it.
     Kv::WsNative::getPlatform().closeLoops();
-    return _interpreter.finish(status);
+    return status;
 }
 
 Commands Application::makeCommands()

@@ -22,8 +22,8 @@ namespace Velmora
 class Application final : private Kv::UiCompositionWorkspaceListener
 {
 public:
-    /// Throws `Kv::ExBase` with words where windows cannot be shown.
-    Application();
+    /// The interpreter outlives it. Throws `Kv::ExBase` with words where windows cannot be shown.
+    explicit Application(Interpreter& interpreter);
     ~Application() override;
 
     /// Throws `Kv::ExBase` with words for a file that is no composition.
@@ -76,7 +76,7 @@ private:
     void currentCompositionChanged() override;
     void compositionChanged(Composition const& composition) override;
 
-    Interpreter _interpreter;
+    Interpreter& _interpreter;
     MainWindow _window;
     Kv::RCShdPtr<Kv::UiMainWindow> _hostWindow;
     Kv::RCShdPtr<Kv::BrBrowser> _browser;

@@ -7,6 +7,7 @@
 #include <cstring>
 #include <filesystem>
 #include <memory>
+#include <utility>
 
 namespace bp = boost::python;
 
@@ -234,14 +235,27 @@ void setExceptionHook()
     getSys().attr("excepthook") = bp::import("functools").attr("partial")(original);
 }
 
+/// Borrowed from the one interpreter.
+std::function<void()> const* lastAct = nullptr;
+
+void runLastAct()
+{
+    if (*lastAct)
+        (*lastAct)();
+}
+
 } // namespace
 
-Interpreter::Interpreter()
+Interpreter::Interpreter(std::function<void()> atEnd) : _atEnd(std::move(atEnd))
 {
     start();
+    lastAct = &_atEnd;
+    // What is registered first is called last.
+    bp::import("atexit").attr("register")(bp::make_function(&runLastAct));
     bp::list path = bp::extract<bp::list>(getSys().attr("path"));
     path.append(toPython(getModuleFolder()));
     setExceptionHook();
+    loadModules();
     _threadState = PyEval_SaveThread();
 }
 
@@ -307,7 +321,6 @@ bool Interpreter::isInterrupted()
 
 void Interpreter::loadModules()
 {
-    InterpreterHold const hold;
     try
     {
         bp::import("quorvane_velmora.ui");

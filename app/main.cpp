@@ -11,6 +11,7 @@
 #include <fcntl.h>
 #include <filesystem>
 #include <iostream>
+#include <optional>
 
 namespace
 {
@@ -36,7 +37,7 @@ int run(CommandLine const& line)
     }
     if (line.buildInfo)
     {
-        Interpreter().loadModules();
+        Interpreter const interpreter;
         writeBuildInfo(std::cout);
         return 0;
     }
@@ -46,10 +47,14 @@ int run(CommandLine const& line)
     // The toolkit starts here.
     Kv::WsNative::getPlatform();
     applyTheme();
-    Application application;
+    std::optional<Application> application;
+    // The window goes while scripts can still hear of it.
+    Interpreter interpreter([&application] { application.reset(); });
+    application.emplace(interpreter);
     for (std::string const& path : line.compositions)
-        application.openComposition(path);
-    return application.run(line.script, line.exit);
+        application->openComposition(path);
+    int const status = application->run(line.script, line.exit);
+    return interpreter.finish(status);
 }
 
 /// What is closed of the standard streams must not become the number of another file, which is then written to.

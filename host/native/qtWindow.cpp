@@ -28,13 +28,6 @@ void closePopups(QWidget const& window)
     }
 }
 
-/// Takes the windows down that are left when the application goes, while they still can be destroyed.
-void destroyLeftWindows()
-{
-    for (QPointer<WindowWidget> const& window : WindowWidget::findAll())
-        std::unique_ptr<QWidget> const left(window.data());
-}
-
 /// Once for each application: another one can follow when its owner has destroyed the first.
 void goWithApplication()
 {
@@ -42,7 +35,7 @@ void goWithApplication()
     if (watched == QCoreApplication::instance())
         return;
     watched = QCoreApplication::instance();
-    qAddPostRoutine(&destroyLeftWindows);
+    qAddPostRoutine(&QtWindow::destroyLeft);
 }
 
 } // namespace
@@ -69,6 +62,12 @@ QtWindow::~QtWindow()
         hide();
 }
 
+void QtWindow::destroyLeft()
+{
+    for (QPointer<WindowWidget> const& window : WindowWidget::findAll())
+        std::unique_ptr<QWidget> const left(window.data());
+}
+
 void QtWindow::setContentSize(int width, int height)
 {
     if (QWidget* const content = _content->getNative())
@@ -79,7 +78,7 @@ void QtWindow::show()
 {
     WindowWidget* const native = getNative();
     if (!native)
-        return;
+        throw ExBase(__FILE__, __LINE__, "Cannot show a window: it is gone with the application that it belonged to");
     // The native window must be there for the owner to be told of.
     native->winId();
     if (_owner && _owner->windowHandle())
