@@ -57,11 +57,11 @@ Kv::UiConstraint makeFilling()
 
 } // namespace
 
-Application::Application(bool remembers)
-    : _settings(remembers), _window(makeCommands(), _output), _loadCb(this, &Application::loadFocused),
-      _fileCb(this, &Application::runFocused)
+Application::Application(Interpreter& interpreter, ScriptOutput& output, bool remembers)
+    : _settings(remembers), _interpreter(interpreter), _window(makeCommands(), output),
+      _loadCb(this, &Application::loadFocused), _fileCb(this, &Application::runFocused)
 {
-    _interpreter.attempt([this] { _output.tapStreams(); });
+    _interpreter.attempt([&output] { output.tapStreams(); });
     _window.restoreLook(_settings);
     makeHost();
     _showTimer.setSingleShot(true);
@@ -73,8 +73,6 @@ Application::Application(bool remembers)
 Application::~Application()
 {
     _watch.reset();
-    // Scripts leave dialogs in the window.
-    _interpreter.finish(0);
     _workspace->setListener(nullptr);
     Kv::UiWorkspace::setCurrentWorkspace(nullptr);
     Kv::UiAppMgr::getInstance().setApplication(nullptr, nullptr, nullptr);
@@ -100,7 +98,7 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
     _window.saveLook(_settings);
     // What scripts have left for their end can open no dialog any more: nobody would see it.
     Kv::WsNative::getPlatform().closeLoops();
-    return _interpreter.finish(status);
+    return status;
 }
 
 Commands Application::makeCommands()

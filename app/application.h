@@ -27,9 +27,9 @@ namespace Velmora
 class Application final : private Kv::UiCompositionWorkspaceListener
 {
 public:
-    /// Throws `Kv::ExBase` with words where windows cannot be shown. What is remembered of former runs is used only
-    /// where this one is remembered too.
-    explicit Application(bool remembers);
+    /// The interpreter and the output outlive it. What is remembered of former runs is used only where this one is
+    /// remembered too. Throws `Kv::ExBase` with words where windows cannot be shown.
+    Application(Interpreter& interpreter, ScriptOutput& output, bool remembers);
     ~Application() override;
 
     /// Throws `Kv::ExBase` with words for a file that is no composition.
@@ -90,8 +90,7 @@ private:
     void compositionChanged(Composition const& composition) override;
 
     Settings _settings;
-    ScriptOutput _output;
-    Interpreter _interpreter;
+    Interpreter& _interpreter;
     MainWindow _window;
     Kv::RCShdPtr<Kv::UiMainWindow> _hostWindow;
     Kv::RCShdPtr<Kv::BrBrowser> _browser;

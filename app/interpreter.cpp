@@ -8,6 +8,7 @@
 #include <cstring>
 #include <filesystem>
 #include <memory>
+#include <utility>
 
 namespace bp = boost::python;
 
@@ -242,16 +243,29 @@ int getStopSignal()
     return SIGRTMAX - 1;
 }
 
+/// Borrowed from the one interpreter.
+std::function<void()> const* lastAct = nullptr;
+
+void runLastAct()
+{
+    if (*lastAct)
+        (*lastAct)();
+}
+
 } // namespace
 
-Interpreter::Interpreter() : _thread(pthread_self())
+Interpreter::Interpreter(std::function<void()> atEnd) : _atEnd(std::move(atEnd)), _thread(pthread_self())
 {
     start();
+    lastAct = &_atEnd;
+    // What is registered first is called last.
+    bp::import("atexit").attr("register")(bp::make_function(&runLastAct));
     bp::object const signals = bp::import("signal");
     signals.attr("signal")(getStopSignal(), bp::object(signals.attr("default_int_handler")));
     bp::list path = bp::extract<bp::list>(getSys().attr("path"));
     path.append(toPython(getModuleFolder()));
     setExceptionHook();
+    loadModules();
     _threadState = PyEval_SaveThread();
 }
 
@@ -330,7 +344,6 @@ bool Interpreter::isRunning() const
 
 void Interpreter::loadModules()
 {
-    InterpreterHold const hold;
     try
     {
         bp::import("quorvane_velmora.ui");

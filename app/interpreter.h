@@ -15,8 +15,9 @@ namespace Velmora
 class Interpreter
 {
 public:
-    /// Throws `std::runtime_error` where Python cannot be started.
-    Interpreter();
+    /// Starts Python and loads the module `ui`. `atEnd` is called after all that scripts have registered for the end,
+    /// with the lock held and their variables in place. Throws `std::runtime_error`.
+    explicit Interpreter(std::function<void()> atEnd = {});
     Interpreter(Interpreter const&) = delete;
     Interpreter& operator=(Interpreter const&) = delete;
     ~Interpreter();
@@ -42,17 +43,17 @@ public:
     /// True if Python runs on the thread of this interpreter, or has called what runs there. Waits for the lock.
     bool isRunning() const;
 
-    /// Makes the module `ui` and all that it brings along be loaded. Throws `std::runtime_error`.
-    void loadModules();
-
     /// Ends the interpreter and all that scripts have left. Gives the exit status: `status`, or another one if the
     /// output of the scripts could not be written.
     int finish(int status);
 
 private:
+    void loadModules();
+
     /// Takes the error that is set, prints it, and gives the exit status that it stands for.
     int takeError();
 
+    std::function<void()> _atEnd;
     std::string _failure;
     pthread_t _thread;
     void* _threadState = nullptr;

@@ -12,6 +12,7 @@
 #include <fcntl.h>
 #include <filesystem>
 #include <iostream>
+#include <optional>
 
 namespace
 {
@@ -37,7 +38,7 @@ int run(CommandLine const& line)
     }
     if (line.buildInfo)
     {
-        Interpreter().loadModules();
+        Interpreter const interpreter;
         writeBuildInfo(std::cout);
         return 0;
     }
@@ -47,11 +48,17 @@ int run(CommandLine const& line)
     // The toolkit starts here.
     Kv::WsNative::getPlatform();
     applyTheme();
+    // The streams of Python copy what they write to it to the end.
+    ScriptOutput output;
+    std::optional<Application> application;
+    // The window goes while scripts can still hear of it.
+    Interpreter interpreter([&application] { application.reset(); });
     // A script that has the application to itself finds it as it is for everybody.
-    Application application(!line.exit);
+    application.emplace(interpreter, output, !line.exit);
     for (std::string const& path : line.compositions)
-        application.openComposition(path);
-    return application.run(line.script, line.exit);
+        application->openComposition(path);
+    int const status = application->run(line.script, line.exit);
+    return interpreter.finish(status);
 }
 
 /// What is closed of the standard streams must not become the number of another file, which is then written to.

@@ -125,6 +125,13 @@ public:
     /// The application closes: ends all loops, each by setting its `*end`. One that begins later throws an `ExBase`; a
     /// script that goes on trying is interrupted.
     virtual void closeLoops() = 0;
+
+    /// Destroys the windows that are left, while scripts can still hear of it. They cannot be shown again.
+    virtual void destroyWindows() = 0;
+
+    /// True if the address is that of a living object of Qt that the application made, not a script. Then `onGone` is
+    /// called when it goes.
+    virtual bool observe(void const* object, std::function<void()> onGone) = 0;
 };
 
 /// Name of the function that libKVnative exports; gives the process's one platform, which lives as long as the process.

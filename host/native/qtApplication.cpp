@@ -67,6 +67,11 @@ bool QtApplication::hasGui()
     return isWidgetApplication(QCoreApplication::instance());
 }
 
+bool QtApplication::isOwn() const
+{
+    return _own && _own == QCoreApplication::instance();
+}
+
 void QtApplication::requireLoop()
 {
     start();

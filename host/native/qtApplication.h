@@ -17,6 +17,9 @@ public:
     /// True if fonts and screens can be asked and widgets made.
     bool hasGui();
 
+    /// True if the application object is our own.
+    bool isOwn() const;
+
     /// Throws an `ExBase` that says why and what to do where events cannot be dispatched.
     void requireLoop();
 

@@ -18,13 +18,16 @@
 #include "native/windowWidget.h"
 
 #include <QApplication>
+#include <QClipboard>
 #include <QFontMetricsF>
 #include <QScreen>
 #include <QStyle>
+#include <QStyleHints>
 
 #include <algorithm>
 #include <cmath>
 #include <utility>
+#include <vector>
 
 namespace Kv
 {
@@ -34,6 +37,17 @@ namespace
 
 /// What layouts reckon with where there is no screen to ask.
 constexpr GeVector2<int> assumedScreen{1920, 1080};
+
+/// Looks for an object by its address, under one that lives.
+QObject* findObject(QObject* root, void const* address)
+{
+    if (!root || root == address)
+        return root;
+    for (QObject* const child : root->children())
+        if (QObject* const found = findObject(child, address))
+            return found;
+    return nullptr;
+}
 
 QWidget* nativeOf(NtContainer& container)
 {
@@ -138,6 +152,7 @@ std::unique_ptr<NtMainWindow> QtPlatform::adoptWindow(NtForeignWidget window, st
                                                       NtWindowListener& listener)
 {
     _application.requireWindows();
+    _adopted = static_cast<QWidget*>(window.widget);
     return std::make_unique<QtMainWindow>(window, std::move(enableOwn), listener);
 }
 
@@ -234,6 +249,28 @@ void QtPlatform::closeLoops()
     _closed = true;
     for (QtLoop* loop = QtGuard::getInstance().getInnermostLoop(); loop; loop = loop->getOuter())
         loop->end();
+}
+
+void QtPlatform::destroyWindows()
+{
+    QtWindow::destroyLeft();
+}
+
+bool QtPlatform::observe(void const* object, std::function<void()> onGone)
+{
+    std::vector<QObject*> roots{_adopted.data()};
+    for (QPointer<WindowWidget> const& window : WindowWidget::findAll())
+        roots.push_back(window);
+    if (_application.isOwn())
+        roots.insert(roots.end(), {QCoreApplication::instance(), QGuiApplication::clipboard(),
+                                   QGuiApplication::styleHints(), QGuiApplication::primaryScreen()});
+    for (QObject* const root : roots)
+        if (QObject* const found = findObject(root, object))
+        {
+            QObject::connect(found, &QObject::destroyed, std::move(onGone));
+            return true;
+        }
+    return false;
 }
 
 } // namespace Kv

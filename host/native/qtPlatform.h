@@ -4,6 +4,7 @@
 #include "native/qtApplication.h"
 
 #include <QPointer>
+#include <QWidget>
 
 #include <memory>
 #include <string>
@@ -44,11 +45,15 @@ public:
     void endLoop() override;
     void interruptLoop() override;
     void closeLoops() override;
+    void destroyWindows() override;
+    bool observe(void const* object, std::function<void()> onGone) override;
 
 private:
     [[noreturn]] void refuseLoop();
 
     QtApplication _application;
+    /// The application's window.
+    QPointer<QWidget> _adopted;
 
     /// The application that has our busy cursor, if one has.
     QPointer<QCoreApplication> _busyApplication;

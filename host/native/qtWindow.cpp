@@ -29,13 +29,6 @@ void closePopups(QWidget const& window)
     }
 }
 
-/// Takes the windows down that are left when the application goes, while they still can be destroyed.
-void destroyLeftWindows()
-{
-    for (QPointer<WindowWidget> const& window : WindowWidget::findAll())
-        std::unique_ptr<QWidget> const left(window.data());
-}
-
 /// Once for each application: another one can follow when its owner has destroyed the first.
 void goWithApplication()
 {
@@ -43,7 +36,7 @@ void goWithApplication()
     if (watched == QCoreApplication::instance())
         return;
     watched = QCoreApplication::instance();
-    qAddPostRoutine(&destroyLeftWindows);
+    qAddPostRoutine(&QtWindow::destroyLeft);
 }
 
 } // namespace
@@ -74,6 +67,12 @@ QtWindow::~QtWindow()
         hide();
 }
 
+void QtWindow::destroyLeft()
+{
+    for (QPointer<WindowWidget> const& window : WindowWidget::findAll())
+        std::unique_ptr<QWidget> const left(window.data());
+}
+
 void QtWindow::setContentSize(int width, int height)
 {
     if (WindowWidget* const native = getNative())
@@ -84,7 +83,7 @@ void QtWindow::show()
 {
     WindowWidget* const native = getNative();
     if (!native)
-        return;
+        throw ExBase(__FILE__, __LINE__, "Cannot show a window: it is gone with the application that it belonged to");
     // The native window must be there for the owner to be told of.
     native->winId();
     if (_owner && _owner->windowHandle())

@@ -33,6 +33,9 @@ public:
     void redraw() override;
     void flushInput() override;
 
+    /// Takes down the windows that are left, while they still can be destroyed.
+    static void destroyLeft();
+
 private:
     WindowWidget* getNative() const;
 

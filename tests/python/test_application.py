@@ -26,6 +26,7 @@ COMPOSITION = '''<composition>
 '''
 
 # A user inside the process who does each step at the end of a run, given by its number and what the bottom line says.
+PLATFORM_HINT = 'This plugin does not support propagateSizeHints()\n'
 WATCHING = '''
 import stage
 from PyQt6.QtCore import QTimer
@@ -241,6 +242,52 @@ def test_a_script_that_asks_until_it_is_answered_ends_when_its_window_is_closed(
                 pass
         ''')
     assert status == 130 and errors.endswith('KeyboardInterrupt\n')
+
+
+LEAVING = '''
+import gc, stage
+from callback_tools import make_dialog
+from PyQt6.QtCore import QObject
+from PyQt6.QtWidgets import QApplication, QTreeView
+
+class Filter(QObject):
+    def eventFilter(self, *_):
+        hear()
+        return False
+
+def hear(*_):
+    assert dialog and application
+
+application, dialog = QApplication.instance(), make_dialog()
+application.installEventFilter(Filter(application))
+%s
+gc.collect()
+'''
+SIGNALS = {
+    'focus': ('QApplication.instance()', 'focusChanged'), 'end': ('QApplication.instance()', 'aboutToQuit'),
+    'window': ('stage.APPLICATION', 'destroyed'), 'dialog': ('stage.dialogs()[-1]', 'destroyed'),
+    'list': ('stage.APPLICATION.findChild(QTreeView, "Browser.list")', 'destroyed'),
+}
+
+
+@pytest.mark.parametrize('sender, signal', SIGNALS.values(), ids=SIGNALS)
+@pytest.mark.parametrize('connect', [
+    'sender = {0}; sender.{1}.connect(hear)', '{0}.{1}.connect(hear)',
+    'def connect():\n sender = {0}; sender.{1}.connect(lambda *_: hear(sender))\nconnect()',
+], ids=['by a variable', 'by nothing', 'by a closure'])
+def test_what_a_script_leaves_connected_ends_neither_the_application_nor_the_next_script(tmp_path, connect, sender,
+                                                                                         signal):
+    script = LEAVING % connect.format(sender, signal)
+    status, printed, errors = run_inside(tmp_path, script, '--exit')
+    assert (status, printed, errors.replace(PLATFORM_HINT, '')) == (0, [], '')
+    status, printed, errors = run_inside(tmp_path, 'import watching; watching.runs += 1' + script, plan='''
+        def run_again():
+            trigger('Run Script Again')
+
+        plan += [(1, 'script.py has ended', run_again), (2, 'script.py has ended', run_again),
+                 (3, 'script.py has ended', lambda: print(stage.APPLICATION.close()))]
+        ''')
+    assert (status, printed, errors.replace(PLATFORM_HINT, '')) == (0, ['True'], '')
 
 
 WORKSPACE = '''

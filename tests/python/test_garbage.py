@@ -9,6 +9,7 @@ import pytest
 
 from callback_tools import make_dialog, run_script
 from quorvane_velmora import ui
+from PyQt6.QtCore import QEvent
 from PyQt6.QtWidgets import QApplication
 
 pytestmark = pytest.mark.usefixtures('no_wait_is_endless')
@@ -233,3 +234,45 @@ def test_many_rounds_leave_no_object_and_no_memory_behind(script):
     # The address sanitizer finds what is lost by itself, and keeps other books.
     if 'libasan' not in os.environ.get('LD_PRELOAD', ''):
         assert memory[2] - memory[1] < 64 << 10
+
+
+def test_what_is_connected_to_a_native_widget_goes_with_it_and_not_before(user):
+    dialog, wrappers, heard = [make_dialog()], [], []
+
+    def connect(someone):
+        field = someone.find('Text')
+        field.destroyed.connect(lambda *_: heard.append(field))
+        field.textChanged.connect(lambda *_: heard.append(field.text()))
+        wrappers.append(weakref.ref(field))
+
+    user.plan(connect, lambda someone: (gc.collect(), someone.find('Text').setText('new')),
+              lambda someone: someone.close())
+    dialog.pop().launch()
+    gc.collect()
+    assert len(heard) == 2 and heard[0] == 'new' and heard[1] is wrappers[0]()
+    heard.clear()
+    QApplication.sendPostedEvents(None, QEvent.Type.MetaCall)  # those connections go
+    QApplication.sendPostedEvents(None, QEvent.Type.DeferredDelete)
+    gc.collect()
+    assert wrappers[0]() is None
+
+
+def test_windows_that_are_left_go_while_those_who_hear_of_it_have_all_their_names():
+    printed = run_script('''
+from callback_tools import PatientUser, make_dialog
+from PyQt6.QtWidgets import QWidget
+def hear(*_):
+    print(name)
+def connect(user):
+    window = user.window()
+    kept.extend([window, *window.findChildren(QWidget)])
+    for widget in kept:
+        widget.destroyed.connect(hear)
+    user.close()
+kept, user, dialog, name = [], PatientUser(), make_dialog(), 'heard'
+user.plan(connect)
+dialog.launch()
+user.stop()
+print(len(kept))
+''').split()
+    assert int(printed[0]) > 6 and printed[1:] == ['heard'] * int(printed[0])
