@@ -42,6 +42,7 @@ constexpr int calmTurns = 8;
 std::vector<char*> getPointers(std::vector<std::string>& words)
 {
     std::vector<char*> pointers;
+    pointers.reserve(words.size() + 1);
     for (std::string& word : words)
         pointers.push_back(word.data());
     pointers.push_back(nullptr);

@@ -5,12 +5,9 @@
 #include <string>
 #include <vector>
 
-namespace Velmora
-{
-
 /// The window by which a script is stopped that keeps the application's own window from answering. It is all that its
 /// process shows.
-namespace StopWindow
+namespace Velmora::StopWindow
 {
 
 /// The command line of the process. Its standard input is the connection to the application.
@@ -22,6 +19,4 @@ bool isWanted(int argc, char** argv);
 /// Runs the window, and gives the exit status.
 int run(char** argv);
 
-} // namespace StopWindow
-
-} // namespace Velmora
+} // namespace Velmora::StopWindow

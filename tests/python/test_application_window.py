@@ -43,10 +43,13 @@ def pick(name):
     files.setCurrentIndex(find())
 
 def recent():
-    """The recent scripts as the menu has them now."""
+    """The menu of recent scripts as it is now."""
     menu, = (one for one in window.findChildren(QMenu) if one.title().replace('&', '') == 'Recent Scripts')
     menu.aboutToShow.emit()
     return [one for one in menu.actions() if one.isEnabled() and not one.isSeparator()]
+
+def recent_names():
+    return [one.text().split()[1] for one in recent() if '.py' in one.text()]
 '''
 
 
@@ -260,3 +263,115 @@ def test_a_script_that_keeps_the_window_from_answering_is_stopped_in_a_window_of
         desk.click_in(window, 350, 28)
         desk.wait_until_gone('Script Is Busy')
     assert application.communicate()[0] == 'over\n' and application.returncode == 0
+
+
+def test_scripts_and_the_look_of_the_window_are_remembered_from_one_run_to_the_next(tmp_path):
+    home = tmp_path / 'home'
+    write(tmp_path, other='')
+
+    def session(name, *steps, options=()):
+        write(tmp_path, **{name: TOOLS + textwrap.dedent(steps[0])})
+        write(tmp_path, watching=WATCHING)
+        status, printed, errors = run(tmp_path, PROGRAM, *options, name + '.py', XDG_CONFIG_HOME=str(home))
+        assert status == 0, errors
+        return printed.splitlines()
+
+    session('alone', 'stage.APPLICATION.resize(900, 500)', options=['--exit'])
+    assert not home.exists()
+    session('first', '''
+        window.resize(900, 500)
+        trigger('Show Log')
+        QTimer.singleShot(0, window.close)
+        ''')
+    assert session('second', '''
+        print(window.width(), window.height(), log.isVisible())
+        print(recent_names())
+        trigger('Show Log')
+        QTimer.singleShot(0, window.close)
+        ''') == ['900 500 False', "['second.py', 'first.py']"]
+    (tmp_path / 'first.py').unlink()
+    assert session('gone', '''
+        assert log.isVisible()
+        def choose(label):
+            next(one for one in recent() if label in one.text()).trigger()
+        choose('first.py')
+        print(said().endswith('first.py is not there any more'), recent_names())
+        choose('Clear')
+        print(recent_names(), recent())
+        QTimer.singleShot(0, window.close)
+        ''') == ["True ['gone.py', 'second.py']", '[] []']
+    settings, = home.rglob('*.ini')
+    settings.write_bytes(b'[General\n\xff=\x00@ByteArray(\nwindow=@Variant(\0\0)\nscripts=@Invalid()\nrows=7\n')
+    assert session('broken', '''
+        print(window.isVisible() and window.width() > 500 and log.height() > 50)
+        print(recent_names())
+        QTimer.singleShot(0, window.close)
+        ''') == ['True', "['broken.py']"]
+
+
+def test_enter_and_a_double_click_in_the_browser_do_what_the_entry_is_for(tmp_path):
+    (tmp_path / 'folder').mkdir()
+    (tmp_path / 'shot.vmcomposition').write_text(COMPOSITION)
+    (tmp_path / 'notes.txt').write_text('')
+    write(tmp_path, step01='print("step 1")', step02='import sys; print("step 2"); sys.argv[1:] and print(sys.argv)')
+    printed, _ = run_with_tools(tmp_path, '''
+        import os
+        def enter(name):
+            pick(name)
+            QTest.keyClick(files, Qt.Key.Key_Return)
+
+        def click(name):
+            pick(name)
+            place = files.visualRect(files.currentIndex()).center()
+            for act in QTest.mouseClick, QTest.mouseDClick:
+                act(files.viewport(), Qt.MouseButton.LeftButton, Qt.KeyboardModifier.NoModifier, place)
+
+        def use():
+            for act in enter, click:
+                for name in 'step02.py', 'step01.py':
+                    act(name)
+                    wait_for(lambda: said() == name + ' has ended')
+                act('notes.txt')
+                wait_for(lambda: said() == 'notes.txt is neither a composition nor a script')
+                act('folder')
+                wait_for(lambda: window.findChild(QLineEdit, 'Browser.path').text() == os.getcwd() + '/folder')
+                QTest.keyClick(files, Qt.Key.Key_Backspace)
+            enter('shot.vmcomposition')
+            wait_for(lambda: window.findChild(QListWidget, 'compositions').count() == 1)
+            print(window.windowTitle()[:4])
+            window.close()
+
+        QTimer.singleShot(0, use)
+        ''')
+    assert printed == ['step 2', 'step 1'] * 2 + ['shot']
+
+
+def test_a_key_leads_to_each_pane_and_only_the_one_that_has_the_keyboard_has_a_bright_selection(tmp_path):
+    for name in 'one', 'two':
+        (tmp_path / (name + '.vmcomposition')).write_text(COMPOSITION)
+    printed, _ = run_with_tools(tmp_path, '''
+        from callback_tools import make_dialog
+        nodes = window.findChild(QTreeWidget, 'nodes')
+        compositions = window.findChild(QListWidget, 'compositions')
+        dialog = make_dialog()
+        text = stage.dialogs()[0].findChild(QLineEdit, 'Text')
+        text.setFocus()
+        pick('one.vmcomposition')
+        nodes.setCurrentItem(nodes.topLevelItem(0))
+        log.selectAll()
+        panes = {Qt.Key.Key_B: files, Qt.Key.Key_P: compositions, Qt.Key.Key_N: nodes, Qt.Key.Key_L: log}
+        bright = window.palette().color(window.palette().ColorGroup.Active, window.palette().ColorRole.Highlight).rgb()
+
+        def count(pane):
+            image = pane.grab().toImage()
+            return sum(image.pixel(x, y) == bright for x in range(image.width()) for y in range(0, image.height(), 3))
+
+        for key, pane in panes.items():
+            QTest.keyClick(window, key, Qt.KeyboardModifier.AltModifier)
+            assert QApplication.focusWidget() is pane, pane.objectName()
+            print(*(one.objectName() for one in panes.values() if count(one) > 0))
+        QTest.keyClick(window, Qt.Key.Key_D, Qt.KeyboardModifier.AltModifier)
+        assert QApplication.focusWidget() is text
+        assert not any(count(one) for one in panes.values())
+        ''', '--open', 'one.vmcomposition', '--open', 'two.vmcomposition', '--exit')
+    assert printed == ['Browser.list', 'compositions', 'nodes', 'log']

@@ -13,7 +13,7 @@ from descriptions import close_button, container, text, widget
 from quorvane_velmora import ui
 from scripts import run_script
 from PyQt6.QtCore import QRect, Qt
-from PyQt6.QtGui import QFontMetrics, QGuiApplication
+from PyQt6.QtGui import QFontMetrics, QGuiApplication, QTextLayout
 from PyQt6.QtTest import QTest
 from PyQt6.QtWidgets import QApplication, QLabel, QScrollBar, QWidget
 
@@ -63,6 +63,50 @@ def test_a_window_bears_its_title_and_keeps_the_others_from_input(user):
         return window.windowTitle(), window.objectName(), window.windowModality()
 
     assert launch(user, make('OK'), look) == ('Launched',) * 2 + (Qt.WindowModality.ApplicationModal,)
+
+
+def test_a_window_has_an_icon_down_to_the_size_of_a_title_bar(user):
+    icon = launch(user, make('OK', 'Cancel'), lambda user: user.window().window().windowIcon())
+    assert {16, 32, 256} <= {size.width() for size in icon.availableSizes()}
+    picture = icon.pixmap(16, 16).toImage()
+    ground, sign = picture.pixelColor(8, 2), picture.pixelColor(4, 4)
+    assert picture.width() == 16 and ground.alpha() == sign.alpha() == 255 and sign.lightness() > ground.lightness() + 60
+
+
+@pytest.mark.standalone
+@pytest.mark.parametrize('own', [False, True], ids=['without', 'with'])
+def test_in_an_application_of_the_scripts_a_dialog_has_its_icon_or_ours(own):
+    printed = run_script('''
+import sys
+from PyQt6.QtCore import QTimer
+from PyQt6.QtGui import QIcon, QPixmap
+from PyQt6.QtWidgets import QApplication, QWidget
+application = QApplication([])
+if %s:
+    application.setWindowIcon(QIcon(QPixmap(7, 7)))
+from quorvane_velmora import ui
+def look():
+    window = QApplication.activeModalWidget()
+    print(len(window.windowIcon().availableSizes()), application.windowIcon().isNull())
+    window.close()
+QTimer.singleShot(0, look)
+ui.showMessageBox('Box', ['text'])
+''' % own, QT_QPA_PLATFORM='offscreen')
+    assert printed == ('1 False\n' if own else '7 True\n')
+
+
+def test_an_emoji_is_drawn_by_a_font_that_has_it(user):
+    def glyphs(user):
+        label = user.find('Hint', QLabel)
+        layout = QTextLayout(label.text(), label.font())
+        layout.beginLayout()
+        layout.createLine()
+        layout.endLayout()
+        return [glyph for run in layout.glyphRuns() for glyph in run.glyphIndexes()]
+
+    # Of the second one the fonts for letters have a sign too.
+    found = launch(user, make('OK', widgets=[('Label', 'Hint', '', '\U0001f3ac\U0001f600')]), glyphs)
+    assert len(found) == 2 and all(found)
 
 
 @pytest.mark.parametrize('lines, buttons, width, height', [
