@@ -17,8 +17,7 @@ using Row = QtFocusOrder::Row;
 
 LabelWidget* toLabel(QWidget* widget)
 {
-    auto* const label = dynamic_cast<LabelWidget*>(widget);
-    return label && !label->text().isEmpty() ? label : nullptr;
+    return dynamic_cast<LabelWidget*>(widget);
 }
 
 /// Where a label of the row is displayed, those that are not say nothing.
@@ -63,9 +62,10 @@ void nameValuesIn(QWidget const& root)
     std::vector<QWidget*> widgets;
     for (QWidget* const widget : root.findChildren<QWidget*>())
     {
-        if (auto* const label = dynamic_cast<LabelWidget*>(widget))
+        LabelWidget* const label = toLabel(widget);
+        if (label)
             named.emplace(label, nullptr);
-        if (toLabel(widget) || QtFocusOrder::holdsValue(*widget))
+        if (label ? !label->getWords().isEmpty() : QtFocusOrder::holdsValue(*widget))
             widgets.push_back(widget);
     }
     for (Row& row : QtFocusOrder::sortIntoRows(widgets))
