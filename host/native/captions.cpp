@@ -15,23 +15,23 @@ namespace
 
 using Row = QtFocusOrder::Row;
 
-LabelWidget* toLabel(QWidget* widget)
+LabelWidget* toLabel(QWidget& widget)
 {
-    return dynamic_cast<LabelWidget*>(widget);
+    return dynamic_cast<LabelWidget*>(&widget);
 }
 
 /// Where a label of the row is displayed, those that are not say nothing.
 void dropHiddenLabels(Row& row)
 {
-    auto const isHidden = [](QWidget* widget) { return toLabel(widget) && widget->isHidden(); };
-    if (std::any_of(row.begin(), row.end(), [](QWidget* widget) { return toLabel(widget) && !widget->isHidden(); }))
+    auto const isHidden = [](QWidget* widget) { return toLabel(*widget) && widget->isHidden(); };
+    if (std::any_of(row.begin(), row.end(), [](QWidget* widget) { return toLabel(*widget) && !widget->isHidden(); }))
         row.erase(std::remove_if(row.begin(), row.end(), isHidden), row.end());
 }
 
 /// Finds the labels of the values in one row, and says of each label and value that belong together so.
 template <typename Say> void matchRow(Row const& row, Say const& say)
 {
-    auto const labelAt = [&row](std::size_t place) { return place < row.size() ? toLabel(row[place]) : nullptr; };
+    auto const labelAt = [&row](std::size_t place) { return place < row.size() ? toLabel(*row[place]) : nullptr; };
     auto const isValueAt = [&row](std::size_t place)
     { return place < row.size() && QtFocusOrder::holdsValue(*row[place]); };
     LabelWidget* left = nullptr;
@@ -62,7 +62,7 @@ void nameValuesIn(QWidget const& root)
     std::vector<QWidget*> widgets;
     for (QWidget* const widget : root.findChildren<QWidget*>())
     {
-        LabelWidget* const label = toLabel(widget);
+        LabelWidget* const label = toLabel(*widget);
         if (label)
             named.emplace(label, nullptr);
         if (label ? !label->getWords().isEmpty() : QtFocusOrder::holdsValue(*widget))
