@@ -15,24 +15,23 @@ namespace
 
 using Row = QtFocusOrder::Row;
 
-LabelWidget* toLabel(QWidget* widget)
+LabelWidget* toLabel(QWidget& widget)
 {
-    auto* const label = dynamic_cast<LabelWidget*>(widget);
-    return label && !label->text().isEmpty() ? label : nullptr;
+    return dynamic_cast<LabelWidget*>(&widget);
 }
 
 /// Where a label of the row is displayed, those that are not say nothing.
 void dropHiddenLabels(Row& row)
 {
-    auto const isHidden = [](QWidget* widget) { return toLabel(widget) && widget->isHidden(); };
-    if (std::any_of(row.begin(), row.end(), [](QWidget* widget) { return toLabel(widget) && !widget->isHidden(); }))
+    auto const isHidden = [](QWidget* widget) { return toLabel(*widget) && widget->isHidden(); };
+    if (std::any_of(row.begin(), row.end(), [](QWidget* widget) { return toLabel(*widget) && !widget->isHidden(); }))
         row.erase(std::remove_if(row.begin(), row.end(), isHidden), row.end());
 }
 
 /// Finds the labels of the values in one row, and says of each label and value that belong together so.
 template <typename Say> void matchRow(Row const& row, Say const& say)
 {
-    auto const labelAt = [&row](std::size_t place) { return place < row.size() ? toLabel(row[place]) : nullptr; };
+    auto const labelAt = [&row](std::size_t place) { return place < row.size() ? toLabel(*row[place]) : nullptr; };
     auto const isValueAt = [&row](std::size_t place)
     { return place < row.size() && QtFocusOrder::holdsValue(*row[place]); };
     LabelWidget* left = nullptr;
@@ -63,9 +62,10 @@ void nameValuesIn(QWidget const& root)
     std::vector<QWidget*> widgets;
     for (QWidget* const widget : root.findChildren<QWidget*>())
     {
-        if (auto* const label = dynamic_cast<LabelWidget*>(widget))
+        LabelWidget* const label = toLabel(*widget);
+        if (label)
             named.emplace(label, nullptr);
-        if (toLabel(widget) || QtFocusOrder::holdsValue(*widget))
+        if (label ? !label->getWords().isEmpty() : QtFocusOrder::holdsValue(*widget))
             widgets.push_back(widget);
     }
     for (Row& row : QtFocusOrder::sortIntoRows(widgets))

@@ -21,7 +21,9 @@ def label(user):
 def ask_for_tip(widget):
     """What the widget answers when the pointer rests on it."""
     place = QPoint(20, widget.height() // 2)
-    QToolTip.showText(QPoint(0, 0), '')
+    QToolTip.hideText()
+    while QToolTip.isVisible():
+        QTest.qWait(10)
     QApplication.sendEvent(widget, QHelpEvent(QEvent.Type.ToolTip, place, widget.mapToGlobal(place)))
     return QToolTip.text()
 
@@ -106,6 +108,9 @@ def test_a_text_is_selected_by_the_mouse_and_copied_and_a_click_takes_no_keyboar
 
     def select(user):
         shown = label(user)
+        QTest.mouseMove(user.find('Field'))
+        QTest.mouseMove(shown, QPoint(5, 14))
+
         def drag(kind, x, button, buttons):
             at = QPointF(x, 8)
             QApplication.sendEvent(shown, QMouseEvent(kind, at, QPointF(shown.mapToGlobal(at.toPoint())), button, buttons,
