@@ -6,7 +6,6 @@
 
 #include "appUi/brBrowser.h"
 #include "appUi/uiCompositionWorkspace.h"
-#include "appUi/uiCompositionWorkspaceListener.h"
 #include "ui/uiEventCallback.h"
 #include "ui/uiMainWindow.h"
 
@@ -19,12 +18,14 @@ namespace Velmora
 {
 
 /// The running application: what its window shows, and what its commands do.
-class Application final : private Kv::UiCompositionWorkspaceListener
+class Application final
 {
 public:
     /// Throws `Kv::ExBase` with words where windows cannot be shown.
     Application();
-    ~Application() override;
+    Application(Application const&) = delete;
+    Application& operator=(Application const&) = delete;
+    ~Application();
 
     /// Throws `Kv::ExBase` with words for a file that is no composition.
     void openComposition(std::string const& path);
@@ -70,11 +71,6 @@ private:
     std::vector<Composition> getCompositions() const;
     void showCompositions();
     void showCompositionsLater();
-
-    void compositionOpened(Composition const& composition) override;
-    void compositionClosed(Composition const& composition) override;
-    void currentCompositionChanged() override;
-    void compositionChanged(Composition const& composition) override;
 
     Interpreter _interpreter;
     MainWindow _window;
