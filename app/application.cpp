@@ -73,7 +73,7 @@ Application::Application(Interpreter& interpreter, ScriptOutput& output, bool re
 Application::~Application()
 {
     _watch.reset();
-    _workspace->setListener(nullptr);
+    _workspace->setChangeCallback(nullptr);
     Kv::UiWorkspace::setCurrentWorkspace(nullptr);
     Kv::UiAppMgr::getInstance().setApplication(nullptr, nullptr, nullptr);
 }
@@ -143,7 +143,7 @@ void Application::makeHost()
     std::error_code nowhere;
     _browser->setURL(std::filesystem::current_path(nowhere).string(), HistoryEnum(0), UpdateEnum(0));
     _workspace = makeShd<UiCompositionWorkspace>([this] { return _hostWindow->findKeyboardHolder(); });
-    _workspace->setListener(this);
+    _workspace->setChangeCallback([this] { showCompositionsLater(); });
     UiWorkspace::setCurrentWorkspace(_workspace);
     UiAppMgr::getInstance().setApplication(_hostWindow, panel, _browser->getView());
 }
@@ -426,26 +426,6 @@ void Application::showCompositionsLater()
     // Once for all that a script does at a stretch.
     if (!_showTimer.isActive())
         _showTimer.start(0);
-}
-
-void Application::compositionOpened(Composition const&)
-{
-    showCompositionsLater();
-}
-
-void Application::compositionClosed(Composition const&)
-{
-    showCompositionsLater();
-}
-
-void Application::currentCompositionChanged()
-{
-    showCompositionsLater();
-}
-
-void Application::compositionChanged(Composition const&)
-{
-    showCompositionsLater();
 }
 
 } // namespace Velmora

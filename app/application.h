@@ -9,7 +9,6 @@
 
 #include "appUi/brBrowser.h"
 #include "appUi/uiCompositionWorkspace.h"
-#include "appUi/uiCompositionWorkspaceListener.h"
 #include "ui/uiEventCallback.h"
 #include "ui/uiMainWindow.h"
 
@@ -24,13 +23,15 @@ namespace Velmora
 {
 
 /// The running application: what its window shows, and what its commands do.
-class Application final : private Kv::UiCompositionWorkspaceListener
+class Application final
 {
 public:
     /// The interpreter and the output outlive it. What is remembered of former runs is used only where this one is
     /// remembered too. Throws `Kv::ExBase` with words where windows cannot be shown.
     Application(Interpreter& interpreter, ScriptOutput& output, bool remembers);
-    ~Application() override;
+    Application(Application const&) = delete;
+    Application& operator=(Application const&) = delete;
+    ~Application();
 
     /// Throws `Kv::ExBase` with words for a file that is no composition.
     void openComposition(std::string const& path);
@@ -83,11 +84,6 @@ private:
     std::vector<Composition> getCompositions() const;
     void showCompositions();
     void showCompositionsLater();
-
-    void compositionOpened(Composition const& composition) override;
-    void compositionClosed(Composition const& composition) override;
-    void currentCompositionChanged() override;
-    void compositionChanged(Composition const& composition) override;
 
     Settings _settings;
     Interpreter& _interpreter;

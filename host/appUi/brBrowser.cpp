@@ -2,6 +2,7 @@
 
 #include "appUi/brBrowsable.h"
 #include "base/exBase.h"
+#include "framework/fwComposition.h"
 #include "native/ntPlatform.h"
 #include "resmgt/osPlace.h"
 #include "ui/uiContainer.h"
@@ -59,7 +60,7 @@ RCShdPtr<BrBrowser> BrBrowser::create(RCShdPtr<UiContainer> const& parent, char 
 
 bool BrBrowser::isComposition(std::string const& name)
 {
-    return std::filesystem::path(name).extension() == ".vmcomposition";
+    return std::filesystem::path(name).extension() == FwComposition::extension;
 }
 
 bool BrBrowser::isScript(std::string const& name)

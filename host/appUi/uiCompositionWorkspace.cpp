@@ -1,7 +1,6 @@
 #include "appUi/uiCompositionWorkspace.h"
 
 #include "appUi/brBrowser.h"
-#include "appUi/uiCompositionWorkspaceListener.h"
 #include "base/rcWeakAccessor.h"
 #include "framework/fwComposition.h"
 #include "resmgt/liStringUtil.h"
@@ -31,12 +30,12 @@ UiCompositionWorkspace::~UiCompositionWorkspace()
 {
     // Whoever goes through one just now holds it a little longer.
     for (RCStrongPtr<FwComposition> const& composition : _compositions)
-        composition->setListener(nullptr);
+        composition->setChangeCallback(nullptr);
 }
 
-void UiCompositionWorkspace::setListener(UiCompositionWorkspaceListener* listener)
+void UiCompositionWorkspace::setChangeCallback(std::function<void()> callback)
 {
-    _listener = listener;
+    _changeCallback = std::move(callback);
 }
 
 RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::open(OsFilePath const& path)
@@ -56,18 +55,14 @@ RCWeakPtr<const PiCompositionGraphInterface> UiCompositionWorkspace::open(OsFile
 void UiCompositionWorkspace::close(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
 {
     RCStrongPtr<FwComposition> const closing = require(composition);
-    closing->setListener(nullptr);
+    closing->setChangeCallback(nullptr);
     auto const next = _compositions.erase(find(closing->getPath()));
     bool const wasCurrent = closing.get() == _current.get();
     if (wasCurrent && _compositions.empty())
         _current = nullptr;
     else if (wasCurrent)
         _current = next == _compositions.end() ? _compositions.back() : *next;
-    if (!_listener)
-        return;
-    _listener->compositionClosed(closing);
-    if (wasCurrent)
-        _listener->currentCompositionChanged();
+    tellChange();
 }
 
 void UiCompositionWorkspace::save(RCWeakPtr<const PiCompositionGraphInterface> const& composition)
@@ -153,17 +148,6 @@ ConstIterator<RCWeakPtr<const PiCompositionGraphInterface>> UiCompositionWorkspa
     return ConstIterator<RCWeakPtr<const PiCompositionGraphInterface>>({_compositions.begin(), _compositions.end()});
 }
 
-void UiCompositionWorkspace::compositionChanged(FwComposition const& composition)
-{
-    if (_listener)
-        _listener->compositionChanged(getComposition(composition.getGraph()));
-}
-
-void UiCompositionWorkspace::compositionSaved(FwComposition const& composition)
-{
-    compositionChanged(composition);
-}
-
 /// `path` is canonical.
 UiCompositionWorkspace::Compositions::const_iterator UiCompositionWorkspace::find(OsFilePath const& path) const
 {
@@ -174,10 +158,8 @@ UiCompositionWorkspace::Compositions::const_iterator UiCompositionWorkspace::fin
 
 void UiCompositionWorkspace::add(RCStrongPtr<FwComposition> const& composition)
 {
-    composition->setListener(this);
+    composition->setChangeCallback([this] { tellChange(); });
     _compositions.push_back(composition);
-    if (_listener)
-        _listener->compositionOpened(composition);
     setCurrent(composition);
 }
 
@@ -195,8 +177,13 @@ void UiCompositionWorkspace::setCurrent(RCStrongPtr<FwComposition> const& compos
     if (composition.get() == _current.get())
         return;
     _current = composition;
-    if (_listener)
-        _listener->currentCompositionChanged();
+    tellChange();
+}
+
+void UiCompositionWorkspace::tellChange() const
+{
+    if (_changeCallback)
+        _changeCallback();
 }
 
 } // namespace Kv

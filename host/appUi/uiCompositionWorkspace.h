@@ -4,7 +4,6 @@
 #include "appUi/uiWorkspace.h"
 #include "base/kvExport.h"
 #include "base/rcStrongPtr.h"
-#include "framework/fwCompositionListener.h"
 
 #include <functional>
 #include <vector>
@@ -13,13 +12,10 @@ namespace Kv
 {
 
 class FwComposition;
-class UiCompositionWorkspaceListener;
 
 /// The workspace of the application: opens compositions, holds them, and closes them. While there are any, one of them
 /// is the current one.
-class KV_API UiCompositionWorkspace : public UiWorkspace,
-                                      public UiCompositionWorkspaceClientInterface,
-                                      private FwCompositionListener
+class KV_API UiCompositionWorkspace : public UiWorkspace, public UiCompositionWorkspaceClientInterface
 {
 public:
     /// Gives the widget that has the keyboard, borrowed, or null.
@@ -31,8 +27,9 @@ public:
     UiCompositionWorkspace& operator=(UiCompositionWorkspace const&) = delete;
     ~UiCompositionWorkspace() override;
 
-    /// Borrowed; null for none. Takes the place of the one before.
-    void setListener(UiCompositionWorkspaceListener* listener);
+    /// Called once for all that an operation changes: compositions, which of them is current, or what is in one; null
+    /// for none. Takes the place of the one before.
+    void setChangeCallback(std::function<void()> callback);
 
     /// Opens the composition of a file, if it is not open already, and makes it the current one. Throws `ExBase`,
     /// naming the file and the line, for what is wrong with it.
@@ -65,16 +62,14 @@ public:
 private:
     using Compositions = std::vector<RCStrongPtr<FwComposition>>;
 
-    void compositionChanged(FwComposition const& composition) override;
-    void compositionSaved(FwComposition const& composition) override;
-
     Compositions::const_iterator find(OsFilePath const& path) const;
     void add(RCStrongPtr<FwComposition> const& composition);
     RCStrongPtr<FwComposition> require(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const;
     void setCurrent(RCStrongPtr<FwComposition> const& composition);
+    void tellChange() const;
 
     FocusFinder _findFocus;
-    UiCompositionWorkspaceListener* _listener = nullptr;
+    std::function<void()> _changeCallback;
     Compositions _compositions;
     /// Null while there are no compositions.
     RCStrongPtr<FwComposition> _current;

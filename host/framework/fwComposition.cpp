@@ -1,7 +1,6 @@
 #include "framework/fwComposition.h"
 
 #include "framework/fwCompositionFormat.h"
-#include "framework/fwCompositionListener.h"
 #include "framework/fwCompositionReader.h"
 #include "framework/fwCompositionWriter.h"
 #include "framework/fwGraph.h"
@@ -9,6 +8,7 @@
 #include "resmgt/liStringUtil.h"
 #include "resmgt/osFile.h"
 
+#include <filesystem>
 #include <utility>
 
 namespace Kv
@@ -20,12 +20,8 @@ namespace
 /// The name of the file, without the extension of compositions.
 std::string getCompositionName(OsFilePath const& path)
 {
-    std::string const name = path.getFileName();
-    std::string const ending = std::string(".") + FwComposition::extension;
-    bool const isMore = name.size() > ending.size();
-    return isMore && name.compare(name.size() - ending.size(), ending.size(), ending) == 0
-               ? name.substr(0, name.size() - ending.size())
-               : name;
+    std::filesystem::path const name = path.getFileName();
+    return name.extension() == FwComposition::extension ? name.stem() : name;
 }
 
 } // namespace
@@ -118,21 +114,19 @@ void FwComposition::saveOver()
     OsFile const file(_path);
     file.replace(FwCompositionWriter::write(*_graph));
     _version = file.getVersion();
-    _isModified = false;
-    if (_listener)
-        _listener->compositionSaved(*this);
+    setModified(false);
 }
 
-void FwComposition::setListener(FwCompositionListener* listener)
+void FwComposition::setChangeCallback(std::function<void()> callback)
 {
-    _listener = listener;
+    _changeCallback = std::move(callback);
 }
 
-void FwComposition::noteChange()
+void FwComposition::setModified(bool isModified)
 {
-    _isModified = true;
-    if (_listener)
-        _listener->compositionChanged(*this);
+    _isModified = isModified;
+    if (_changeCallback)
+        _changeCallback();
 }
 
 } // namespace Kv

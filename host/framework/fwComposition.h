@@ -6,12 +6,12 @@
 #include "internalAPI/piCompositionGraphInterface.h"
 #include "resmgt/osFilePath.h"
 
+#include <functional>
 #include <memory>
 
 namespace Kv
 {
 
-class FwCompositionListener;
 class FwGraph;
 class FwNode;
 
@@ -20,8 +20,8 @@ class FwNode;
 class KV_API FwComposition : public PiCompositionGraphInterface
 {
 public:
-    /// The extension of the names of compositions' files, without the dot.
-    static constexpr char const* extension = "vmcomposition";
+    /// The extension of the names of compositions' files, with the dot.
+    static constexpr char const* extension = ".vmcomposition";
 
     /// Reads the file, whatever its extension. Throws `ExBase`, naming the file and the line, for what is wrong with
     /// it.
@@ -53,15 +53,15 @@ public:
     void save() override;
     void saveOver() override;
 
-    /// Borrowed; null for none. Takes the place of the one before.
-    void setListener(FwCompositionListener* listener);
+    /// Called when the composition has been changed or saved; null for none. Takes the place of the one before.
+    void setChangeCallback(std::function<void()> callback);
 
 private:
     friend class FwGraph;
 
     explicit FwComposition(OsFilePath path);
 
-    void noteChange();
+    void setModified(bool isModified);
 
     OsFilePath _path;
     /// That of the file as it was read or written last.
@@ -70,7 +70,7 @@ private:
     RCShdPtr<FwGraph> _graph;
     bool _isModified = false;
     Keeper::weak_type _keeper;
-    FwCompositionListener* _listener = nullptr;
+    std::function<void()> _changeCallback;
 };
 
 } // namespace Kv

@@ -52,13 +52,4 @@ std::string FwCompositionWriter::write(PiGraph const& graph)
     return stream.str();
 }
 
-void FwCompositionWriter::requireValue(std::string const& name, std::string const& text)
-{
-    if (name.empty())
-        throw ExBase(__FILE__, __LINE__, "A value needs a name");
-    std::ostringstream stream;
-    XmlWriter writer(stream, indent);
-    writeEntry(writer, Format::value, name, Format::text, text);
-}
-
 } // namespace Kv

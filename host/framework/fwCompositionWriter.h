@@ -13,9 +13,6 @@ class FwCompositionWriter
 public:
     /// The text of the whole file, which gives exactly the same nodes when it is read.
     static std::string write(PiGraph const& graph);
-
-    /// Throws `ExBase` for a value of a node that cannot be written.
-    static void requireValue(std::string const& name, std::string const& text);
 };
 
 } // namespace Kv

@@ -2,8 +2,8 @@
 
 #include "base/rcWeakAccessor.h"
 #include "framework/fwComposition.h"
-#include "framework/fwCompositionWriter.h"
 #include "resmgt/liStringUtil.h"
+#include "resmgt/xmlWriter.h"
 
 #include <utility>
 
@@ -69,9 +69,12 @@ void FwGraph::setNodeValue(std::string const& nodeName, std::string const& value
     if (!composition->isEditable())
         fail("Composition " + LiStringUtil::getPrintable(_name) + " cannot be changed: " +
              LiStringUtil::getPrintablePath(composition->getPath().toString()) + " cannot be written");
-    FwCompositionWriter::requireValue(valueName, text);
+    if (valueName.empty())
+        fail("A value needs a name");
+    XmlWriter::requireText(valueName, "name of a value");
+    XmlWriter::requireText(text, "value " + LiStringUtil::getPrintable(valueName));
     if (node->second->setValue(valueName, text))
-        composition->noteChange();
+        composition->setModified(true);
 }
 
 } // namespace Kv

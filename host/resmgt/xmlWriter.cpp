@@ -55,12 +55,6 @@ std::string escape(std::string const& text, char const* escaped)
     return result.append(text, copied);
 }
 
-void requireText(std::string const& text, std::string const& what)
-{
-    if (auto const offence = XmlSyntax::findOffence(text))
-        fail(what + ": " + offence->words + ": " + LiStringUtil::getPrintable(text, offence->offset));
-}
-
 std::size_t requireIndent(int indent)
 {
     if (indent < 0)
@@ -130,6 +124,12 @@ void XmlWriter::closeTag()
     write((_isStartTagOpen ? "/>" : getLineLead(depth) + "</" + _openNames.back() + ">") + getTrail(depth));
     _openNames.pop_back();
     _isStartTagOpen = false;
+}
+
+void XmlWriter::requireText(std::string const& text, std::string const& what)
+{
+    if (auto const offence = XmlSyntax::findOffence(text))
+        fail(what + ": " + offence->words + ": " + LiStringUtil::getPrintable(text, offence->offset));
 }
 
 void XmlWriter::requireElement(std::string const& name) const

@@ -38,6 +38,9 @@ public:
     /// Ends the innermost open element.
     void closeTag();
 
+    /// Throws for what cannot be written as a text or as the value of an attribute; the words begin with `what`.
+    static void requireText(std::string const& text, std::string const& what);
+
 private:
     void requireElement(std::string const& name) const;
     void requireAttribute(std::string const& name) const;

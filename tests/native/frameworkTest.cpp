@@ -1,5 +1,4 @@
 #include "appUi/uiCompositionWorkspace.h"
-#include "appUi/uiCompositionWorkspaceListener.h"
 #include "base/rcWeakAccessor.h"
 #include "framework/fwComposition.h"
 #include "pluginAPI/piNode.h"
@@ -9,6 +8,7 @@
 #include <fstream>
 #include <gtest/gtest.h>
 #include <iterator>
+#include <set>
 #include <string>
 #include <sys/resource.h>
 #include <sys/stat.h>
@@ -272,18 +272,18 @@ TEST_F(Compositions, AreAsTheyWereOnADiskThatIsFull)
 namespace
 {
 
-/// Writes down what it hears, with the name of the composition and that of the current one.
-class Hearer : public UiCompositionWorkspaceListener
+/// Writes down what has become different each time that the workspace tells of a change.
+class Hearer
 {
 public:
-    explicit Hearer(UiCompositionWorkspace& workspace) : _workspace(workspace) { workspace.setListener(this); }
-
-    void compositionOpened(Composition const& composition) override { note("opened", composition); }
-    void compositionClosed(Composition const& composition) override { note("closed", composition); }
-    void currentCompositionChanged() override { note("current", _workspace.getCurrentComposition()); }
-    void compositionChanged(Composition const& composition) override { note("changed", composition); }
+    explicit Hearer(UiCompositionWorkspace& workspace) : _workspace(workspace)
+    {
+        look();
+        workspace.setChangeCallback([this] { hear(); });
+    }
 
     std::string take() { return std::exchange(_heard, ""); }
+    int takeCount() { return std::exchange(_count, 0); }
 
     static std::string nameOf(Composition const& composition)
     {
@@ -291,13 +291,46 @@ public:
     }
 
 private:
-    void note(std::string const& what, Composition const& composition)
+    void look()
     {
-        _heard += what + " " + nameOf(composition) + " of " + std::to_string(_workspace.getNbCompositions()) + "; ";
+        _current = nameOf(_workspace.getCurrentComposition());
+        _names.clear();
+        for (auto all = _workspace.getCompositions(); !all.atEnd(); ++all)
+            _names.insert(nameOf(*all));
+    }
+
+    void hear()
+    {
+        ++_count;
+        std::string const heard = _heard;
+        std::string const current = _current;
+        std::set<std::string> const names = _names;
+        look();
+        noteMissing("opened", _names, names);
+        noteMissing("closed", names, _names);
+        if (_current != current)
+            note("current", _current);
+        if (_heard == heard)
+            note("changed", _current);
+    }
+
+    void noteMissing(char const* what, std::set<std::string> const& names, std::set<std::string> const& others)
+    {
+        for (std::string const& name : names)
+            if (others.count(name) == 0)
+                note(what, name);
+    }
+
+    void note(char const* what, std::string const& name)
+    {
+        _heard += std::string(what) + " " + name + " of " + std::to_string(_workspace.getNbCompositions()) + "; ";
     }
 
     UiCompositionWorkspace& _workspace;
+    std::string _current;
+    std::set<std::string> _names;
     std::string _heard;
+    int _count = 0;
 };
 
 } // namespace
@@ -312,6 +345,7 @@ TEST_F(Compositions, AreOpenedMadeCurrentAndClosedInAWorkspace)
     EXPECT_TRUE(workspace->getFocus().isNull());
     Composition const a = workspace->open(pathOf("a"));
     EXPECT_EQ(hearer.take(), "opened a of 1; current a of 1; ");
+    EXPECT_EQ(hearer.takeCount(), 1);
     Composition const b = workspace->open(pathOf("b"));
     Composition const c = workspace->open(pathOf("c"));
     hearer.take();
@@ -329,8 +363,10 @@ TEST_F(Compositions, AreOpenedMadeCurrentAndClosedInAWorkspace)
     RCWeakAccessor<const PiCompositionGraphInterface> const held(b);
     RCShdPtr<const PiGraph> const graph = held->getGraph();
     EXPECT_TRUE(workspace->getComposition(graph) == b);
+    hearer.takeCount();
     workspace->close(b);
     EXPECT_EQ(hearer.take(), "closed b of 2; current c of 2; ");
+    EXPECT_EQ(hearer.takeCount(), 1);
     EXPECT_TRUE(workspace->getComposition(graph).isExpired()) << "closed, although it is held here";
     expectContains(wordsOf([&] { workspace->openComposition(b); }), "has been closed");
     EXPECT_THROW(workspace->close(b), ExBase);

@@ -1,8 +1,0 @@
-#include "appUi/uiCompositionWorkspaceListener.h"
-
-namespace Kv
-{
-
-UiCompositionWorkspaceListener::~UiCompositionWorkspaceListener() = default;
-
-} // namespace Kv

@@ -1,8 +1,0 @@
-#include "framework/fwCompositionListener.h"
-
-namespace Kv
-{
-
-FwCompositionListener::~FwCompositionListener() = default;
-
-} // namespace Kv
