@@ -17,7 +17,7 @@ namespace
 
 using Names = std::vector<std::string>;
 
-/// By function; each lasts as long as the process.
+/// The names of the parameters, by function. A function that is gone leaves its entry to the next at its place.
 std::map<PyObject*, Names>& getParameters()
 {
     static std::map<PyObject*, Names> parameters;

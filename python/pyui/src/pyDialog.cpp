@@ -460,7 +460,7 @@ void Dialog::removeCallback(std::string const& widgetName, PiWidget::EventType e
     WidgetCbs::release(set);
 }
 
-// It changes the dialog, as a script sees it. NOLINTNEXTLINE(readability-make-member-function-const)
+// It changes how the dialog looks. NOLINTNEXTLINE(readability-make-member-function-const)
 void Dialog::setWidgetResourceName(std::string const& widgetName, std::string const& resName)
 {
     UiWidget::setWidgetResTable(getWidget(widgetName), resName);
