@@ -15,6 +15,8 @@ from user import User
 
 
 def pytest_configure(config):
+    if stage.APPLICATION:
+        stage.APPLICATION.resize(1180, 860)  # with room for the dialogs of the tests
     config.addinivalue_line('markers', 'standalone: about dialogs that have windows of their own')
     config.addinivalue_line('markers', 'inside: about the running application')
     config.addinivalue_line('markers', 'screen: on a real screen too, where the keyboard and windows are what matters')

@@ -4,8 +4,6 @@ from PyQt6.QtWidgets import QApplication, QLabel, QWidget
 
 # The application's window; None in an interpreter on its own.
 APPLICATION = next((window for window in QApplication.topLevelWidgets() if window.objectName() == 'Velmora'), None)
-if APPLICATION:
-    APPLICATION.resize(1180, 720)  # as on a screen that has room for it
 
 # What a dialog has above its content, in pixels.
 TITLE_HEIGHT = 25 if APPLICATION else 24

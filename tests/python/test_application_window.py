@@ -8,6 +8,8 @@ import pytest
 
 from test_application import COMPOSITION, PROGRAM, WATCHING, run, run_inside, write
 
+pytestmark = pytest.mark.standalone
+
 TOOLS = '''
 import sys, time, stage, watching
 from watching import QApplication, QTimer, trigger

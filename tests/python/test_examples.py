@@ -40,7 +40,8 @@ def test_the_demo_plays_itself_where_there_is_no_display_and_leaves_pictures(tmp
 
 def test_a_vote_needs_the_box_and_a_name(patient, capsys):
     tips = []
-    patient.plan(lambda user: tips.append(user.find('Vote').toolTip()), lambda user: user.click('CloseButton_Send'), lambda user: user.click('Vote'),
+    patient.plan(lambda user: tips.append(user.find('Vote').toolTip()),
+                 lambda user: user.click('CloseButton_Send'), lambda user: user.click('Vote'),
                  lambda user: user.click('CloseButton_Send'), lambda user: user.close(),
                  lambda user: user.click('Name'), lambda user: user.type('Ada'),
                  lambda user: user.click('CloseButton_Send'))

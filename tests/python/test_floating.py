@@ -73,7 +73,7 @@ def turn_wheel(widget, x=0, y=0):
 @pytest.fixture
 def small_panel():
     size = stage.APPLICATION.size()
-    stage.APPLICATION.resize(900, 500)
+    stage.APPLICATION.resize(900, 640)
     QApplication.processEvents()
     yield panel()
     stage.APPLICATION.resize(size)
@@ -204,7 +204,7 @@ def test_a_dialog_larger_than_the_panel_fills_it_and_scrolls_as_far_as_it_was_ma
     turn_wheel(low, x=-50)
     turn_wheel(low, y=50)
     assert not high.visibleRegion().isEmpty() and title_bar(window).pos() == QPoint(0, 0)
-    stage.APPLICATION.resize(1700, 1000)
+    stage.APPLICATION.resize(1700, 1200)
     QApplication.processEvents()
     assert window.geometry() == QRect(0, 0, 1000, 825) and not bars(window)
     drag(title_bar(window), (50, 50))

@@ -3,13 +3,14 @@
 import pytest
 
 import stage
-from callback_tools import no_wait_is_endless  # noqa: F401
 from descriptions import close_button, container, text, widget
 from quorvane_velmora import ui
 from PyQt6.QtCore import QEvent, QPoint, QPointF, QRect, Qt
 from PyQt6.QtGui import QContextMenuEvent, QFontMetrics, QHelpEvent, QMouseEvent
 from PyQt6.QtTest import QTest
 from PyQt6.QtWidgets import QApplication, QLabel, QMenu, QPushButton, QScrollBar, QStyle, QStyleOptionButton, QToolTip
+
+pytestmark = pytest.mark.usefixtures('no_wait_is_endless')
 
 LINES = ['Traceback', '  in <b>render</b>, frame 7'] + ['    line %d of many' % line for line in range(40)]
 
