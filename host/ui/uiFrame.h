@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/rcBase.h"
 #include "base/kvExport.h"
+#include "base/rcBase.h"
 
 namespace Kv
 {
