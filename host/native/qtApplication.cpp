@@ -45,7 +45,7 @@ QCoreApplication* makeApplication(QString const& platform)
     count = static_cast<int>(arguments.size()) - 1;
     auto* const application = new QApplication(count, arguments.data());
     QApplication::setQuitOnLastWindowClosed(false);
-    QApplication::setWindowIcon(makeWindowIcon());
+    QApplication::setWindowIcon(getWindowIcon());
     return application;
 }
 

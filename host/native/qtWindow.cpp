@@ -54,7 +54,7 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, std::strin
     native->setWindowTitle(toQString(title).left(maxTitle).replace(QLatin1String("[*]"), QLatin1String("[*][*]")));
     // Where the application is a script's own, it has no icon as a rule.
     if (QApplication::windowIcon().isNull())
-        native->setWindowIcon(makeWindowIcon());
+        native->setWindowIcon(getWindowIcon());
     native->setGeometry(frame);
     native->setContent(_content->getNative());
 }

@@ -1,5 +1,6 @@
 #include "native/windowIcon.h"
 
+#include <QGuiApplication>
 #include <QPainter>
 #include <QPixmap>
 
@@ -41,11 +42,15 @@ QPixmap draw(int size)
 
 } // namespace
 
-QIcon makeWindowIcon()
+QIcon getWindowIcon()
 {
-    QIcon icon;
+    constexpr char const* name = "kvWindowIcon";
+    auto icon = qApp->property(name).value<QIcon>();
+    if (!icon.isNull())
+        return icon;
     for (int const size : {16, 24, 32, 48, 64, 128, 256})
         icon.addPixmap(draw(size));
+    qApp->setProperty(name, icon);
     return icon;
 }
 
