@@ -118,7 +118,7 @@ private:
 
 BusyWatch::BusyWatch(std::function<bool()> isBusy, std::function<void()> stop)
     : _isBusy(std::move(isBusy)), _stop(std::move(stop)), _environment(makeEnvironment()),
-      _turned(Clock::now().time_since_epoch().count()), _process(getpid())
+      _turned(Clock::now().time_since_epoch().count())
 {
     sigset_t const former = blockSignals();
     _thread = std::thread([this] { watch(); });
@@ -127,12 +127,6 @@ BusyWatch::BusyWatch(std::function<bool()> isBusy, std::function<void()> stop)
 
 BusyWatch::~BusyWatch()
 {
-    if (_process != getpid())
-    {
-        // The child of a script has no such thread.
-        _thread.detach();
-        return;
-    }
     {
         std::lock_guard<std::mutex> const lock(_mutex);
         _ending = true;

@@ -11,8 +11,6 @@
 #include <thread>
 #include <vector>
 
-#include <sys/types.h>
-
 namespace Velmora
 {
 
@@ -61,7 +59,6 @@ private:
     std::atomic<Clock::rep> _turned;
     /// How often the loop has come around since it did not for a while.
     std::atomic<int> _turns{0};
-    pid_t _process;
     std::mutex _mutex;
     std::condition_variable _changed;
     Offer _offer;

@@ -29,6 +29,9 @@ namespace
 constexpr qint64 shareOfTime = 5;
 constexpr qint64 maxCredit = 60'000'000;
 
+/// How many places are marked that a search has found.
+constexpr int maxMarks = 1000;
+
 constexpr int timeAir = 8;
 
 /// What is kept of a line beside its text.
@@ -128,7 +131,7 @@ public:
         _continues = false;
     }
 
-    /// Marks each place where the text stands, the selected one more than the others, and gives their number.
+    /// Marks the places where the text stands, the selected one more than the others, and gives their number.
     int mark(QString const& wanted)
     {
         QTextCharFormat other;
@@ -138,7 +141,8 @@ public:
         selected.setForeground(palette().brush(QPalette::Active, QPalette::HighlightedText));
         QList<QTextEdit::ExtraSelection> places;
         if (!wanted.isEmpty())
-            for (QTextCursor place = document()->find(wanted); !place.isNull(); place = document()->find(wanted, place))
+            for (QTextCursor place = document()->find(wanted); !place.isNull() && places.size() < maxMarks;
+                 place = document()->find(wanted, place))
                 places.append({place, place == textCursor() ? selected : other});
         setExtraSelections(places);
         return static_cast<int>(places.size());
@@ -364,7 +368,10 @@ void LogPane::search(QTextDocument::FindFlags direction)
     QString const wanted = _wanted->text();
     _view->goToNext(wanted, direction);
     int const count = _view->mark(wanted);
-    _found->setText(wanted.isEmpty() ? QString() : count > 0 ? tr("%1 found").arg(count) : tr("nothing found"));
+    QString found = count > 0 ? tr("%1 found").arg(count) : tr("nothing found");
+    if (count == maxMarks)
+        found = tr("%1 or more found").arg(count);
+    _found->setText(wanted.isEmpty() ? QString() : found);
 }
 
 } // namespace Velmora
