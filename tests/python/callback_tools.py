@@ -33,13 +33,7 @@ def listen(dialog, *widgets):
 
 
 class PatientUser(User):
-    """Does the next step also where the one before has not returned, since it blocks in a dialog that it opened. One
-    that only lets the loop come around is given time to return."""
-
-    TURNS = 10
-
-    _blocking = None
-    _turns = 0
+    """Does the next step also where the one before has not returned, since it blocks in a dialog that it opened."""
 
     def plan(self, *steps):
         self._steps.extend(steps)
@@ -53,12 +47,7 @@ class PatientUser(User):
     def _next(self):
         if self._steps:
             self._timer.start(5)
-        if self._blocking is not None and self._blocking is self.window() and self._turns < self.TURNS:
-            self._turns += 1
-            return
-        before, self._blocking, self._turns = self._blocking, self.window(), 0
         super()._next()
-        self._blocking = before
         # From here on anew: what the step ended must have come to its end.
         if self._steps:
             self._timer.start(5)
