@@ -3,10 +3,10 @@
 #include "buildInfo.h"
 #include "pathQuestion.h"
 
-#include "appUi/uiAppMgr.h"
-#include "base/exBase.h"
-#include "base/rcWeakAccessor.h"
-#include "gfx/wsNative.h"
+#include "exBase.h"
+#include "pointers/rcWeakAccessor.h"
+#include "uiAppMgr.h"
+#include "wsNative.h"
 
 #include <QApplication>
 #include <QFileInfo>

@@ -7,10 +7,10 @@
 #include "scriptOutput.h"
 #include "settings.h"
 
-#include "appUi/brBrowser.h"
-#include "appUi/uiCompositionWorkspace.h"
-#include "ui/uiEventCallback.h"
-#include "ui/uiMainWindow.h"
+#include "brBrowser.h"
+#include "uiCompositionWorkspace.h"
+#include "uiEventCallback.h"
+#include "uiMainWindow.h"
 
 #include <QTimer>
 

@@ -1,6 +1,6 @@
 #include "buildInfo.h"
 
-#include "base/inBuildInfoUtil.h"
+#include "packages/inBuildInfoUtil.h"
 
 #include <iomanip>
 

@@ -1,6 +1,6 @@
 #include "compositionPane.h"
 
-#include "pluginAPI/piNode.h"
+#include "piNode.h"
 
 #include <QHeaderView>
 #include <QLabel>

@@ -5,9 +5,9 @@
 #include "stopWindow.h"
 #include "theme.h"
 
-#include "base/exBase.h"
-#include "base/inBuildInfoUtil.h"
-#include "gfx/wsNative.h"
+#include "exBase.h"
+#include "packages/inBuildInfoUtil.h"
+#include "wsNative.h"
 
 #include <fcntl.h>
 #include <filesystem>

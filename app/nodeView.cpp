@@ -1,6 +1,6 @@
 #include "nodeView.h"
 
-#include "pluginAPI/piNode.h"
+#include "piNode.h"
 
 #include <QPainter>
 #include <QPainterPath>

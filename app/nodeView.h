@@ -1,6 +1,6 @@
 #pragma once
 
-#include "pluginAPI/piGraph.h"
+#include "piGraph.h"
 
 #include <QString>
 #include <QWidget>

@@ -1,9 +1,9 @@
 #include "pathQuestion.h"
 
-#include "appUi/uiAppDisabler.h"
-#include "appUi/uiAppMgr.h"
-#include "internalAPI/piBrowserSchemes.h"
-#include "ui/uiApplication.h"
+#include "piBrowserSchemes.h"
+#include "uiAppDisabler.h"
+#include "uiAppMgr.h"
+#include "uiApplication.h"
 
 #include <filesystem>
 

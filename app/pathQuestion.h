@@ -1,7 +1,7 @@
 #pragma once
 
-#include "appUi/brBrowserFloatingHandler.h"
-#include "ui/uiEventCallback.h"
+#include "brBrowserFloatingHandler.h"
+#include "uiEventCallback.h"
 
 #include <functional>
 #include <string>

@@ -2,7 +2,7 @@
 
 #include "theme.h"
 
-#include "gfx/wsNative.h"
+#include "wsNative.h"
 
 #include <QApplication>
 #include <QDialog>

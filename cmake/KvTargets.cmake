@@ -1,14 +1,29 @@
-# kv_library(NAME SOURCES... [DEPENDS libraries...] [PRIVATE targets...] [OWN_RECORD]): a host or sibling library,
-# lib<NAME>.so, which is a package by the name without KV. Its record names the libraries of DEPENDS in their order; one
-# with OWN_RECORD makes it itself.
+# kv_options: what every target of the project is compiled and linked with.
+add_library(kv_options INTERFACE)
+# What Boost.Python includes of Boost is called deprecated by Boost itself.
+target_compile_definitions(kv_options INTERFACE BOOST_ALLOW_DEPRECATED_HEADERS BOOST_BIND_GLOBAL_PLACEHOLDERS)
+target_compile_options(kv_options INTERFACE -Wall -Wextra -Wpedantic -Wshadow)
+if(KV_SANITIZE)
+  # Boost.Python asks the holder of an instance for its type when it has destroyed it, which the check of virtual tables
+  # does not survive.
+  target_compile_options(kv_options INTERFACE -fsanitize=address,undefined -fno-sanitize=vptr
+                                              -fno-sanitize-recover=undefined -fno-omit-frame-pointer)
+  target_link_options(kv_options INTERFACE -fsanitize=address,undefined)
+else()
+  target_link_options(kv_options INTERFACE -Wl,--no-undefined)
+endif()
+
+# kv_library(NAME SOURCES... [DEPENDS rooms...] [PUBLIC targets...] [PRIVATE targets...] [OWN_RECORD]): a host or sibling
+# library, lib<NAME>.so. Its folder is the include folder for those that link it. It is a package by the name without
+# KV. Its record names the libraries of DEPENDS in their order; one with OWN_RECORD makes it itself.
 function(kv_library name)
-  cmake_parse_arguments(PARSE_ARGV 1 arg "OWN_RECORD" "" "SOURCES;DEPENDS;PRIVATE")
+  cmake_parse_arguments(PARSE_ARGV 1 arg "OWN_RECORD" "" "SOURCES;DEPENDS;PUBLIC;PRIVATE")
   add_library(${name} SHARED ${arg_SOURCES})
-  target_link_libraries(${name} PUBLIC ${arg_DEPENDS} PRIVATE ${arg_PRIVATE})
-  target_include_directories(${name} PUBLIC ${PROJECT_SOURCE_DIR}/host ${PROJECT_SOURCE_DIR}/python)
+  target_link_libraries(${name} PUBLIC ${arg_DEPENDS} ${arg_PUBLIC} PRIVATE kv_options ${arg_PRIVATE})
+  target_include_directories(${name} PUBLIC ${CMAKE_CURRENT_SOURCE_DIR})
   set_target_properties(${name} PROPERTIES LIBRARY_OUTPUT_DIRECTORY ${KV_LIBRARY_DIR})
   if(NOT arg_OWN_RECORD)
-    set(record ${PROJECT_SOURCE_DIR}/host/base/inPackageRecord.cpp)
+    set(record ${PROJECT_SOURCE_DIR}/host/base/packages/inPackageRecord.cpp)
     list(TRANSFORM arg_DEPENDS REPLACE "^KV" "")
     list(JOIN arg_DEPENDS "," dependencies)
     string(REGEX REPLACE "^KV" "" package ${name})

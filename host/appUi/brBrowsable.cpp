@@ -1,4 +1,4 @@
-#include "appUi/brBrowsable.h"
+#include "brBrowsable.h"
 
 #include <utility>
 

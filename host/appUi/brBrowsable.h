@@ -1,12 +1,12 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/prdPredicate.h"
-#include "base/rcBase.h"
-#include "base/rcShdPtr.h"
-#include "internalAPI/snItem.h"
-#include "internalAPI/snItemConvert.h"
-#include "resmgt/liString.h"
+#include "kvExport.h"
+#include "pointers/rcBase.h"
+#include "pointers/rcShdPtr.h"
+#include "prdPredicate.h"
+#include "snItem.h"
+#include "snItemConvert.h"
+#include "text/liString.h"
 
 namespace Kv
 {

@@ -1,11 +1,11 @@
-#include "appUi/brBrowser.h"
+#include "brBrowser.h"
 
-#include "appUi/brBrowsable.h"
-#include "base/exBase.h"
-#include "framework/fwComposition.h"
-#include "native/ntPlatform.h"
-#include "resmgt/osPlace.h"
-#include "ui/uiContainer.h"
+#include "brBrowsable.h"
+#include "exBase.h"
+#include "files/osPlace.h"
+#include "fwComposition.h"
+#include "ntPlatform.h"
+#include "uiContainer.h"
 
 #include <filesystem>
 #include <optional>

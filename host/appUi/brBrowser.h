@@ -1,13 +1,13 @@
 #pragma once
 
-#include "appUi/brTypes.h"
-#include "appUi/uiView.h"
-#include "base/cbHandler.h"
-#include "base/kvExport.h"
-#include "internalAPI/snSelection.h"
-#include "native/ntPeers.h"
-#include "resmgt/liString.h"
-#include "ui/uiWidget.h"
+#include "brTypes.h"
+#include "cbHandler.h"
+#include "kvExport.h"
+#include "ntPeers.h"
+#include "snSelection.h"
+#include "text/liString.h"
+#include "uiView.h"
+#include "uiWidget.h"
 
 #include <string>
 #include <vector>

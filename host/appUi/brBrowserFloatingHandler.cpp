@@ -1,8 +1,8 @@
-#include "appUi/brBrowserFloatingHandler.h"
+#include "brBrowserFloatingHandler.h"
 
-#include "base/exBase.h"
-#include "internalAPI/piBrowserSchemes.h"
-#include "resmgt/liStringUtil.h"
+#include "exBase.h"
+#include "piBrowserSchemes.h"
+#include "text/liStringUtil.h"
 
 namespace Kv
 {

@@ -1,9 +1,9 @@
 #pragma once
 
-#include "appUi/brBrowser.h"
-#include "appUi/uiFloatingHandler.h"
-#include "base/vector.h"
-#include "ui/uiPushButton.h"
+#include "brBrowser.h"
+#include "iterators/vector.h"
+#include "uiFloatingHandler.h"
+#include "uiPushButton.h"
 
 namespace Kv
 {

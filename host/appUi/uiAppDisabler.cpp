@@ -1,6 +1,6 @@
-#include "appUi/uiAppDisabler.h"
+#include "uiAppDisabler.h"
 
-#include "appUi/uiAppMgr.h"
+#include "uiAppMgr.h"
 
 namespace Kv
 {

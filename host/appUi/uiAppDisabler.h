@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "ui/uiMainWindow.h"
+#include "kvExport.h"
+#include "pointers/rcShdPtr.h"
+#include "uiMainWindow.h"
 
 namespace Kv
 {

@@ -1,4 +1,4 @@
-#include "appUi/uiAppMgr.h"
+#include "uiAppMgr.h"
 
 #include <algorithm>
 

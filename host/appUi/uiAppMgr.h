@@ -1,10 +1,10 @@
 #pragma once
 
-#include "appUi/uiView.h"
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "ui/uiMainWindow.h"
-#include "ui/uiPanel.h"
+#include "kvExport.h"
+#include "pointers/rcShdPtr.h"
+#include "uiMainWindow.h"
+#include "uiPanel.h"
+#include "uiView.h"
 
 #include <memory>
 #include <vector>

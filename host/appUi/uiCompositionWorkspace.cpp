@@ -1,10 +1,10 @@
-#include "appUi/uiCompositionWorkspace.h"
+#include "uiCompositionWorkspace.h"
 
-#include "appUi/brBrowser.h"
-#include "base/rcWeakAccessor.h"
-#include "framework/fwComposition.h"
-#include "resmgt/liStringUtil.h"
-#include "ui/uiContainer.h"
+#include "brBrowser.h"
+#include "fwComposition.h"
+#include "pointers/rcWeakAccessor.h"
+#include "text/liStringUtil.h"
+#include "uiContainer.h"
 
 #include <algorithm>
 #include <utility>

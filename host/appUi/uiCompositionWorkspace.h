@@ -1,9 +1,9 @@
 #pragma once
 
-#include "appUi/uiCompositionWorkspaceClientInterface.h"
-#include "appUi/uiWorkspace.h"
-#include "base/kvExport.h"
-#include "base/rcStrongPtr.h"
+#include "kvExport.h"
+#include "pointers/rcStrongPtr.h"
+#include "uiCompositionWorkspaceClientInterface.h"
+#include "uiWorkspace.h"
 
 #include <functional>
 #include <vector>

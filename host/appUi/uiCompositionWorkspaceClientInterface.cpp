@@ -1,4 +1,4 @@
-#include "appUi/uiCompositionWorkspaceClientInterface.h"
+#include "uiCompositionWorkspaceClientInterface.h"
 
 namespace Kv
 {

@@ -1,12 +1,12 @@
 #pragma once
 
-#include "base/constIterator.h"
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "base/rcWeakPtr.h"
-#include "internalAPI/piCompositionGraphInterface.h"
-#include "pluginAPI/piGraph.h"
-#include "resmgt/osFilePath.h"
+#include "files/osFilePath.h"
+#include "iterators/constIterator.h"
+#include "kvExport.h"
+#include "piCompositionGraphInterface.h"
+#include "piGraph.h"
+#include "pointers/rcShdPtr.h"
+#include "pointers/rcWeakPtr.h"
 
 namespace Kv
 {

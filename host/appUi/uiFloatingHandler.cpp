@@ -1,7 +1,7 @@
-#include "appUi/uiFloatingHandler.h"
+#include "uiFloatingHandler.h"
 
-#include "ui/uiColorRegistry.h"
-#include "ui/uiLabel.h"
+#include "uiColorRegistry.h"
+#include "uiLabel.h"
 
 #include <algorithm>
 

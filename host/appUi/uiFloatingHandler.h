@@ -1,10 +1,10 @@
 #pragma once
 
-#include "base/geVector2.h"
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "ui/uiEventCallback.h"
-#include "ui/uiMoveContainer.h"
+#include "geVector2.h"
+#include "kvExport.h"
+#include "pointers/rcShdPtr.h"
+#include "uiEventCallback.h"
+#include "uiMoveContainer.h"
 
 namespace Kv
 {

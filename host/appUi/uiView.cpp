@@ -1,4 +1,4 @@
-#include "appUi/uiView.h"
+#include "uiView.h"
 
 namespace Kv
 {

@@ -1,9 +1,9 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcBase.h"
-#include "base/rcShdPtr.h"
-#include "internalAPI/snSelection.h"
+#include "kvExport.h"
+#include "pointers/rcBase.h"
+#include "pointers/rcShdPtr.h"
+#include "snSelection.h"
 
 namespace Kv
 {

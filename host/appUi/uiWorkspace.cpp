@@ -1,6 +1,6 @@
-#include "appUi/uiWorkspace.h"
+#include "uiWorkspace.h"
 
-#include "gfx/wsThread.h"
+#include "wsThread.h"
 
 namespace Kv
 {

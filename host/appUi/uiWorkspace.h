@@ -1,9 +1,9 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "base/uPtr.h"
-#include "ui/uiWidget.h"
+#include "kvExport.h"
+#include "pointers/rcShdPtr.h"
+#include "pointers/uPtr.h"
+#include "uiWidget.h"
 
 namespace Kv
 {

@@ -1,4 +1,4 @@
-#include "base/assertions.h"
+#include "assertions.h"
 
 namespace Kv
 {

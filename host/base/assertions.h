@@ -1,6 +1,6 @@
 #pragma once
 
-#include "base/exBase.h"
+#include "exBase.h"
 
 namespace Kv
 {

@@ -1,4 +1,4 @@
-#include "base/exBase.h"
+#include "exBase.h"
 
 #include <utf8.h>
 

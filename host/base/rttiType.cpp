@@ -1,4 +1,4 @@
-#include "base/rttiType.h"
+#include "rttiType.h"
 
 namespace Kv
 {

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "base/kvExport.h"
+#include "kvExport.h"
 
 #include <typeinfo>
 

@@ -1,12 +1,12 @@
-#include "framework/fwComposition.h"
+#include "fwComposition.h"
 
-#include "framework/fwCompositionFormat.h"
-#include "framework/fwCompositionReader.h"
-#include "framework/fwCompositionWriter.h"
-#include "framework/fwGraph.h"
-#include "framework/fwNode.h"
-#include "resmgt/liStringUtil.h"
-#include "resmgt/osFile.h"
+#include "files/osFile.h"
+#include "fwCompositionFormat.h"
+#include "fwCompositionReader.h"
+#include "fwCompositionWriter.h"
+#include "fwGraph.h"
+#include "fwNode.h"
+#include "text/liStringUtil.h"
 
 #include <filesystem>
 #include <utility>

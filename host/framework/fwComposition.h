@@ -1,10 +1,10 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcStrongPtr.h"
-#include "base/rcWeakPtr.h"
-#include "internalAPI/piCompositionGraphInterface.h"
-#include "resmgt/osFilePath.h"
+#include "files/osFilePath.h"
+#include "kvExport.h"
+#include "piCompositionGraphInterface.h"
+#include "pointers/rcStrongPtr.h"
+#include "pointers/rcWeakPtr.h"
 
 #include <functional>
 #include <memory>

@@ -1,10 +1,10 @@
-#include "framework/fwCompositionReader.h"
+#include "fwCompositionReader.h"
 
-#include "framework/fwCompositionFormat.h"
-#include "resmgt/liStringUtil.h"
-#include "resmgt/osFile.h"
-#include "resmgt/xmlDocument.h"
-#include "resmgt/xmlError.h"
+#include "files/osFile.h"
+#include "fwCompositionFormat.h"
+#include "text/liStringUtil.h"
+#include "xml/xmlDocument.h"
+#include "xml/xmlError.h"
 
 #include <algorithm>
 #include <charconv>

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "framework/fwNode.h"
-#include "resmgt/osFilePath.h"
-#include "resmgt/xmlElement.h"
+#include "files/osFilePath.h"
+#include "fwNode.h"
+#include "xml/xmlElement.h"
 
 #include <set>
 #include <string>

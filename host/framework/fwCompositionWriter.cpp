@@ -1,8 +1,8 @@
-#include "framework/fwCompositionWriter.h"
+#include "fwCompositionWriter.h"
 
-#include "framework/fwCompositionFormat.h"
-#include "pluginAPI/piNode.h"
-#include "resmgt/xmlWriter.h"
+#include "fwCompositionFormat.h"
+#include "piNode.h"
+#include "xml/xmlWriter.h"
 
 #include <sstream>
 #include <string>

@@ -1,9 +1,9 @@
-#include "framework/fwGraph.h"
+#include "fwGraph.h"
 
-#include "base/rcWeakAccessor.h"
-#include "framework/fwComposition.h"
-#include "resmgt/liStringUtil.h"
-#include "resmgt/xmlWriter.h"
+#include "fwComposition.h"
+#include "pointers/rcWeakAccessor.h"
+#include "text/liStringUtil.h"
+#include "xml/xmlWriter.h"
 
 #include <utility>
 

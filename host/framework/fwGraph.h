@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/rcWeakPtr.h"
-#include "framework/fwNode.h"
-#include "pluginAPI/piGraph.h"
+#include "fwNode.h"
+#include "piGraph.h"
+#include "pointers/rcWeakPtr.h"
 
 #include <map>
 #include <string>

@@ -1,7 +1,7 @@
-#include "framework/fwNode.h"
+#include "fwNode.h"
 
-#include "base/rcWeakAccessor.h"
-#include "framework/fwComposition.h"
+#include "fwComposition.h"
+#include "pointers/rcWeakAccessor.h"
 
 #include <algorithm>
 #include <utility>

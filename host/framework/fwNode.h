@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/rcWeakPtr.h"
-#include "pluginAPI/piNode.h"
+#include "piNode.h"
+#include "pointers/rcWeakPtr.h"
 
 #include <string>
 

@@ -1,7 +1,7 @@
-#include "gfx/wsCursorRegistry.h"
+#include "wsCursorRegistry.h"
 
-#include "gfx/wsNative.h"
-#include "gfx/wsThread.h"
+#include "wsNative.h"
+#include "wsThread.h"
 
 namespace Kv
 {

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "native/ntPlatform.h"
-#include "resmgt/liString.h"
+#include "kvExport.h"
+#include "ntPlatform.h"
+#include "text/liString.h"
 
 namespace Kv
 {

@@ -1,7 +1,7 @@
-#include "gfx/wsFont.h"
+#include "wsFont.h"
 
-#include "gfx/wsNative.h"
-#include "resmgt/liStringUtil.h"
+#include "text/liStringUtil.h"
+#include "wsNative.h"
 
 namespace Kv
 {

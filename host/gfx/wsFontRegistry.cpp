@@ -1,4 +1,4 @@
-#include "gfx/wsFontRegistry.h"
+#include "wsFontRegistry.h"
 
 namespace Kv
 {

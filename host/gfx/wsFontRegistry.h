@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/rcShdPtr.h"
-#include "gfx/wsFont.h"
+#include "pointers/rcShdPtr.h"
+#include "wsFont.h"
 
 namespace Kv
 {

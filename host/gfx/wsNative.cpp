@@ -1,7 +1,7 @@
-#include "gfx/wsNative.h"
+#include "wsNative.h"
 
-#include "gfx/wsCursorRegistry.h"
-#include "gfx/wsThread.h"
+#include "wsCursorRegistry.h"
+#include "wsThread.h"
 
 #include <dlfcn.h>
 #include <filesystem>

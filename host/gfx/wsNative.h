@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "native/ntPlatform.h"
+#include "kvExport.h"
+#include "ntPlatform.h"
 
 namespace Kv
 {

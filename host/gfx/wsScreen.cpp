@@ -1,6 +1,6 @@
-#include "gfx/wsScreen.h"
+#include "wsScreen.h"
 
-#include "gfx/wsNative.h"
+#include "wsNative.h"
 
 namespace Kv
 {

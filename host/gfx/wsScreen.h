@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/geVector2.h"
-#include "base/kvExport.h"
+#include "geVector2.h"
+#include "kvExport.h"
 
 namespace Kv
 {

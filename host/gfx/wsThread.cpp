@@ -1,6 +1,6 @@
-#include "gfx/wsThread.h"
+#include "wsThread.h"
 
-#include "base/exBase.h"
+#include "exBase.h"
 
 #include <atomic>
 #include <thread>

@@ -1,4 +1,4 @@
-#include "gfx/wsWindow.h"
+#include "wsWindow.h"
 
 #include <utility>
 

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcBase.h"
-#include "native/ntPeers.h"
+#include "kvExport.h"
+#include "ntPeers.h"
+#include "pointers/rcBase.h"
 
 #include <memory>
 

@@ -1,4 +1,4 @@
-#include "gfx/wsWindowStyle.h"
+#include "wsWindowStyle.h"
 
 namespace Kv
 {

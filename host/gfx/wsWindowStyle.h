@@ -1,9 +1,9 @@
 #pragma once
 
-#include "base/geRectangle.h"
-#include "base/kvExport.h"
-#include "base/rcBase.h"
-#include "base/rcShdPtr.h"
+#include "geRectangle.h"
+#include "kvExport.h"
+#include "pointers/rcBase.h"
+#include "pointers/rcShdPtr.h"
 
 namespace Kv
 {

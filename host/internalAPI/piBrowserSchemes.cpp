@@ -1,4 +1,4 @@
-#include "internalAPI/piBrowserSchemes.h"
+#include "piBrowserSchemes.h"
 
 namespace Kv
 {

@@ -1,4 +1,4 @@
-#include "internalAPI/piCompositionGraphInterface.h"
+#include "piCompositionGraphInterface.h"
 
 namespace Kv
 {

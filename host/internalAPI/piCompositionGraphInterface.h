@@ -1,9 +1,9 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "pluginAPI/piGraph.h"
-#include "pluginAPI/piNodeController.h"
-#include "resmgt/osFilePath.h"
+#include "files/osFilePath.h"
+#include "kvExport.h"
+#include "piGraph.h"
+#include "piNodeController.h"
 
 namespace Kv
 {

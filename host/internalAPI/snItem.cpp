@@ -1,4 +1,4 @@
-#include "internalAPI/snItem.h"
+#include "snItem.h"
 
 namespace Kv
 {

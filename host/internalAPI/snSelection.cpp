@@ -1,4 +1,4 @@
-#include "internalAPI/snSelection.h"
+#include "snSelection.h"
 
 #include <algorithm>
 #include <iterator>

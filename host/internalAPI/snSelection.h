@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/prdPredicate.h"
-#include "base/rcShdPtr.h"
-#include "internalAPI/snItem.h"
+#include "pointers/rcShdPtr.h"
+#include "prdPredicate.h"
+#include "snItem.h"
 
 #include <list>
 

@@ -1,4 +1,4 @@
-#include "pluginAPI/piGraph.h"
+#include "piGraph.h"
 
 namespace Kv
 {

@@ -1,4 +1,4 @@
-#include "pluginAPI/piNode.h"
+#include "piNode.h"
 
 namespace Kv
 {

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "base/rcWeakPtr.h"
+#include "kvExport.h"
+#include "pointers/rcShdPtr.h"
+#include "pointers/rcWeakPtr.h"
 
 #include <string>
 #include <utility>

@@ -1,4 +1,4 @@
-#include "pluginAPI/piNodeController.h"
+#include "piNodeController.h"
 
 namespace Kv
 {

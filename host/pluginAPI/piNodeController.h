@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
+#include "kvExport.h"
+#include "pointers/rcShdPtr.h"
 
 namespace Kv
 {

@@ -1,6 +1,6 @@
 #include <Python.h>
 
-#include "scriptingAPI/piPythonUtils.h"
+#include "piPythonUtils.h"
 
 #include <boost/uuid/random_generator.hpp>
 

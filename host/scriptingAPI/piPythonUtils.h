@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/uuid.h"
+#include "kvExport.h"
+#include "uuid.h"
 
 namespace Kv
 {

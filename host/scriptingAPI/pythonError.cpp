@@ -1,4 +1,4 @@
-#include "scriptingAPI/pythonError.h"
+#include "pythonError.h"
 
 namespace Kv
 {

@@ -1,6 +1,6 @@
 #include <boost/python.hpp>
 
-#include "resmgt/osFilePath.h"
+#include "files/osFilePath.h"
 
 #include <cstddef>
 #include <cstring>

@@ -1,5 +1,5 @@
-#include "gfx/wsNative.h"
-#include "scriptingAPI/pythonError.h"
+#include "pythonError.h"
+#include "wsNative.h"
 
 #include <boost/python/errors.hpp>
 

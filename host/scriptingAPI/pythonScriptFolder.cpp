@@ -1,6 +1,6 @@
 #include <boost/python.hpp>
 
-#include "ui/uiResTable.h"
+#include "uiResTable.h"
 
 #include <filesystem>
 #include <string>

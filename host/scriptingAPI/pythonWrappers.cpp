@@ -1,8 +1,8 @@
 #include <boost/python.hpp>
 
-#include "gfx/wsNative.h"
-#include "gfx/wsThread.h"
-#include "native/ntPlatform.h"
+#include "ntPlatform.h"
+#include "wsNative.h"
+#include "wsThread.h"
 
 #include <string>
 #include <unordered_map>

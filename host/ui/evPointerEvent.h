@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/geVector2.h"
-#include "ui/piWidget.h"
+#include "geVector2.h"
+#include "piWidget.h"
 
 namespace Kv
 {

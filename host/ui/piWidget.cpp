@@ -1,6 +1,6 @@
-#include "ui/piWidget.h"
+#include "piWidget.h"
 
-#include "base/rcShdPtr.h"
+#include "pointers/rcShdPtr.h"
 
 #include <algorithm>
 

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/cbHandler.h"
-#include "base/kvExport.h"
-#include "base/rcBase.h"
+#include "cbHandler.h"
+#include "kvExport.h"
+#include "pointers/rcBase.h"
 
 #include <vector>
 

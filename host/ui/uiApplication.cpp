@@ -1,6 +1,6 @@
-#include "ui/uiApplication.h"
+#include "uiApplication.h"
 
-#include "gfx/wsNative.h"
+#include "wsNative.h"
 
 namespace Kv
 {

@@ -1,6 +1,6 @@
-#include "ui/uiColorRegistry.h"
+#include "uiColorRegistry.h"
 
-#include "base/exBase.h"
+#include "exBase.h"
 
 namespace Kv
 {

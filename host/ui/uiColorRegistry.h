@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "gfx/coRgbColor.h"
-#include "resmgt/liString.h"
+#include "coRgbColor.h"
+#include "kvExport.h"
+#include "text/liString.h"
 
 namespace Kv
 {

@@ -1,4 +1,4 @@
-#include "ui/uiConstraint.h"
+#include "uiConstraint.h"
 
 #include <cmath>
 #include <utility>

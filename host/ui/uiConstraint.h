@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/geVector2.h"
-#include "base/kvExport.h"
-#include "resmgt/liString.h"
+#include "geVector2.h"
+#include "kvExport.h"
+#include "text/liString.h"
 
 #include <array>
 

@@ -1,11 +1,11 @@
-#include "ui/uiContainer.h"
+#include "uiContainer.h"
 
-#include "gfx/wsNative.h"
-#include "native/ntPlatform.h"
-#include "ui/uiLayout.h"
-#include "ui/uiWidgetElement.h"
-#include "ui/uiWidgetFactory.h"
-#include "ui/uiWindow.h"
+#include "ntPlatform.h"
+#include "uiLayout.h"
+#include "uiWidgetElement.h"
+#include "uiWidgetFactory.h"
+#include "uiWindow.h"
+#include "wsNative.h"
 
 #include <algorithm>
 #include <utility>

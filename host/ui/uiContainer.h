@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/iterator.h"
-#include "base/prdPredicate.h"
-#include "ui/uiWidget.h"
+#include "iterators/iterator.h"
+#include "prdPredicate.h"
+#include "uiWidget.h"
 
 #include <string>
 #include <unordered_map>

@@ -1,6 +1,6 @@
-#include "ui/uiCursorGuard.h"
+#include "uiCursorGuard.h"
 
-#include "gfx/wsCursorRegistry.h"
+#include "wsCursorRegistry.h"
 
 namespace Kv
 {

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "resmgt/liString.h"
+#include "kvExport.h"
+#include "text/liString.h"
 
 namespace Kv
 {

@@ -1,8 +1,8 @@
-#include "ui/uiDualState.h"
+#include "uiDualState.h"
 
-#include "native/ntPlatform.h"
-#include "ui/uiContainer.h"
-#include "ui/uiWidgetElement.h"
+#include "ntPlatform.h"
+#include "uiContainer.h"
+#include "uiWidgetElement.h"
 
 #include <utility>
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "native/ntPeers.h"
-#include "ui/uiWidget.h"
+#include "ntPeers.h"
+#include "uiWidget.h"
 
 namespace Kv
 {

@@ -1,6 +1,6 @@
-#include "ui/uiEscapeButton.h"
+#include "uiEscapeButton.h"
 
-#include "ui/uiWidgetPredicate.h"
+#include "uiWidgetPredicate.h"
 
 namespace Kv
 {

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "ui/uiContainer.h"
-#include "ui/uiPushButton.h"
+#include "uiContainer.h"
+#include "uiPushButton.h"
 
 namespace Kv
 {

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/cbHandler.h"
-#include "ui/piWidget.h"
+#include "cbHandler.h"
+#include "piWidget.h"
 
 namespace Kv
 {

@@ -1,4 +1,4 @@
-#include "ui/uiFrame.h"
+#include "uiFrame.h"
 
 namespace Kv
 {

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcBase.h"
+#include "kvExport.h"
+#include "pointers/rcBase.h"
 
 namespace Kv
 {

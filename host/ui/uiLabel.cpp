@@ -1,8 +1,8 @@
-#include "ui/uiLabel.h"
+#include "uiLabel.h"
 
-#include "native/ntPlatform.h"
-#include "ui/uiContainer.h"
-#include "ui/uiWidgetElement.h"
+#include "ntPlatform.h"
+#include "uiContainer.h"
+#include "uiWidgetElement.h"
 
 #include <utility>
 

@@ -1,4 +1,4 @@
-#include "ui/uiLayout.h"
+#include "uiLayout.h"
 
 #include <algorithm>
 #include <cmath>

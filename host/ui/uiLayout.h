@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ui/uiContainer.h"
+#include "uiContainer.h"
 
 #include <optional>
 #include <string>

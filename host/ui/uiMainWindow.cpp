@@ -1,8 +1,8 @@
-#include "ui/uiMainWindow.h"
+#include "uiMainWindow.h"
 
-#include "native/ntPlatform.h"
-#include "ui/uiMoveContainer.h"
-#include "ui/uiPanel.h"
+#include "ntPlatform.h"
+#include "uiMoveContainer.h"
+#include "uiPanel.h"
 
 #include <utility>
 

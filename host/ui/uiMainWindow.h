@@ -1,7 +1,7 @@
 #pragma once
 
-#include "native/ntPeers.h"
-#include "ui/uiTopLevel.h"
+#include "ntPeers.h"
+#include "uiTopLevel.h"
 
 #include <functional>
 

@@ -1,9 +1,9 @@
-#include "ui/uiMenu.h"
+#include "uiMenu.h"
 
-#include "native/ntPlatform.h"
-#include "resmgt/liStringUtil.h"
-#include "ui/uiContainer.h"
-#include "ui/uiWidgetElement.h"
+#include "ntPlatform.h"
+#include "text/liStringUtil.h"
+#include "uiContainer.h"
+#include "uiWidgetElement.h"
 
 #include <utility>
 

@@ -1,9 +1,9 @@
-#include "ui/uiMoveContainer.h"
+#include "uiMoveContainer.h"
 
-#include "native/ntPlatform.h"
-#include "ui/uiEscapeButton.h"
-#include "ui/uiLayout.h"
-#include "ui/uiWindow.h"
+#include "ntPlatform.h"
+#include "uiEscapeButton.h"
+#include "uiLayout.h"
+#include "uiWindow.h"
 
 #include <algorithm>
 #include <tuple>

@@ -1,9 +1,9 @@
 #pragma once
 
-#include "native/ntPeers.h"
-#include "ui/evPointerEvent.h"
-#include "ui/uiContainer.h"
-#include "ui/uiEventCallback.h"
+#include "evPointerEvent.h"
+#include "ntPeers.h"
+#include "uiContainer.h"
+#include "uiEventCallback.h"
 
 #include <optional>
 

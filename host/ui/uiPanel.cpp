@@ -1,7 +1,7 @@
-#include "ui/uiPanel.h"
+#include "uiPanel.h"
 
-#include "native/ntPlatform.h"
-#include "ui/uiMoveContainer.h"
+#include "ntPlatform.h"
+#include "uiMoveContainer.h"
 
 namespace Kv
 {

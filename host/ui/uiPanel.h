@@ -1,7 +1,7 @@
 #pragma once
 
-#include "native/ntPeers.h"
-#include "ui/uiContainer.h"
+#include "ntPeers.h"
+#include "uiContainer.h"
 
 namespace Kv
 {

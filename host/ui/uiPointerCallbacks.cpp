@@ -1,6 +1,6 @@
-#include "ui/uiPointerCallbacks.h"
+#include "uiPointerCallbacks.h"
 
-#include "ui/uiWidget.h"
+#include "uiWidget.h"
 
 namespace Kv
 {

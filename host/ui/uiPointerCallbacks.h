@@ -1,7 +1,7 @@
 #pragma once
 
-#include "native/ntPeers.h"
-#include "ui/evPointerEvent.h"
+#include "evPointerEvent.h"
+#include "ntPeers.h"
 
 namespace Kv
 {

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "native/ntPeers.h"
-#include "ui/uiString.h"
-#include "ui/uiWidget.h"
+#include "ntPeers.h"
+#include "uiString.h"
+#include "uiWidget.h"
 
 namespace Kv
 {

@@ -1,7 +1,7 @@
-#include "ui/uiResTable.h"
+#include "uiResTable.h"
 
-#include "resmgt/xmlDocument.h"
-#include "resmgt/xmlError.h"
+#include "xml/xmlDocument.h"
+#include "xml/xmlError.h"
 
 #include <dlfcn.h>
 #include <filesystem>

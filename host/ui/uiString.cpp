@@ -1,6 +1,6 @@
-#include "ui/uiString.h"
+#include "uiString.h"
 
-#include "resmgt/liStringUtil.h"
+#include "text/liStringUtil.h"
 
 #include <utility>
 

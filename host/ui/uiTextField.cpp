@@ -1,9 +1,9 @@
-#include "ui/uiTextField.h"
+#include "uiTextField.h"
 
-#include "native/ntPlatform.h"
-#include "resmgt/liStringUtil.h"
-#include "ui/uiContainer.h"
-#include "ui/uiWidgetElement.h"
+#include "ntPlatform.h"
+#include "text/liStringUtil.h"
+#include "uiContainer.h"
+#include "uiWidgetElement.h"
 
 #include <utility>
 

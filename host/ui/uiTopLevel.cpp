@@ -1,9 +1,9 @@
-#include "ui/uiTopLevel.h"
+#include "uiTopLevel.h"
 
-#include "gfx/wsNative.h"
-#include "resmgt/liStringUtil.h"
-#include "ui/uiEscapeButton.h"
-#include "ui/uiLayout.h"
+#include "text/liStringUtil.h"
+#include "uiEscapeButton.h"
+#include "uiLayout.h"
+#include "wsNative.h"
 
 namespace Kv
 {

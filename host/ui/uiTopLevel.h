@@ -1,8 +1,8 @@
 #pragma once
 
-#include "gfx/wsWindowStyle.h"
-#include "ui/uiContainer.h"
-#include "ui/uiWindow.h"
+#include "uiContainer.h"
+#include "uiWindow.h"
+#include "wsWindowStyle.h"
 
 #include <memory>
 #include <string>

@@ -1,12 +1,12 @@
-#include "ui/uiWidget.h"
+#include "uiWidget.h"
 
-#include "gfx/wsThread.h"
-#include "native/ntPlatform.h"
-#include "resmgt/liStringUtil.h"
-#include "ui/uiContainer.h"
-#include "ui/uiPointerCallbacks.h"
-#include "ui/uiResTable.h"
-#include "ui/uiWindow.h"
+#include "ntPlatform.h"
+#include "text/liStringUtil.h"
+#include "uiContainer.h"
+#include "uiPointerCallbacks.h"
+#include "uiResTable.h"
+#include "uiWindow.h"
+#include "wsThread.h"
 
 #include <utility>
 

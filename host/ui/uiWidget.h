@@ -1,15 +1,15 @@
 #pragma once
 
-#include "base/geRectangle.h"
-#include "base/geVector2.h"
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "base/rttiType.h"
-#include "gfx/coRgbColor.h"
-#include "resmgt/liString.h"
-#include "ui/piWidget.h"
-#include "ui/uiConstraint.h"
-#include "ui/uiFrame.h"
+#include "coRgbColor.h"
+#include "geRectangle.h"
+#include "geVector2.h"
+#include "kvExport.h"
+#include "piWidget.h"
+#include "pointers/rcShdPtr.h"
+#include "rttiType.h"
+#include "text/liString.h"
+#include "uiConstraint.h"
+#include "uiFrame.h"
 
 #include <memory>
 #include <optional>

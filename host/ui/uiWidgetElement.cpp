@@ -1,6 +1,6 @@
-#include "ui/uiWidgetElement.h"
+#include "uiWidgetElement.h"
 
-#include "resmgt/xmlError.h"
+#include "xml/xmlError.h"
 
 #include <algorithm>
 #include <charconv>

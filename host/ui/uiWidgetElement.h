@@ -1,9 +1,9 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "native/ntPeers.h"
-#include "resmgt/xmlElement.h"
-#include "ui/uiConstraint.h"
+#include "kvExport.h"
+#include "ntPeers.h"
+#include "uiConstraint.h"
+#include "xml/xmlElement.h"
 
 #include <optional>
 #include <string>

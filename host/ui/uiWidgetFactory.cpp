@@ -1,13 +1,13 @@
-#include "ui/uiWidgetFactory.h"
+#include "uiWidgetFactory.h"
 
-#include "resmgt/xmlError.h"
-#include "ui/uiDualState.h"
-#include "ui/uiLabel.h"
-#include "ui/uiLayout.h"
-#include "ui/uiMenu.h"
-#include "ui/uiPushButton.h"
-#include "ui/uiTextField.h"
-#include "ui/uiWidgetElement.h"
+#include "uiDualState.h"
+#include "uiLabel.h"
+#include "uiLayout.h"
+#include "uiMenu.h"
+#include "uiPushButton.h"
+#include "uiTextField.h"
+#include "uiWidgetElement.h"
+#include "xml/xmlError.h"
 
 #include <cctype>
 #include <map>

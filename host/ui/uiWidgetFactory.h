@@ -1,7 +1,7 @@
 #pragma once
 
-#include "resmgt/xmlElement.h"
-#include "ui/uiContainer.h"
+#include "uiContainer.h"
+#include "xml/xmlElement.h"
 
 #include <vector>
 

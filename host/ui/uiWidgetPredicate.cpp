@@ -1,4 +1,4 @@
-#include "ui/uiWidgetPredicate.h"
+#include "uiWidgetPredicate.h"
 
 namespace Kv
 {

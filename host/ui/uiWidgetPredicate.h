@@ -1,9 +1,9 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/prdPredicate.h"
-#include "base/rttiType.h"
-#include "ui/uiWidget.h"
+#include "kvExport.h"
+#include "prdPredicate.h"
+#include "rttiType.h"
+#include "uiWidget.h"
 
 #include <string>
 

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "gfx/wsWindow.h"
+#include "kvExport.h"
+#include "pointers/rcShdPtr.h"
+#include "wsWindow.h"
 
 namespace Kv
 {

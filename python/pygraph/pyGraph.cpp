@@ -1,11 +1,11 @@
 #include <boost/python.hpp>
 
-#include "pygraph/pyGraph.h"
+#include "pyGraph.h"
 
-#include "gfx/wsThread.h"
-#include "pygraph/pyGraphError.h"
-#include "pygraph/pyManagedGraph.h"
-#include "resmgt/liStringUtil.h"
+#include "pyGraphError.h"
+#include "pyManagedGraph.h"
+#include "text/liStringUtil.h"
+#include "wsThread.h"
 
 namespace bp = boost::python;
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "framework/fwComposition.h"
-#include "pygraph/pyGraphRo.h"
+#include "fwComposition.h"
+#include "pyGraphRo.h"
 
 #include <string>
 

@@ -1,4 +1,4 @@
-#include "pygraph/pyGraphError.h"
+#include "pyGraphError.h"
 
 namespace Kv::PyextInit
 {

@@ -1,10 +1,10 @@
 #include <boost/python.hpp>
 
-#include "pygraph/pyGraphRo.h"
+#include "pyGraphRo.h"
 
-#include "gfx/wsThread.h"
-#include "pygraph/pyGraphError.h"
-#include "resmgt/liStringUtil.h"
+#include "pyGraphError.h"
+#include "text/liStringUtil.h"
+#include "wsThread.h"
 
 #include <functional>
 

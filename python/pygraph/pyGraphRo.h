@@ -3,13 +3,13 @@
 #include <boost/python/dict.hpp>
 #include <boost/python/list.hpp>
 
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "base/rcWeakAccessor.h"
-#include "internalAPI/piCompositionGraphInterface.h"
-#include "pluginAPI/piGraph.h"
-#include "pluginAPI/piNode.h"
-#include "resmgt/osFilePath.h"
+#include "files/osFilePath.h"
+#include "kvExport.h"
+#include "piCompositionGraphInterface.h"
+#include "piGraph.h"
+#include "piNode.h"
+#include "pointers/rcShdPtr.h"
+#include "pointers/rcWeakAccessor.h"
 
 #include <string>
 

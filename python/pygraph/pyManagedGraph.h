@@ -1,7 +1,7 @@
 #pragma once
 
-#include "pygraph/pyGraph.h"
-#include "pyinit/pyManagedObject.h"
+#include "pyGraph.h"
+#include "pyManagedObject.h"
 
 #include <boost/python/pointee.hpp>
 

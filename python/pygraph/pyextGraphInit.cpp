@@ -1,9 +1,9 @@
 #include <boost/python.hpp>
 
-#include "pygraph/pyGraphError.h"
-#include "pygraph/pyManagedGraph.h"
-#include "pygraph/pyextGraphDocs.h"
-#include "pyinit/pySharedClass.h"
+#include "pyGraphError.h"
+#include "pyManagedGraph.h"
+#include "pySharedClass.h"
+#include "pyextGraphDocs.h"
 
 namespace bp = boost::python;
 

@@ -1,6 +1,6 @@
 #include <boost/python.hpp>
 
-#include "pyinit/pyInitError.h"
+#include "pyInitError.h"
 
 #include <map>
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/exBase.h"
-#include "base/kvExport.h"
+#include "exBase.h"
+#include "kvExport.h"
 
 #include <string>
 

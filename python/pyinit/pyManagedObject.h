@@ -1,7 +1,7 @@
 #pragma once
 
-#include "pyinit/pyManagedObjectBase.h"
-#include "scriptingAPI/piPythonUtils.h"
+#include "piPythonUtils.h"
+#include "pyManagedObjectBase.h"
 
 #include <utility>
 

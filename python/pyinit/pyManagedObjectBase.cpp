@@ -1,4 +1,4 @@
-#include "pyinit/pyManagedObjectBase.h"
+#include "pyManagedObjectBase.h"
 
 namespace Kv
 {

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "base/rcBase.h"
-#include "base/uuid.h"
+#include "kvExport.h"
+#include "pointers/rcBase.h"
+#include "uuid.h"
 
 namespace Kv
 {

@@ -2,8 +2,8 @@
 
 #include <Python.h>
 
-#include "base/assertions.h"
-#include "pyinit/pyInitError.h"
+#include "assertions.h"
+#include "pyInitError.h"
 
 #include <string>
 

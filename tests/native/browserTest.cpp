@@ -1,11 +1,11 @@
-#include "appUi/brBrowsable.h"
-#include "appUi/brBrowser.h"
-#include "appUi/uiView.h"
-#include "base/exBase.h"
-#include "resmgt/osDirOrder.h"
-#include "resmgt/osPlace.h"
-#include "ui/uiEventCallback.h"
-#include "ui/uiTopLevel.h"
+#include "brBrowsable.h"
+#include "brBrowser.h"
+#include "exBase.h"
+#include "files/osDirOrder.h"
+#include "files/osPlace.h"
+#include "uiEventCallback.h"
+#include "uiTopLevel.h"
+#include "uiView.h"
 
 #include <QApplication>
 #include <QLabel>

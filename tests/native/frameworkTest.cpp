@@ -1,7 +1,7 @@
-#include "appUi/uiCompositionWorkspace.h"
-#include "base/rcWeakAccessor.h"
-#include "framework/fwComposition.h"
-#include "pluginAPI/piNode.h"
+#include "fwComposition.h"
+#include "piNode.h"
+#include "pointers/rcWeakAccessor.h"
+#include "uiCompositionWorkspace.h"
 
 #include <csignal>
 #include <filesystem>

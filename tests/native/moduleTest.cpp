@@ -1,13 +1,13 @@
 #include <boost/python.hpp>
 
-#include "base/inBuildInfoUtil.h"
-#include "base/inInit.h"
-#include "gfx/wsCursorRegistry.h"
-#include "pyui/src/pyManagedDialog.h"
-#include "pyui/src/pyUiError.h"
-#include "resmgt/osFilePath.h"
-#include "ui/uiCursorGuard.h"
-#include "ui/uiTopLevel.h"
+#include "files/osFilePath.h"
+#include "packages/inBuildInfoUtil.h"
+#include "packages/inInit.h"
+#include "pyManagedDialog.h"
+#include "pyUiError.h"
+#include "uiCursorGuard.h"
+#include "uiTopLevel.h"
+#include "wsCursorRegistry.h"
 
 #include <algorithm>
 #include <gtest/gtest.h>

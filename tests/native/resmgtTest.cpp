@@ -1,10 +1,10 @@
-#include "resmgt/liString.h"
-#include "resmgt/liStringSubstituter.h"
-#include "resmgt/liStringUtil.h"
-#include "resmgt/osFile.h"
-#include "resmgt/xmlDocument.h"
-#include "resmgt/xmlError.h"
-#include "resmgt/xmlWriter.h"
+#include "files/osFile.h"
+#include "text/liString.h"
+#include "text/liStringSubstituter.h"
+#include "text/liStringUtil.h"
+#include "xml/xmlDocument.h"
+#include "xml/xmlError.h"
+#include "xml/xmlWriter.h"
 
 #include <cstdio>
 #include <fstream>

@@ -1,13 +1,13 @@
-#include "gfx/wsWindowStyle.h"
-#include "ui/uiDualState.h"
-#include "ui/uiEventCallback.h"
-#include "ui/uiLabel.h"
-#include "ui/uiMainWindow.h"
-#include "ui/uiMenu.h"
-#include "ui/uiMoveContainer.h"
-#include "ui/uiPushButton.h"
-#include "ui/uiTextField.h"
-#include "ui/uiTopLevel.h"
+#include "uiDualState.h"
+#include "uiEventCallback.h"
+#include "uiLabel.h"
+#include "uiMainWindow.h"
+#include "uiMenu.h"
+#include "uiMoveContainer.h"
+#include "uiPushButton.h"
+#include "uiTextField.h"
+#include "uiTopLevel.h"
+#include "wsWindowStyle.h"
 
 #include <QAccessible>
 #include <QApplication>

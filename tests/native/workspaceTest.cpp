@@ -1,10 +1,10 @@
 #include <boost/python.hpp>
 
-#include "appUi/brBrowsable.h"
-#include "appUi/uiCompositionWorkspace.h"
-#include "appUi/uiView.h"
-#include "pygraph/pyManagedGraph.h"
-#include "ui/uiLabel.h"
+#include "brBrowsable.h"
+#include "pyManagedGraph.h"
+#include "uiCompositionWorkspace.h"
+#include "uiLabel.h"
+#include "uiView.h"
 
 #include <filesystem>
 #include <fstream>

@@ -4,9 +4,9 @@
 #include <boost/python/list.hpp>
 #include <boost/python/object.hpp>
 
-#include "base/rcShdPtr.h"
+#include "files/osFilePath.h"
+#include "pointers/rcShdPtr.h"
 #include "pyManagedDialog.h"
-#include "resmgt/osFilePath.h"
 
 #include <string>
 

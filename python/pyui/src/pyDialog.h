@@ -3,16 +3,16 @@
 #include <boost/python/dict.hpp>
 #include <boost/python/object.hpp>
 
-#include "appUi/uiAppMgr.h"
-#include "base/iterator.h"
-#include "base/kvExport.h"
-#include "base/rcShdPtr.h"
-#include "base/rcStrongPtr.h"
+#include "iterators/iterator.h"
+#include "kvExport.h"
+#include "pointers/rcShdPtr.h"
+#include "pointers/rcStrongPtr.h"
 #include "pyCallables.h"
 #include "pyWidgetCbs.h"
-#include "ui/uiContainer.h"
-#include "ui/uiEventCallback.h"
-#include "ui/uiTopLevel.h"
+#include "uiAppMgr.h"
+#include "uiContainer.h"
+#include "uiEventCallback.h"
+#include "uiTopLevel.h"
 
 #include <string>
 #include <vector>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "pyDialog.h"
-#include "pyinit/pyManagedObject.h"
+#include "pyManagedObject.h"
 
 #include <boost/python/pointee.hpp>
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "base/kvExport.h"
-#include "pyinit/pyModError.h"
+#include "kvExport.h"
+#include "pyModError.h"
 
 namespace Kv::PyextUi
 {

@@ -1,7 +1,7 @@
 #include "pyUtils.h"
 
+#include "files/osFile.h"
 #include "pyUiError.h"
-#include "resmgt/osFile.h"
 
 #include <cstdio>
 #include <memory>

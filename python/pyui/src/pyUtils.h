@@ -1,6 +1,6 @@
 #pragma once
 
-#include "resmgt/osFilePath.h"
+#include "files/osFilePath.h"
 
 #include <string>
 

@@ -2,11 +2,11 @@
 
 #include <Python.h>
 
-#include "base/cbHandler.h"
-#include "base/rcBase.h"
-#include "base/rcShdPtr.h"
-#include "base/rcStrongPtr.h"
-#include "ui/piWidget.h"
+#include "cbHandler.h"
+#include "piWidget.h"
+#include "pointers/rcBase.h"
+#include "pointers/rcShdPtr.h"
+#include "pointers/rcStrongPtr.h"
 
 #include <string>
 #include <vector>

@@ -2,15 +2,15 @@
 
 #include "pyWidgetListGenerator.h"
 
-#include "base/cbHandler.h"
-#include "gfx/wsFontRegistry.h"
+#include "cbHandler.h"
 #include "pyDialog.h"
 #include "pyErrorNote.h"
 #include "pyUiError.h"
-#include "resmgt/liStringSubstituter.h"
-#include "resmgt/liStringUtil.h"
-#include "resmgt/xmlWriter.h"
-#include "ui/uiConstraint.h"
+#include "text/liStringSubstituter.h"
+#include "text/liStringUtil.h"
+#include "uiConstraint.h"
+#include "wsFontRegistry.h"
+#include "xml/xmlWriter.h"
 
 #include <algorithm>
 #include <array>

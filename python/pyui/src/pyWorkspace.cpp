@@ -2,18 +2,18 @@
 
 #include "pyWorkspace.h"
 
-#include "appUi/brBrowsable.h"
-#include "appUi/uiCompositionWorkspaceClientInterface.h"
-#include "appUi/uiView.h"
-#include "appUi/uiWorkspace.h"
-#include "base/assertions.h"
-#include "base/rcWeakAccessor.h"
-#include "base/uPtr.h"
-#include "internalAPI/piCompositionGraphInterface.h"
-#include "internalAPI/snSelection.h"
-#include "pluginAPI/piNode.h"
+#include "assertions.h"
+#include "brBrowsable.h"
+#include "piCompositionGraphInterface.h"
+#include "piNode.h"
+#include "pointers/rcWeakAccessor.h"
+#include "pointers/uPtr.h"
 #include "pyCompat.h"
 #include "pyUiError.h"
+#include "snSelection.h"
+#include "uiCompositionWorkspaceClientInterface.h"
+#include "uiView.h"
+#include "uiWorkspace.h"
 
 #include <cstring>
 

@@ -2,9 +2,9 @@
 
 #include <boost/python/list.hpp>
 
-#include "base/rcShdPtr.h"
-#include "pygraph/pyManagedGraph.h"
-#include "resmgt/osFilePath.h"
+#include "files/osFilePath.h"
+#include "pointers/rcShdPtr.h"
+#include "pyManagedGraph.h"
 
 namespace Kv
 {

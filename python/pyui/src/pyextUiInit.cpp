@@ -1,18 +1,18 @@
 #include <boost/python.hpp>
 
-#include "appUi/uiAppMgr.h"
-#include "base/inBuildInfoUtil.h"
-#include "base/inInit.h"
-#include "internalAPI/piBrowserSchemes.h"
+#include "packages/inBuildInfoUtil.h"
+#include "packages/inInit.h"
+#include "piBrowserSchemes.h"
 #include "pyArgumentNote.h"
 #include "pyCompat.h"
 #include "pyConvenienceFunctions.h"
 #include "pyManagedDialog.h"
+#include "pySharedClass.h"
 #include "pyUiError.h"
 #include "pyWorkspace.h"
 #include "pyextUiDocs.h"
-#include "pyinit/pySharedClass.h"
-#include "ui/uiCursorGuard.h"
+#include "uiAppMgr.h"
+#include "uiCursorGuard.h"
 
 #include <memory>
 #include <string>

@@ -1,0 +1,408 @@
+#include "browser/qtBrowserPane.h"
+
+#include "browser/qtBrowserList.h"
+#include "browser/qtDirModel.h"
+#include "browser/qtPathField.h"
+#include "exBase.h"
+#include "files/osPlace.h"
+#include "peers/qtText.h"
+#include "windows/qtFocusOrder.h"
+
+#include <QApplication>
+#include <QHBoxLayout>
+#include <QKeyEvent>
+#include <QScrollBar>
+#include <QStyle>
+#include <QVBoxLayout>
+
+#include <algorithm>
+#include <chrono>
+#include <filesystem>
+#include <initializer_list>
+#include <utility>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// How often the directory is looked at.
+constexpr std::chrono::seconds lookInterval(1);
+
+/// How long a reading may take before the list says so.
+constexpr std::chrono::milliseconds patience(250);
+
+/// Why a directory cannot be shown any more, in words; empty if it can.
+std::string findFault(std::string const& directory)
+{
+    try
+    {
+        if (OsPlace::find(directory, "").name.empty())
+            return "";
+        return OsPlace::quote(directory) + " is no folder any more";
+    }
+    catch (ExBase const& error)
+    {
+        return error.getReason();
+    }
+}
+
+/// The path of an entry that is not there yet, in a directory that is; empty for any other.
+std::string findNewPath(std::string const& typed, std::string const& base)
+{
+    try
+    {
+        OsPlace const place = OsPlace::findNew(typed, base);
+        return OsPlace::join(place.directory, place.name);
+    }
+    catch (ExBase const&)
+    {
+        return "";
+    }
+}
+
+/// Lets a path be wrapped at its slashes.
+QString makeWrappable(QString text)
+{
+    return text.replace(QLatin1Char('/'), QStringLiteral("/\u200b"));
+}
+
+} // namespace
+
+QtBrowserPane::QtBrowserPane(QWidget* parent, std::string const& name,
+                             QtListenerHandle<NtBrowserListener> const& handle)
+    : QWidget(parent), _handle(handle), _up(new QToolButton(this)),
+      _path(new QtPathField(this, [this] { takeTypedPath(false); })),
+      _model(new QtDirModel(this, [this] { onRead(); })),
+      _list(new QtBrowserList(this, {[this] { activate(); }, [this] { goUp(); }})), _message(new QLabel(this))
+{
+    _up->setIcon(style()->standardIcon(QStyle::SP_FileDialogToParent));
+    _up->setAutoRaise(true);
+    _up->setFocusPolicy(Qt::TabFocus);
+    _up->setToolTip(QStringLiteral("Up (Alt+Up)"));
+    _list->setModel(_model);
+    _list->setSortingEnabled(true);
+    _message->setTextFormat(Qt::PlainText);
+    _message->setWordWrap(true);
+    _message->hide();
+    // Whoever gives the keyboard to the browser gives it to the list.
+    setFocusProxy(_list);
+    makeNames(toQString(name));
+    layOut();
+    connect(_up, &QToolButton::clicked, this, [this] { goUp(); });
+    connect(_list->selectionModel(), &QItemSelectionModel::selectionChanged, this, [this] { onChosen(); });
+    connect(_list->selectionModel(), &QItemSelectionModel::currentChanged, this, [this] { onChosen(); });
+    connect(_model, &QAbstractItemModel::modelAboutToBeReset, this, [this] { keepView(); });
+    connect(&_looking, &QTimer::timeout, this, [this] { look(); });
+    _patience.setSingleShot(true);
+    connect(&_patience, &QTimer::timeout, this, [this] { showState(); });
+}
+
+void QtBrowserPane::makeNames(QString const& name)
+{
+    for (auto const& [widget, part] : std::initializer_list<std::pair<QWidget*, char const*>>{
+             {_up, ".up"}, {_path, ".path"}, {_list, ".list"}, {_message, ".message"}})
+        widget->setObjectName(name + QLatin1String(part));
+    _up->setAccessibleName(QStringLiteral("Up"));
+    _path->setAccessibleName(QStringLiteral("Folder"));
+    _list->setAccessibleName(QStringLiteral("Files"));
+}
+
+void QtBrowserPane::layOut()
+{
+    constexpr int gap = 4;
+    auto* const column = new QVBoxLayout(this);
+    column->setContentsMargins(gap, gap, gap, gap);
+    column->setSpacing(gap);
+    auto* const row = new QHBoxLayout;
+    row->setSpacing(gap);
+    row->addWidget(_up);
+    row->addWidget(_path);
+    column->addLayout(row);
+    column->addWidget(_list);
+    column->addWidget(_message);
+    // As narrow as the cell says.
+    _message->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
+}
+
+void QtBrowserPane::goTo(std::string const& directory, Choice const& choice)
+{
+    _directory = directory;
+    _notice.clear();
+    _wanted = choice;
+    _wantedView = {};
+    _told = choice;
+    _arriving = true;
+    _path->setDirectory(directory);
+    _up->setEnabled(directory != "/");
+    _patience.start(patience);
+    _model->open(directory, choice.focus);
+    showState();
+}
+
+void QtBrowserPane::setCollapsing(std::function<bool(std::string const&)> collapses)
+{
+    _model->setCollapsing(std::move(collapses));
+    if (!_directory.empty())
+        _model->reread();
+}
+
+void QtBrowserPane::setMultiple(bool multiple)
+{
+    _list->setSelectionMode(multiple ? QAbstractItemView::ExtendedSelection : QAbstractItemView::SingleSelection);
+}
+
+std::optional<std::string> QtBrowserPane::takeTypedPath(bool takesNew)
+{
+    if (!_path->isEdited() || !isVisible())
+        return "";
+    std::string const typed = _path->getTypedPath();
+    try
+    {
+        OsPlace const place = OsPlace::find(typed.empty() ? _directory : typed, _directory);
+        if (_path->hasFocus())
+            _list->setFocus(Qt::OtherFocusReason);
+        walkTo(place.directory, {place.name, {}});
+        return "";
+    }
+    catch (ExBase const& error)
+    {
+        if (takesNew)
+            if (std::string path = findNewPath(typed, _directory); !path.empty())
+                return path;
+        say(error.getReason());
+        return std::nullopt;
+    }
+}
+
+void QtBrowserPane::showEvent(QShowEvent* event)
+{
+    QWidget::showEvent(event);
+    _looking.start(lookInterval);
+    tellChoice();
+}
+
+void QtBrowserPane::hideEvent(QHideEvent* event)
+{
+    QWidget::hideEvent(event);
+    _looking.stop();
+}
+
+void QtBrowserPane::keyPressEvent(QKeyEvent* event)
+{
+    if (event->key() == Qt::Key_Up && event->modifiers() & Qt::AltModifier)
+        goUp();
+    else if (event->key() == Qt::Key_F5)
+        _model->reread();
+    else if (event->key() == Qt::Key_H && event->modifiers() & Qt::ControlModifier)
+        toggleHidden();
+    else if (event->key() == Qt::Key_L && event->modifiers() & Qt::ControlModifier)
+        QtFocusOrder::give(*_path, Qt::ShortcutFocusReason);
+    else
+        QWidget::keyPressEvent(event);
+}
+
+void QtBrowserPane::activate()
+{
+    QModelIndex const current = _list->currentIndex();
+    if (!current.isValid() || !isVisible())
+        return;
+    try
+    {
+        OsPlace const place = OsPlace::find(OsPlace::join(_directory, _model->getEntry(current.row()).name), "");
+        if (place.name.empty())
+        {
+            walkTo(place.directory, {});
+            return;
+        }
+    }
+    catch (ExBase const& error)
+    {
+        say(error.getReason());
+        _model->reread();
+        return;
+    }
+    _list->selectionModel()->select(current, QItemSelectionModel::Select | QItemSelectionModel::Rows);
+    forgetTyped();
+    _handle.tell(&NtBrowserListener::onActivated);
+}
+
+void QtBrowserPane::goUp()
+{
+    std::filesystem::path const path = _directory;
+    if (!path.has_relative_path() || !isVisible())
+        return;
+    walkTo(OsPlace::findNearest(path.parent_path().native()), {});
+    _wantedView.current = path.filename().native();
+}
+
+void QtBrowserPane::walkTo(std::string const& directory, Choice const& choice)
+{
+    goTo(directory, choice);
+    _handle.tell(&NtBrowserListener::onDirectoryChanged, directory);
+    if (!choice.focus.empty())
+        _handle.tell(&NtBrowserListener::onSelectionChanged, choice.focus, std::vector<std::string>{choice.focus});
+}
+
+void QtBrowserPane::toggleHidden()
+{
+    _model->setShowsHidden(!_model->showsHidden());
+    _model->reread();
+}
+
+void QtBrowserPane::look()
+{
+    // Rows that change between two clicks would be missed by the second.
+    if (QApplication::mouseButtons() != Qt::NoButton)
+        return;
+    std::string const fault = findFault(_directory);
+    if (!fault.empty())
+    {
+        leave(fault);
+        return;
+    }
+    try
+    {
+        _model->rereadIfChanged();
+    }
+    catch (ExBase const&)
+    {
+        // It went this very moment; the next look finds it gone.
+    }
+}
+
+void QtBrowserPane::leave(std::string const& reason)
+{
+    std::string const nearest = OsPlace::findNearest(_directory);
+    walkTo(nearest, {});
+    say(reason + ". This is " + OsPlace::quote(nearest));
+}
+
+void QtBrowserPane::keepView()
+{
+    _replaced = true;
+    if (_arriving)
+        return;
+    _wanted = getChoice();
+    QModelIndex const current = _list->currentIndex();
+    QModelIndex const top = _list->indexAt(QPoint(0, 0));
+    _wantedView.current = current.isValid() ? _model->getEntry(current.row()).name : "";
+    _wantedView.top = top.isValid() ? _model->getEntry(top.row()).name : "";
+    _wantedView.offset = _list->visualRect(top).y();
+    _wantedView.scroll = _list->verticalScrollBar()->value();
+}
+
+void QtBrowserPane::onRead()
+{
+    _patience.stop();
+    bool const isNew = std::exchange(_arriving, false);
+    if (std::exchange(_replaced, false) || isNew)
+        choose();
+    // A file of a sequence stays in focus as it was asked for, though the sequence goes by its first.
+    if (isNew && _wanted.selected.size() <= 1 && !_model->findRows({_wanted.focus}).empty())
+        _told = getChoice();
+    tellChoice();
+    showState();
+}
+
+void QtBrowserPane::choose()
+{
+    std::vector<std::string> names = _wanted.selected;
+    names.push_back(_wanted.focus);
+    int const columns = _model->columnCount() - 1;
+    QItemSelection selection;
+    for (int const row : _model->findRows(names))
+        selection.select(_model->index(row, 0), _model->index(row, columns));
+    _choosing = true;
+    _list->selectionModel()->select(selection, QItemSelectionModel::ClearAndSelect);
+    restoreView();
+    _choosing = false;
+}
+
+void QtBrowserPane::restoreView()
+{
+    auto const indexOf = [this](std::string const& name)
+    {
+        std::vector<int> const rows = _model->findRows({name});
+        return rows.empty() ? QModelIndex() : _model->index(rows.front(), 0);
+    };
+    QModelIndex const focus = indexOf(_wanted.focus.empty() ? _wantedView.current : _wanted.focus);
+    // The keyboard is always on some row: from none, the list would take every key for a step to the first.
+    _list->selectionModel()->setCurrentIndex(focus.isValid() ? focus : _model->index(0, 0),
+                                             QItemSelectionModel::NoUpdate);
+    _list->doItemsLayout();
+    QModelIndex const top = indexOf(_wantedView.top);
+    if (_wantedView.top.empty())
+        _list->scrollTo(focus);
+    else if (_wantedView.scroll > 0 && top.isValid())
+    {
+        _list->scrollTo(top, QAbstractItemView::PositionAtTop);
+        _list->verticalScrollBar()->setValue(_list->verticalScrollBar()->value() - _wantedView.offset);
+    }
+    else
+        _list->verticalScrollBar()->setValue(_wantedView.scroll);
+}
+
+QtBrowserPane::Choice QtBrowserPane::getChoice() const
+{
+    std::vector<int> rows;
+    for (QModelIndex const& index : _list->selectionModel()->selectedRows())
+        rows.push_back(index.row());
+    std::sort(rows.begin(), rows.end());
+    Choice choice;
+    for (int const row : rows)
+        choice.selected.push_back(_model->getEntry(row).name);
+    QModelIndex const current = _list->currentIndex();
+    if (current.isValid() && std::binary_search(rows.begin(), rows.end(), current.row()))
+        choice.focus = _model->getEntry(current.row()).name;
+    else if (!rows.empty())
+        choice.focus = choice.selected.front();
+    return choice;
+}
+
+void QtBrowserPane::onChosen()
+{
+    if (_choosing)
+        return;
+    forgetTyped();
+    tellChoice();
+}
+
+void QtBrowserPane::forgetTyped()
+{
+    _notice.clear();
+    if (_path->isEdited())
+        _path->setDirectory(_directory);
+    showState();
+}
+
+void QtBrowserPane::tellChoice()
+{
+    if (_choosing || _arriving || !isVisible())
+        return;
+    Choice const choice = getChoice();
+    if (choice == _told)
+        return;
+    _told = choice;
+    _handle.tell(&NtBrowserListener::onSelectionChanged, choice.focus, choice.selected);
+}
+
+void QtBrowserPane::say(std::string const& words)
+{
+    _notice = words;
+    showState();
+}
+
+void QtBrowserPane::showState()
+{
+    std::string const& error = _model->getError();
+    _message->setText(makeWrappable(toShownPath(error.empty() ? _notice : error)));
+    _message->setVisible(!_message->text().isEmpty());
+    bool const isLate = _model->isReading() && !_patience.isActive();
+    bool const isEmpty = !_model->isReading() && error.empty();
+    _list->setPlaceholder(isLate ? QStringLiteral("Reading\u2026")
+                                 : (isEmpty ? QStringLiteral("This folder is empty") : QString()));
+}
+
+} // namespace Kv

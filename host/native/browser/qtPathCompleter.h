@@ -1,0 +1,45 @@
+#pragma once
+
+#include "files/osDirScan.h"
+
+#include <QCompleter>
+#include <QStringList>
+#include <QStringListModel>
+#include <QTimer>
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace Kv
+{
+
+/// Proposes the entries of a directory that begin as the last part of a path that is being typed. Reads the directory
+/// in slices, and proposes when it is done.
+class QtPathCompleter final : public QCompleter
+{
+public:
+    /// `onReady` is called when proposals that had to be waited for are there.
+    QtPathCompleter(QObject* parent, std::function<void()> onReady);
+
+    /// The proposals from now on. `directory` is null, or what the part of `text` up to its last slash leads to.
+    void propose(QString const& text, std::string const* directory);
+
+    QString pathFromIndex(QModelIndex const& index) const override;
+
+private:
+    void work();
+    void filter();
+
+    std::function<void()> _onReady;
+    std::string _directory;
+    std::unique_ptr<OsDirScan> _scan;
+    QTimer _timer;
+    /// Of the directory, sorted; a directory has a slash behind its name.
+    QStringList _names;
+    QString _typedDirectory;
+    QString _typedName;
+    QStringListModel _model;
+};
+
+} // namespace Kv

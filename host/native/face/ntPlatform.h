@@ -1,0 +1,141 @@
+#pragma once
+
+#include "exBase.h"
+#include "geRectangle.h"
+#include "geVector2.h"
+#include "ntPeers.h"
+
+#include <exception>
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace Kv
+{
+
+/// Shape of the pointer where a widget does not ask for one of its own.
+enum class NtCursor
+{
+    Normal,
+    Busy,
+};
+
+/// How the interpreter of the scripts takes part in the native loop. Installed by the library that knows it; without
+/// one the loop runs native handlers alone.
+class NtScriptHook
+{
+public:
+    virtual ~NtScriptHook() = default;
+
+    /// Takes the interpreter for this thread, and gives it back: a native event can arrive while nobody holds it.
+    virtual void enter() = 0;
+    virtual void leave() noexcept = 0;
+
+    /// To be called while an exception is handled: that exception, for `rethrow`, with the interpreter's own error
+    /// taken off the interpreter, so that scripts can run in between.
+    virtual std::exception_ptr capture() noexcept = 0;
+
+    /// Throws a captured exception on, with the interpreter's error back in place.
+    [[noreturn]] virtual void rethrow(std::exception_ptr const& error) = 0;
+
+    /// Takes the error that is set off the interpreter, for `putErrorBack`. Null where there is none, or no interpreter
+    /// in this thread.
+    virtual std::exception_ptr takeError() noexcept = 0;
+    virtual void putErrorBack(std::exception_ptr const& error) noexcept = 0;
+
+    /// `later` came while `first` was still on its way out: keeps it visible to the script's author.
+    virtual void addContext(std::exception_ptr const& first, std::exception_ptr const& later) noexcept = 0;
+
+    /// Prints a captured exception that nobody will see otherwise.
+    virtual void report(std::exception_ptr const& error) noexcept = 0;
+
+    /// Runs what is pending for the interpreter, Ctrl-C for one, and throws what comes of it.
+    virtual void checkSignals() = 0;
+
+    /// Makes Ctrl-C pending for the interpreter.
+    virtual void interrupt() noexcept = 0;
+};
+
+/// The one face of the window system. All of it is for the thread of the user interface, but that peers and windows may
+/// be let go from any thread.
+class NtPlatform
+{
+public:
+    NtPlatform() = default;
+    NtPlatform(NtPlatform const&) = delete;
+    NtPlatform& operator=(NtPlatform const&) = delete;
+    virtual ~NtPlatform() = default;
+
+    /// Borrowed; null takes the hook away.
+    virtual void setScriptHook(NtScriptHook* hook) = 0;
+
+    /// Width in pixels of a text as a widget draws it in the default font, rounded up to whole pixels.
+    virtual float measureText(std::string const& text) = 0;
+
+    /// Size of the screen in pixels.
+    virtual GeVector2<int> getScreenSize() = 0;
+
+    virtual void setCursor(NtCursor cursor) = 0;
+
+    /// Makes a window, not yet shown, and its content peer of the name `contentName`. `frame` is where its content goes
+    /// on the screen, in pixels, y growing upward; it is moved and made smaller as far as the screen asks for it, and
+    /// larger by the scroll bar that this asks for.
+    /// `owner`, which can be null, is the window that it stays above. Throws an `ExBase` that says why and what to set
+    /// where windows cannot be shown.
+    virtual std::unique_ptr<NtWindow> createWindow(std::string const& name, std::string const& title,
+                                                   std::string const& contentName, GeRectangle<int> const& frame,
+                                                   NtWindow* owner, NtWindowListener& listener) = 0;
+
+    /// Takes the application's window as one of the host's: the whole of it is the content. `enableOwn` enables and
+    /// disables what is the application's own in it. Of the listener only `onResized` is called. Throws as
+    /// `createWindow` does.
+    virtual std::unique_ptr<NtMainWindow> adoptWindow(NtForeignWidget window, std::function<void(bool)> enableOwn,
+                                                      NtWindowListener& listener) = 0;
+
+    /// Takes a widget of the application's window as a container, which stays where the application has it.
+    virtual std::unique_ptr<NtContainer> adoptContainer(NtForeignWidget widget, NtPlaceListener& listener) = 0;
+
+    /// Peers are made displayed and enabled, without a cell. Listeners are borrowed and outlive the peer.
+    virtual std::unique_ptr<NtContainer> createContainer(NtContainer& parent, std::string const& name) = 0;
+    virtual std::unique_ptr<NtFloat> createFloat(NtContainer& parent, std::string const& name,
+                                                 NtFloatListener& listener) = 0;
+    virtual std::unique_ptr<NtLabel> createLabel(NtContainer& parent, std::string const& name) = 0;
+    virtual std::unique_ptr<NtTextField> createTextField(NtContainer& parent, std::string const& name,
+                                                         NtTextFieldListener& listener) = 0;
+    virtual std::unique_ptr<NtToggle> createToggle(NtContainer& parent, std::string const& name,
+                                                   NtToggleListener& listener) = 0;
+    virtual std::unique_ptr<NtMenu> createMenu(NtContainer& parent, std::string const& name,
+                                               NtMenuListener& listener) = 0;
+    virtual std::unique_ptr<NtPushButton> createPushButton(NtContainer& parent, std::string const& name,
+                                                           NtPushButtonListener& listener) = 0;
+    virtual std::unique_ptr<NtBrowser> createBrowser(NtContainer& parent, std::string const& name,
+                                                     NtBrowserListener& listener) = 0;
+
+    /// Dispatches events until `*until` is true, however it came to be. What a handler throws ends the loop and is
+    /// thrown on from here. When the application is asked to quit, `*end` is set to true. Loops nest.
+    virtual void runLoop(bool const volatile* until, bool volatile* end) = 0;
+
+    /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.
+    virtual void endLoop() = 0;
+
+    /// Runs what is pending for the interpreter now, before other people's functions are called; what comes of it is
+    /// thrown out of the innermost loop. Without a loop, nothing happens.
+    virtual void interruptLoop() = 0;
+
+    /// The application closes: ends all loops, each by setting its `*end`. One that begins later throws an `ExBase`; a
+    /// script that goes on trying is interrupted.
+    virtual void closeLoops() = 0;
+
+    /// Destroys the windows that are left, while scripts can still hear of it. They cannot be shown again.
+    virtual void destroyWindows() = 0;
+
+    /// True if the address is that of a living object of Qt that the application made, not a script. Then `onGone` is
+    /// called when it goes.
+    virtual bool observe(void const* object, std::function<void()> onGone) = 0;
+};
+
+/// Name of the function that libKVnative exports; gives the process's one platform, which lives as long as the process.
+constexpr char const* ntPlatformEntry = "kvNativePlatform";
+using NtPlatformEntry = NtPlatform& (*)();
+
+} // namespace Kv

@@ -1,0 +1,52 @@
+#pragma once
+
+#include "loop/qtGuard.h"
+
+#include <QEventLoop>
+#include <QTimer>
+
+#include <exception>
+
+namespace Kv
+{
+
+/// One run of the local message loop, on the stack of the one who runs it. The guard knows the innermost; loops begin
+/// and end like brackets.
+class QtLoop
+{
+public:
+    /// Both flags are borrowed; `end` can be null.
+    QtLoop(bool const volatile* until, bool volatile* end);
+    QtLoop(QtLoop const&) = delete;
+    QtLoop& operator=(QtLoop const&) = delete;
+    ~QtLoop();
+
+    /// Dispatches events until the flag is true or an error came; gives that error, or null.
+    std::exception_ptr run();
+
+    /// The loop that this one runs in; null for the outermost.
+    QtLoop* getOuter() const { return _outer; }
+
+    /// Sets the end flag, which ends the loop.
+    void end();
+
+    /// Ends the loop if its flag says so.
+    void endIfDone();
+
+    /// Ends the loop with an error.
+    void fail(std::exception_ptr const& error) noexcept;
+
+private:
+    void onTick();
+    void onTurn();
+
+    bool const volatile* _until;
+    bool volatile* _end;
+    QtLoop* _outer;
+    std::exception_ptr _error;
+    bool _turned = false;
+    QEventLoop _loop;
+    QTimer _tick;
+};
+
+} // namespace Kv

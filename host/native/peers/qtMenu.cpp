@@ -1,0 +1,164 @@
+#include "peers/qtMenu.h"
+
+#include "peers/qtLabel.h"
+#include "peers/qtLongText.h"
+#include "peers/qtText.h"
+#include "windows/qtFocusOrder.h"
+
+#include <QAbstractItemView>
+#include <QScreen>
+#include <QScrollBar>
+#include <QStylePainter>
+#include <QWheelEvent>
+
+#include <algorithm>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// How many entries a popup shows at once before it scrolls.
+constexpr int maxShown = 20;
+
+class ComboBox final : public QComboBox
+{
+public:
+    ComboBox(QWidget* parent, QtListenerHandle<NtMenuListener> const& handle) : QComboBox(parent), _handle(handle)
+    {
+        QtFocusOrder::markAsValue(*this);
+        // The wheel alone must not take the keyboard.
+        setFocusPolicy(Qt::StrongFocus);
+        setMaxVisibleItems(maxShown);
+        setSizeAdjustPolicy(AdjustToMinimumContentsLengthWithIcon);
+        connect(this, &QComboBox::activated, this, [this](int index) { tellPicked(index); });
+    }
+
+    void setAlign(NtAlign align)
+    {
+        _align = align;
+        update();
+    }
+
+    void showPopup() override
+    {
+        shortenPopup();
+        widenPopup();
+        QComboBox::showPopup();
+    }
+
+protected:
+    bool event(QEvent* event) override
+    {
+        if (event->type() == QEvent::ToolTip && fontMetrics().horizontalAdvance(currentText()) > getTextWidth())
+            return showWhole(*this, *event, currentText());
+        return QComboBox::event(event);
+    }
+
+    void paintEvent(QPaintEvent*) override
+    {
+        QStylePainter painter(this);
+        QStyleOptionComboBox option;
+        initStyleOption(&option);
+        painter.drawComplexControl(QStyle::CC_ComboBox, option);
+        option.currentText = fontMetrics().elidedText(option.currentText, Qt::ElideRight, getTextWidth());
+        option.textAlignment = toQtAlignment(_align);
+        painter.drawControl(QStyle::CE_ComboBoxLabel, option);
+    }
+
+    void wheelEvent(QWheelEvent* event) override
+    {
+        // Turned over it on the way through a long dialog, the wheel scrolls the dialog.
+        if (hasFocus())
+            QComboBox::wheelEvent(event);
+        else
+            event->ignore();
+    }
+
+private:
+    /// Gives many entries a list with a scroll bar: styles that open a box like a menu fill the screen with them.
+    void shortenPopup()
+    {
+        bool const isLong = count() > maxShown;
+        QString const sheet = isLong ? QStringLiteral("QComboBox { combobox-popup: 0; }") : QString();
+        if (styleSheet() == sheet)
+            return;
+        setStyleSheet(sheet);
+        view()->setVerticalScrollBarPolicy(isLong ? Qt::ScrollBarAsNeeded : Qt::ScrollBarAlwaysOff);
+    }
+
+    /// Makes room in the popup for the longest entry, as far as the screen goes.
+    void widenPopup()
+    {
+        QAbstractItemView* const list = view();
+        QMargins const margins = list->contentsMargins();
+        int const needed = list->sizeHintForColumn(0) + list->verticalScrollBar()->sizeHint().width() + margins.left() +
+                           margins.right();
+        list->setMinimumWidth(std::min(needed, screen()->availableSize().width()));
+    }
+
+    int getTextWidth() const
+    {
+        QStyleOptionComboBox option;
+        initStyleOption(&option);
+        return style()->subControlRect(QStyle::CC_ComboBox, &option, QStyle::SC_ComboBoxEditField, this).width();
+    }
+
+    void tellPicked(int index) const
+    {
+        if (isVisible())
+            _handle.tell(&NtMenuListener::onPicked, index);
+    }
+
+    QtListenerHandle<NtMenuListener> _handle;
+    NtAlign _align = NtAlign::Left;
+};
+
+} // namespace
+
+QtMenu::QtMenu(QWidget* parent, std::string const& name, NtMenuListener& listener)
+    : QtMenu(parent, name, QtListenerHandle<NtMenuListener>(listener))
+{
+}
+
+QtMenu::QtMenu(QWidget* parent, std::string const& name, QtListenerHandle<NtMenuListener> const& handle)
+    : QtPeer(makeNative<ComboBox>(parent, handle), name, QtNative::rowInset), _handle(handle)
+{
+}
+
+QtMenu::~QtMenu()
+{
+    _handle.close();
+}
+
+void QtMenu::removeAll()
+{
+    if (QComboBox* const box = getNative())
+        box->clear();
+}
+
+void QtMenu::append(std::string const& entry)
+{
+    QComboBox* const box = getNative();
+    if (!box)
+        return;
+    // The first entry would select itself.
+    int const selected = box->currentIndex();
+    box->addItem(toQString(entry));
+    box->setCurrentIndex(selected);
+}
+
+void QtMenu::select(int index)
+{
+    if (QComboBox* const box = getNative())
+        box->setCurrentIndex(index);
+}
+
+void QtMenu::setAlign(NtAlign align)
+{
+    if (auto* const box = static_cast<ComboBox*>(getNative()))
+        box->setAlign(align);
+}
+
+} // namespace Kv

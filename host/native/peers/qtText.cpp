@@ -1,0 +1,28 @@
+#include "peers/qtText.h"
+
+#include <QStringDecoder>
+
+namespace Kv
+{
+
+QString toQString(std::string const& text)
+{
+    QStringDecoder decoder(QStringDecoder::Utf8, QStringDecoder::Flag::ConvertInitialBom);
+    return decoder(QByteArrayView(text));
+}
+
+QString toShownPath(std::string const& path)
+{
+    QString text = toQString(path);
+    for (QChar& c : text)
+        if (!c.isPrint() && !c.isSurrogate())
+            c = QChar::ReplacementCharacter;
+    return text;
+}
+
+std::string toPath(QString const& text)
+{
+    return text.toStdString();
+}
+
+} // namespace Kv

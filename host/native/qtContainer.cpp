@@ -1,8 +1,0 @@
-#include "native/qtContainer.h"
-
-namespace Kv
-{
-
-QtContainer::QtContainer(QWidget* parent, std::string const& name) : QtPeer(makeNative<QWidget>(parent), name, 0) {}
-
-} // namespace Kv

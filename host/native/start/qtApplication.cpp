@@ -1,0 +1,114 @@
+#include "start/qtApplication.h"
+
+#include "exBase.h"
+#include "start/qtDisplayProbe.h"
+#include "windows/qtWindowIcon.h"
+
+#include <QApplication>
+#include <QByteArray>
+#include <QThread>
+
+#include <array>
+#include <clocale>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// The toolkit sets every category of the C library's locale. Numbers stay as they were: interpreters and parsers of
+/// this process count on them.
+class NumberLocaleKeeper
+{
+public:
+    NumberLocaleKeeper() : _name(std::setlocale(LC_NUMERIC, nullptr)) {}
+    NumberLocaleKeeper(NumberLocaleKeeper const&) = delete;
+    NumberLocaleKeeper& operator=(NumberLocaleKeeper const&) = delete;
+    ~NumberLocaleKeeper() { (void)std::setlocale(LC_NUMERIC, _name.c_str()); }
+
+private:
+    std::string _name;
+};
+
+/// Never destroyed: the last widgets go after everything that could destroy it. The arguments live as long.
+QCoreApplication* makeApplication(QString const& platform)
+{
+    NumberLocaleKeeper const keeper;
+    static QByteArray program("velmora");
+    static QByteArray option("-platform");
+    static QByteArray value;
+    value = platform.toLocal8Bit();
+    static std::array<char*, 4> arguments{};
+    arguments = {program.data(), option.data(), value.data(), nullptr};
+    static int count = 0;
+    count = static_cast<int>(arguments.size()) - 1;
+    auto* const application = new QApplication(count, arguments.data());
+    QApplication::setQuitOnLastWindowClosed(false);
+    QApplication::setWindowIcon(getWindowIcon());
+    return application;
+}
+
+bool isWidgetApplication(QCoreApplication* application)
+{
+    return qobject_cast<QApplication*>(application);
+}
+
+} // namespace
+
+QtApplication::QtApplication()
+{
+    start();
+}
+
+bool QtApplication::hasGui()
+{
+    start();
+    return isWidgetApplication(QCoreApplication::instance());
+}
+
+bool QtApplication::isOwn() const
+{
+    return _own && _own == QCoreApplication::instance();
+}
+
+void QtApplication::requireLoop()
+{
+    start();
+    if (!QCoreApplication::instance())
+        throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: " + _refusal);
+    if (QCoreApplication::instance()->thread() != QThread::currentThread())
+        throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: this is not the thread of the user interface");
+}
+
+void QtApplication::requireWindows()
+{
+    start();
+    QCoreApplication* const application = QCoreApplication::instance();
+    if (application && !isWidgetApplication(application))
+        throw ExBase(__FILE__, __LINE__,
+                     "Cannot show a window: there is a QCoreApplication that is no QApplication; create a QApplication "
+                     "instead of it");
+    if (!application || (application == _own && !_refusal.empty()))
+        throw ExBase(__FILE__, __LINE__, "Cannot show a window: " + _refusal);
+    if (application->thread() != QThread::currentThread())
+        throw ExBase(__FILE__, __LINE__, "Cannot show a window: this is not the thread of the user interface");
+}
+
+void QtApplication::start()
+{
+    if (_tried || QCoreApplication::instance())
+        return;
+    _tried = true;
+    QtDisplayProbe probe;
+    DisplayChoice choice = probe.choose();
+    _refusal = choice.refusal;
+    // Without a display texts are measured all the same.
+    std::string reason;
+    if (choice.platform.isEmpty() && probe.canLoad(QStringLiteral("offscreen"), reason))
+        choice.platform = QStringLiteral("offscreen");
+    if (!choice.platform.isEmpty())
+        _own = makeApplication(choice.platform);
+}
+
+} // namespace Kv

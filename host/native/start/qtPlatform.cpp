@@ -1,0 +1,283 @@
+#include "start/qtPlatform.h"
+
+#include "browser/qtBrowser.h"
+#include "loop/qtGuard.h"
+#include "loop/qtLoop.h"
+#include "peers/qtContainer.h"
+#include "peers/qtLabel.h"
+#include "peers/qtMenu.h"
+#include "peers/qtPushButton.h"
+#include "peers/qtText.h"
+#include "peers/qtTextField.h"
+#include "peers/qtToggle.h"
+#include "start/qtTextEstimate.h"
+#include "windows/qtAdoptedContainer.h"
+#include "windows/qtFloat.h"
+#include "windows/qtMainWindow.h"
+#include "windows/qtWindow.h"
+#include "windows/qtWindowWidget.h"
+
+#include <QApplication>
+#include <QClipboard>
+#include <QFontMetricsF>
+#include <QScreen>
+#include <QStyle>
+#include <QStyleHints>
+
+#include <algorithm>
+#include <cmath>
+#include <utility>
+#include <vector>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// What layouts reckon with where there is no screen to ask.
+constexpr GeVector2<int> assumedScreen{1920, 1080};
+
+/// Looks for an object by its address, under one that lives.
+QObject* findObject(QObject* root, void const* address)
+{
+    if (!root || root == address)
+        return root;
+    for (QObject* const child : root->children())
+        if (QObject* const found = findObject(child, address))
+            return found;
+    return nullptr;
+}
+
+QWidget* nativeOf(NtContainer& container)
+{
+    return dynamic_cast<QtHolder&>(container).getContent();
+}
+
+/// The widest line as it is drawn, with what its first and last glyph let stick out.
+double measureIn(QFont const& font, QString const& text)
+{
+    QFontMetricsF const metrics(font);
+    double width = metrics.size(Qt::TextExpandTabs, text).width();
+    for (QString const& line : text.split(QLatin1Char('\n')))
+    {
+        QRectF const ink = metrics.tightBoundingRect(line);
+        width = std::max({width, metrics.horizontalAdvance(line), ink.right()});
+    }
+    // The toolkit's own size hints come from the metrics in whole pixels.
+    return std::max<double>(width, QFontMetrics(font).size(0, text).width());
+}
+
+double measure(QString const& text)
+{
+    QFont const labelFont = QApplication::font("QLabel");
+    QFont const buttonFont = QApplication::font("QPushButton");
+    double const width = measureIn(labelFont, text);
+    return buttonFont == labelFont ? width : std::max(width, measureIn(buttonFont, text));
+}
+
+/// What is left free of the screen's height for the window manager's frame, which is known only when it is too late.
+constexpr int titleBarRoom = 40;
+
+/// Turns a frame over, makes it fit the free part of the screen and moves it there.
+QRect fitToScreen(GeRectangle<int> const& frame)
+{
+    QScreen const* const screen = QGuiApplication::primaryScreen();
+    if (!screen)
+        return {frame.xMin, 0, frame.getWidth(), frame.getHeight()};
+    QRect const all = screen->geometry();
+    QRect const room = screen->availableGeometry();
+    int const highest = std::max(1, room.height() - titleBarRoom);
+    // The scroll bar of what is cut one way has a place of its own the other way: else it would bring the other bar
+    // too.
+    int const bar = QApplication::style()->pixelMetric(QStyle::PM_ScrollBarExtent);
+    int const barBeside = frame.getHeight() > highest ? bar : 0;
+    int const barBelow = frame.getWidth() > room.width() ? bar : 0;
+    int const width = std::clamp(frame.getWidth() + barBeside, 1, room.width());
+    int const height = std::clamp(frame.getHeight() + barBelow, 1, highest);
+    int const x = all.x() + frame.xMin;
+    int const y = all.y() + all.height() - frame.yMax;
+    return {std::clamp(x, room.x(), room.x() + room.width() - width),
+            std::clamp(y, room.y(), room.y() + room.height() - height - titleBarRoom / 2), width, height};
+}
+
+} // namespace
+
+void QtPlatform::setScriptHook(NtScriptHook* hook)
+{
+    QtGuard::getInstance().setScriptHook(hook);
+}
+
+float QtPlatform::measureText(std::string const& text)
+{
+    QString const string = toQString(text);
+    double const width = _application.hasGui() ? measure(string) : estimateTextWidth(string);
+    return static_cast<float>(std::ceil(width));
+}
+
+GeVector2<int> QtPlatform::getScreenSize()
+{
+    QScreen const* const screen = _application.hasGui() ? QGuiApplication::primaryScreen() : nullptr;
+    if (!screen)
+        return assumedScreen;
+    return {screen->size().width(), screen->size().height()};
+}
+
+void QtPlatform::setCursor(NtCursor cursor)
+{
+    if (!_application.hasGui())
+        return;
+    QCoreApplication* const application = QCoreApplication::instance();
+    bool const isBusy = _busyApplication == application;
+    bool const getsBusy = cursor == NtCursor::Busy;
+    if (isBusy == getsBusy)
+        return;
+    if (getsBusy)
+        QGuiApplication::setOverrideCursor(Qt::WaitCursor);
+    else
+        QGuiApplication::restoreOverrideCursor();
+    _busyApplication = getsBusy ? application : nullptr;
+}
+
+std::unique_ptr<NtWindow> QtPlatform::createWindow(std::string const& name, std::string const& title,
+                                                   std::string const& contentName, GeRectangle<int> const& frame,
+                                                   NtWindow* owner, NtWindowListener& listener)
+{
+    _application.requireWindows();
+    return std::make_unique<QtWindow>(name, title, contentName, fitToScreen(frame), dynamic_cast<QtWindow*>(owner),
+                                      listener);
+}
+
+std::unique_ptr<NtMainWindow> QtPlatform::adoptWindow(NtForeignWidget window, std::function<void(bool)> enableOwn,
+                                                      NtWindowListener& listener)
+{
+    _application.requireWindows();
+    _adopted = static_cast<QWidget*>(window.widget);
+    return std::make_unique<QtMainWindow>(window, std::move(enableOwn), listener);
+}
+
+std::unique_ptr<NtContainer> QtPlatform::adoptContainer(NtForeignWidget widget, NtPlaceListener& listener)
+{
+    return std::make_unique<QtAdoptedContainer>(widget, listener);
+}
+
+std::unique_ptr<NtContainer> QtPlatform::createContainer(NtContainer& parent, std::string const& name)
+{
+    return std::make_unique<QtContainer>(nativeOf(parent), name);
+}
+
+std::unique_ptr<NtFloat> QtPlatform::createFloat(NtContainer& parent, std::string const& name,
+                                                 NtFloatListener& listener)
+{
+    return std::make_unique<QtFloat>(nativeOf(parent), name, listener);
+}
+
+std::unique_ptr<NtLabel> QtPlatform::createLabel(NtContainer& parent, std::string const& name)
+{
+    return std::make_unique<QtLabel>(nativeOf(parent), name);
+}
+
+std::unique_ptr<NtTextField> QtPlatform::createTextField(NtContainer& parent, std::string const& name,
+                                                         NtTextFieldListener& listener)
+{
+    return std::make_unique<QtTextField>(nativeOf(parent), name, listener);
+}
+
+std::unique_ptr<NtToggle> QtPlatform::createToggle(NtContainer& parent, std::string const& name,
+                                                   NtToggleListener& listener)
+{
+    return std::make_unique<QtToggle>(nativeOf(parent), name, listener);
+}
+
+std::unique_ptr<NtMenu> QtPlatform::createMenu(NtContainer& parent, std::string const& name, NtMenuListener& listener)
+{
+    return std::make_unique<QtMenu>(nativeOf(parent), name, listener);
+}
+
+std::unique_ptr<NtPushButton> QtPlatform::createPushButton(NtContainer& parent, std::string const& name,
+                                                           NtPushButtonListener& listener)
+{
+    return std::make_unique<QtPushButton>(nativeOf(parent), name, listener);
+}
+
+std::unique_ptr<NtBrowser> QtPlatform::createBrowser(NtContainer& parent, std::string const& name,
+                                                     NtBrowserListener& listener)
+{
+    return std::make_unique<QtBrowser>(nativeOf(parent), name, listener);
+}
+
+void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
+{
+    if (*until)
+        return;
+    _application.requireLoop();
+    if (_closed)
+        refuseLoop();
+    QPointer<QWidget> const window = QApplication::activeModalWidget();
+    std::exception_ptr const error = QtLoop(until, end).run();
+    QtGuard::getInstance().destroyWaiting();
+    if (!error)
+        return;
+    if (auto* const left = dynamic_cast<QtWindowWidget*>(window.data()))
+        left->stopWaiting();
+    QtGuard::getInstance().rethrow(error);
+}
+
+void QtPlatform::refuseLoop()
+{
+    // A script that asks until it gets an answer would go on for ever, with no window to end it by.
+    constexpr int patience = 10;
+    if (++_refusedLoops > patience)
+        QtGuard::getInstance().interrupt();
+    throw ExBase(__FILE__, __LINE__, "The application is closing: no dialog can be run any more");
+}
+
+void QtPlatform::endLoop()
+{
+    if (QtLoop* const loop = QtGuard::getInstance().getInnermostLoop())
+        loop->end();
+}
+
+void QtPlatform::interruptLoop()
+{
+    if (QtGuard::getInstance().getInnermostLoop())
+        QtGuard::getInstance().checkSignals();
+}
+
+void QtPlatform::closeLoops()
+{
+    _closed = true;
+    for (QtLoop* loop = QtGuard::getInstance().getInnermostLoop(); loop; loop = loop->getOuter())
+        loop->end();
+}
+
+void QtPlatform::destroyWindows()
+{
+    QtWindow::destroyLeft();
+}
+
+bool QtPlatform::observe(void const* object, std::function<void()> onGone)
+{
+    std::vector<QObject*> roots{_adopted.data()};
+    for (QPointer<QtWindowWidget> const& window : QtWindowWidget::findAll())
+        roots.push_back(window);
+    if (_application.isOwn())
+        roots.insert(roots.end(), {QCoreApplication::instance(), QGuiApplication::clipboard(),
+                                   QGuiApplication::styleHints(), QGuiApplication::primaryScreen()});
+    for (QObject* const root : roots)
+        if (QObject* const found = findObject(root, object))
+        {
+            QObject::connect(found, &QObject::destroyed, std::move(onGone));
+            return true;
+        }
+    return false;
+}
+
+} // namespace Kv
+
+Kv::NtPlatform& kvNativePlatform()
+{
+    // Never destroyed: the interpreter's last objects still use it.
+    static auto* const platform = new Kv::QtPlatform;
+    return *platform;
+}

@@ -1,0 +1,46 @@
+#pragma once
+
+#include <QPointer>
+#include <QScrollArea>
+
+#include <functional>
+
+namespace Kv
+{
+
+/// Scrolls a content where that is larger than the room, and says how much room there is.
+class QtContentArea final : public QScrollArea
+{
+public:
+    /// `onRoom` hears of the width and height in pixels; it may end the area.
+    QtContentArea(QWidget* parent, std::function<void(int, int)> onRoom);
+
+    /// Tells the room if it is another than was told last; none is told while the area is hidden.
+    void tellRoom();
+
+    /// Gives the content its size, in pixels, once all in it has its place.
+    void setContentSize(int width, int height);
+
+    /// The widgets in the content are called anew by what stands beside them, once the event that is handled is over.
+    void nameValuesSoon();
+
+    /// The room is told anew, whatever it was.
+    void forgetRoom() { _told = QSize(); }
+
+    /// `cover`, borrowed, is not in the content, and lies over the upper edge of what is seen of that.
+    void setCover(QWidget& cover) { _cover = &cover; }
+
+protected:
+    void resizeEvent(QResizeEvent* event) override;
+
+private:
+    void turnPage(int action);
+
+    std::function<void(int, int)> _onRoom;
+    QSize _told;
+    QPointer<QWidget> _cover;
+    bool _telling = false;
+    bool _naming = false;
+};
+
+} // namespace Kv

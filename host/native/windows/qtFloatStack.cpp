@@ -1,0 +1,127 @@
+#include "windows/qtFloatStack.h"
+
+#include "windows/qtFloatWidget.h"
+#include "windows/qtFocusOrder.h"
+
+#include <QRegion>
+
+#include <algorithm>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// What of a float is in sight unless something lies above it, in the coordinates of its window.
+QRect getVisibleRect(QWidget const& floating)
+{
+    QWidget const& parent = *floating.parentWidget();
+    QRect const seen = floating.geometry().intersected(parent.rect());
+    return seen.translated(parent.mapTo(floating.window(), QPoint(0, 0)));
+}
+
+/// Null for what is no float, or gone.
+QtFloatWidget* toFloat(QWidget* widget)
+{
+    return dynamic_cast<QtFloatWidget*>(widget);
+}
+
+} // namespace
+
+QtFloatStack& QtFloatStack::getInstance()
+{
+    // Never destroyed: floats go as late as the last objects of the interpreter do.
+    static auto* const stack = new QtFloatStack;
+    return *stack;
+}
+
+void QtFloatStack::bringToFront(QtFloatWidget& floating)
+{
+    floating.raise();
+    forget(floating);
+    _places.emplace_back(&floating);
+    cutHoles();
+}
+
+void QtFloatStack::remove(QtFloatWidget& floating)
+{
+    forget(floating);
+    cutHoles();
+}
+
+void QtFloatStack::rememberOwn(QWidget& holder)
+{
+    for (QPointer<QWidget> const& place : _places)
+        if (place && !toFloat(place) && place->window() == holder.window())
+        {
+            forget(*place);
+            break;
+        }
+    _places.emplace_back(&holder);
+}
+
+void QtFloatStack::cutHoles() const
+{
+    for (auto lower = _places.begin(); lower != _places.end(); ++lower)
+    {
+        QtFloatWidget* const floating = toFloat(*lower);
+        QWidget const* const window = floating ? floating->parentWidget() : nullptr;
+        if (!window || !window->isWindow())
+            continue;
+        QRegion hole;
+        for (auto place = lower + 1; place != _places.end(); ++place)
+            if (QtFloatWidget const* const upper = toFloat(*place);
+                upper && upper->isVisible() && upper->window() == window && upper->parentWidget() != window)
+                hole += getVisibleRect(*upper);
+        cutHole(*floating, hole);
+    }
+}
+
+bool QtFloatStack::giveKeyboard(QWidget* place)
+{
+    if (!place || !QtFocusOrder::canHold(*place))
+        return false;
+    if (QtFloatWidget* const floating = toFloat(place))
+        floating->resumeKeyboard();
+    else
+        place->setFocus(Qt::OtherFocusReason);
+    return true;
+}
+
+void QtFloatStack::settleKeyboard(QWidget& window) const
+{
+    QWidget const* const holder = window.focusWidget();
+    if (holder && holder != &window && QtFocusOrder::canHold(*holder))
+        return;
+    // A copy: who gets the keyboard comes to the front.
+    std::vector<QPointer<QWidget>> const places = _places;
+    auto const takesIt = [&window](QPointer<QWidget> const& place)
+    { return place && place->window() == &window && giveKeyboard(place); };
+    if (std::find_if(places.rbegin(), places.rend(), takesIt) == places.rend())
+        window.setFocus(Qt::OtherFocusReason);
+}
+
+void QtFloatStack::forget(QWidget const& widget)
+{
+    _places.erase(std::remove_if(_places.begin(), _places.end(),
+                                 [&widget](QPointer<QWidget> const& place) { return !place || place == &widget; }),
+                  _places.end());
+}
+
+void QtFloatStack::cutHole(QWidget& floating, QRegion const& hole)
+{
+    QRegion const whole = floating.rect();
+    if (whole.isEmpty() || hole.isEmpty())
+    {
+        floating.clearMask();
+        return;
+    }
+    QRegion const left = whole.subtracted(hole.translated(-floating.mapTo(floating.window(), QPoint(0, 0))));
+    if (left == whole)
+        floating.clearMask();
+    else
+        floating.setMask(left);
+}
+
+} // namespace Kv

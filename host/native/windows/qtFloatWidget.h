@@ -1,0 +1,53 @@
+#pragma once
+
+#include "ntPeers.h"
+#include "peers/qtListenerHandle.h"
+#include "windows/qtContentArea.h"
+#include "windows/qtStage.h"
+
+#include <QPointer>
+#include <QWidget>
+
+namespace Kv
+{
+
+/// Qt's side of a floating container: has a ground and an edge of its own, walks the keyboard through the widgets in
+/// it, remembers which of them had it, and passes on Escape.
+class QtFloatWidget final : public QWidget, public QtStage
+{
+public:
+    QtFloatWidget(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle);
+    ~QtFloatWidget() override;
+
+    /// The innermost one that holds the widget, or is it; null if there is none.
+    static QtFloatWidget* findAround(QWidget& widget);
+
+    /// Where the widgets in it stand; scrolled where it is larger.
+    QWidget* getContent() const { return _area ? _area->widget() : nullptr; }
+    void setContentSize(int width, int height);
+
+    /// Keeps a widget of the content in place when that scrolls. A text in it becomes a title.
+    void pin(QWidget& widget);
+
+    /// Asks to be moved so that a widget in it is seen.
+    void askIntoView(QWidget const& widget) const;
+
+    /// Gives the keyboard to the widget in it that had it last, else to the one that has it first.
+    void resumeKeyboard();
+
+protected:
+    void showEvent(QShowEvent* event) override;
+    void hideEvent(QHideEvent* event) override;
+    void moveEvent(QMoveEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    bool focusNextPrevChild(bool next) override;
+
+private:
+    QtListenerHandle<NtFloatListener> _handle;
+    /// Natively children, which others can delete.
+    QPointer<QtContentArea> _area;
+    QPointer<QWidget> _edge;
+};
+
+} // namespace Kv

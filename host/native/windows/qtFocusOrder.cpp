@@ -1,0 +1,154 @@
+#include "windows/qtFocusOrder.h"
+
+#include "windows/qtFloatWidget.h"
+
+#include <QLineEdit>
+#include <QPushButton>
+#include <QScrollArea>
+
+#include <algorithm>
+#include <cstdlib>
+#include <iterator>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// A widget and where it stands.
+struct Place
+{
+    QWidget* widget;
+    QRect rect;
+};
+
+bool takesFocus(QWidget const& widget)
+{
+    return (widget.focusPolicy() & Qt::TabFocus) && !widget.focusProxy() && QtFocusOrder::canHold(widget);
+}
+
+std::vector<QWidget*> findStops(QWidget const& root)
+{
+    QWidget const* const window = root.window();
+    // Where the keyboard is now counts also if it cannot stay there: the step goes from there.
+    QWidget const* const current = window->focusWidget();
+    std::vector<QWidget*> stops;
+    for (QWidget* const widget : root.findChildren<QWidget*>())
+        if (widget->window() == window && (widget == current || takesFocus(*widget)))
+            stops.push_back(widget);
+    return stops;
+}
+
+bool inOneRow(QRect const& a, QRect const& b)
+{
+    return 2 * std::abs(a.center().y() - b.center().y()) <= std::min(a.height(), b.height());
+}
+
+constexpr char const* valueMark = "kvHoldsValue";
+
+bool isPushButton(QWidget const& widget)
+{
+    return qobject_cast<QPushButton const*>(&widget);
+}
+
+/// Scrolls a widget into view; of one that is larger than the room, its beginning.
+void reveal(QScrollArea& area, QWidget const& widget)
+{
+    // So much of what is around it is seen too: a row of it above and below, and the title that lies over the content.
+    constexpr QSize margin(7, 56);
+    QSize const half = widget.size().boundedTo(area.viewport()->size() / 2) / 2;
+    QPoint const middle = widget.mapTo(area.widget(), QPoint(half.width(), half.height()));
+    area.ensureVisible(middle.x(), middle.y(), half.width() + margin.width(), half.height() + margin.height());
+}
+
+} // namespace
+
+std::vector<QtFocusOrder::Row> QtFocusOrder::sortIntoRows(std::vector<QWidget*> const& widgets)
+{
+    std::vector<Place> places;
+    places.reserve(widgets.size());
+    for (QWidget* const widget : widgets)
+        places.push_back({widget, QRect(widget->mapTo(widget->window(), QPoint(0, 0)), widget->size())});
+    std::stable_sort(places.begin(), places.end(),
+                     [](Place const& a, Place const& b) { return a.rect.center().y() < b.rect.center().y(); });
+    std::vector<Row> rows;
+    for (auto first = places.begin(); first != places.end();)
+    {
+        auto const end = std::find_if_not(std::next(first), places.end(),
+                                          [&](Place const& place) { return inOneRow(first->rect, place.rect); });
+        std::stable_sort(first, end, [](Place const& a, Place const& b) { return a.rect.x() < b.rect.x(); });
+        Row& row = rows.emplace_back();
+        std::transform(first, end, std::back_inserter(row), [](Place const& place) { return place.widget; });
+        first = end;
+    }
+    return rows;
+}
+
+QtFocusOrder::QtFocusOrder(QWidget const& root) : _root(&root)
+{
+    for (Row const& row : sortIntoRows(findStops(root)))
+        _stops.insert(_stops.end(), row.begin(), row.end());
+}
+
+bool QtFocusOrder::step(bool next) const
+{
+    QWidget* const target = find(_root->window()->focusWidget(), next ? 1 : -1);
+    if (!target)
+        return false;
+    give(*target, next ? Qt::TabFocusReason : Qt::BacktabFocusReason);
+    return true;
+}
+
+void QtFocusOrder::markAsValue(QWidget& widget)
+{
+    widget.setProperty(valueMark, true);
+}
+
+bool QtFocusOrder::holdsValue(QWidget const& widget)
+{
+    QWidget const* const proxy = widget.focusProxy();
+    return (proxy ? proxy : &widget)->property(valueMark).toBool();
+}
+
+QWidget* QtFocusOrder::getFirst() const
+{
+    for (auto const wanted : {&holdsValue, &isPushButton})
+        for (QWidget* const widget : _stops)
+            if (wanted(*widget) && takesFocus(*widget))
+                return widget;
+    return nullptr;
+}
+
+bool QtFocusOrder::canHold(QWidget const& widget)
+{
+    return widget.isEnabled() && widget.isVisibleTo(widget.window());
+}
+
+void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
+{
+    widget.setFocus(reason);
+    // A window that is not active yet gets the keyboard for another reason, which would neither select nor show.
+    widget.window()->setAttribute(Qt::WA_KeyboardFocusChange);
+    if (auto* const field = qobject_cast<QLineEdit*>(&widget))
+        field->selectAll();
+    for (QWidget* parent = widget.parentWidget(); parent; parent = parent->parentWidget())
+        if (auto* const area = qobject_cast<QScrollArea*>(parent))
+            reveal(*area, widget);
+    if (QtFloatWidget const* const floating = QtFloatWidget::findAround(widget))
+        floating->askIntoView(widget);
+}
+
+QWidget* QtFocusOrder::find(QWidget const* current, int direction) const
+{
+    auto const count = static_cast<int>(_stops.size());
+    if (count == 0)
+        return nullptr;
+    auto const found = std::find(_stops.begin(), _stops.end(), current);
+    int const nowhere = direction > 0 ? -1 : count;
+    int const from = found == _stops.end() ? nowhere : static_cast<int>(found - _stops.begin());
+    QWidget* const next = _stops[static_cast<std::size_t>((from + direction + count) % count)];
+    return next == current ? nullptr : next;
+}
+
+} // namespace Kv

@@ -1,0 +1,127 @@
+#include "windows/qtMainWindow.h"
+
+#include "loop/qtGuard.h"
+#include "loop/qtInputDrop.h"
+#include "windows/qtFloatStack.h"
+#include "windows/qtFloatWidget.h"
+
+#include <QApplication>
+#include <QEvent>
+
+#include <utility>
+
+namespace Kv
+{
+
+QtMainWindow::QtMainWindow(NtForeignWidget window, std::function<void(bool)> enableOwn, NtWindowListener& listener)
+    : _handle(listener), _content(window), _enableOwn(std::move(enableOwn))
+{
+    if (QWidget* const native = _content.getNative())
+        native->installEventFilter(this);
+    connect(qApp, &QApplication::focusChanged, this, [this](QWidget*, QWidget* to) { onFocusChanged(to); });
+}
+
+QtMainWindow::~QtMainWindow()
+{
+    _handle.close();
+}
+
+void QtMainWindow::show()
+{
+    QWidget* const native = _content.getNative();
+    if (!native)
+        return;
+    native->show();
+    native->activateWindow();
+    tellSize();
+}
+
+void QtMainWindow::hide()
+{
+    if (QWidget* const native = _content.getNative())
+        native->hide();
+}
+
+void QtMainWindow::redraw()
+{
+    if (QWidget* const native = _content.getNative())
+        native->repaint();
+}
+
+void QtMainWindow::flushInput()
+{
+    QWidget* const native = _content.getNative();
+    if (!native)
+        return;
+    QtInputDrop const drop(*native);
+    QGuiApplication::sync();
+}
+
+void QtMainWindow::refuseInput()
+{
+    QWidget* const native = _content.getNative();
+    _holders.emplace_back(findHolder());
+    if (!native)
+        return;
+    // Qt would look for another holder, and the float would forget this one.
+    native->setFocus(Qt::OtherFocusReason);
+    if (_holders.size() == 1)
+        _enableOwn(false);
+}
+
+void QtMainWindow::admitInput()
+{
+    QtErrorAside const aside;
+    QPointer<QWidget> const holder = _holders.back();
+    _holders.pop_back();
+    QWidget* const native = _content.getNative();
+    if (!native)
+        return;
+    if (_holders.empty())
+        _enableOwn(true);
+    if (!QtFloatStack::giveKeyboard(holder))
+        QtFloatStack::getInstance().settleKeyboard(*native);
+}
+
+bool QtMainWindow::eventFilter(QObject* watched, QEvent* event)
+{
+    if (event->type() == QEvent::Resize)
+        tellSize();
+    return QObject::eventFilter(watched, event);
+}
+
+void QtMainWindow::onFocusChanged(QWidget* to)
+{
+    QWidget const* const native = _content.getNative();
+    if (!to)
+        // Later: Qt is in the middle of taking it from what is disabled.
+        QMetaObject::invokeMethod(
+            this, [this] { replaceLostHolder(); }, Qt::QueuedConnection);
+    else if (to != native && to->window() == native && !QtFloatWidget::findAround(*to))
+        QtFloatStack::getInstance().rememberOwn(*to);
+}
+
+void QtMainWindow::replaceLostHolder() const
+{
+    QWidget* const native = _content.getNative();
+    if (native && native->isActiveWindow() && !native->focusWidget())
+        QtFloatStack::getInstance().settleKeyboard(*native);
+}
+
+QWidget* QtMainWindow::findHolder() const
+{
+    QWidget const* const native = _content.getNative();
+    QWidget* const holder = native ? native->focusWidget() : nullptr;
+    if (!holder || holder == native)
+        return nullptr;
+    QtFloatWidget* const floating = QtFloatWidget::findAround(*holder);
+    return floating ? floating : holder;
+}
+
+void QtMainWindow::tellSize() const
+{
+    if (QWidget const* const native = _content.getNative())
+        _handle.tell(&NtWindowListener::onResized, native->width(), native->height());
+}
+
+} // namespace Kv

@@ -1,0 +1,163 @@
+#include "files/osFile.h"
+
+#include "exBase.h"
+#include "files/osFileDescriptor.h"
+#include "files/osTemporaryFile.h"
+#include "text/liStringUtil.h"
+
+#include <array>
+#include <cerrno>
+#include <fcntl.h>
+#include <optional>
+#include <sys/stat.h>
+#include <system_error>
+#include <unistd.h>
+#include <utility>
+
+namespace Kv
+{
+
+namespace
+{
+
+std::recursive_mutex& getDescriptorMutex()
+{
+    static std::recursive_mutex mutex;
+    return mutex;
+}
+
+[[noreturn]] void fail(char const* action, OsFilePath const& path, std::string const& words)
+{
+    throw ExBase(__FILE__, __LINE__,
+                 std::string("Cannot ") + action + " " + LiStringUtil::getPrintablePath(path.toString()) + ": " +
+                     words);
+}
+
+std::string getSystemWords()
+{
+    return std::generic_category().message(errno);
+}
+
+/// Nothing where the path leads to nothing.
+std::optional<struct stat> findStatus(OsFilePath const& path)
+{
+    struct stat status = {};
+    if (stat(path.getChars(), &status) == 0)
+        return status;
+    return std::nullopt;
+}
+
+bool canBeWritten(OsFilePath const& path, struct stat const& status)
+{
+    constexpr mode_t anyWriteBit = S_IWUSR | S_IWGRP | S_IWOTH;
+    return (status.st_mode & anyWriteBit) != 0 && faccessat(AT_FDCWD, path.getChars(), W_OK, AT_EACCESS) == 0;
+}
+
+char const* getNoFileWords(struct stat const& status)
+{
+    return S_ISDIR(status.st_mode) ? "it is a folder" : "it is no regular file";
+}
+
+/// What is in the way of writing a file, in words; nothing where nothing is. `status` is that of the file, if there is
+/// one.
+std::optional<std::string> findObstacle(OsFilePath const& path, std::optional<struct stat> const& status)
+{
+    OsFilePath const folder = path.getFolder();
+    auto const folderStatus = findStatus(folder);
+    if (!folderStatus)
+        return "its folder cannot be found: " + getSystemWords();
+    if (!canBeWritten(folder, *folderStatus))
+        return "its folder cannot be written";
+    if (status && !S_ISREG(status->st_mode))
+        return getNoFileWords(*status);
+    if (status && !canBeWritten(path, *status))
+        return "its permissions do not allow it";
+    return std::nullopt;
+}
+
+} // namespace
+
+OsFile::FileDescriptorManipGuard::FileDescriptorManipGuard() : _lock(getDescriptorMutex()) {}
+
+OsFile::FileDescriptorManipGuard::~FileDescriptorManipGuard() = default;
+
+OsFile::OsFile(OsFilePath path) : _path(std::move(path)) {}
+
+OsFile::~OsFile() = default;
+
+std::uint64_t OsFile::getSize() const
+{
+    std::error_code error;
+    std::uint64_t const size = std::filesystem::file_size(_path.toString(), error);
+    if (error)
+        throw ExBase(__FILE__, __LINE__,
+                     "Cannot tell the size of " + LiStringUtil::getPrintablePath(_path.toString()) + ": " +
+                         error.message());
+    return size;
+}
+
+std::string OsFile::read(std::uint64_t maxSize) const
+{
+    // A pipe that nobody writes to would never be open otherwise.
+    OsFileDescriptor const file(open(_path.getChars(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+    struct stat status = {};
+    if (!file.isOpen() || fstat(file.get(), &status) != 0)
+        fail("read", _path, getSystemWords());
+    if (!S_ISREG(status.st_mode))
+        fail("read", _path, getNoFileWords(status));
+    if (static_cast<std::uint64_t>(status.st_size) > maxSize)
+        fail("read", _path, "it is larger than " + std::to_string(maxSize) + " bytes");
+    std::string content;
+    std::array<char, 1 << 16> buffer{};
+    for (;;)
+    {
+        ssize_t const count = ::read(file.get(), buffer.data(), buffer.size());
+        if (count == 0)
+            return content;
+        if (count > 0)
+            content.append(buffer.data(), static_cast<std::size_t>(count));
+        else if (errno != EINTR)
+            fail("read", _path, getSystemWords());
+    }
+}
+
+std::string OsFile::getVersion() const
+{
+    std::optional<struct stat> const status = findStatus(_path);
+    if (!status || !S_ISREG(status->st_mode))
+        return {};
+    std::string version;
+    for (auto const part : {static_cast<long long>(status->st_dev), static_cast<long long>(status->st_ino),
+                            static_cast<long long>(status->st_size), static_cast<long long>(status->st_mtim.tv_sec),
+                            static_cast<long long>(status->st_mtim.tv_nsec)})
+        version += std::to_string(part) + ' ';
+    return version;
+}
+
+bool OsFile::isWritable() const
+{
+    OsFilePath const target = _path.getCanonical();
+    return !findObstacle(target, findStatus(target));
+}
+
+void OsFile::replace(std::string const& content) const
+{
+    OsFilePath const target = _path.getCanonical();
+    auto const old = findStatus(target);
+    if (auto const obstacle = findObstacle(target, old))
+        fail("write", target, *obstacle);
+    try
+    {
+        OsTemporaryFile file(target.getFolder());
+        file.write(content);
+        if (old)
+            file.takeOwnerAndPermissions(*old);
+        file.moveTo(target);
+    }
+    catch (std::system_error const& error)
+    {
+        fail("write", target, error.code().message());
+    }
+}
+
+} // namespace Kv

@@ -1,0 +1,61 @@
+#pragma once
+
+#include "files/osFilePath.h"
+#include "kvExport.h"
+
+#include <cstdint>
+#include <mutex>
+#include <string>
+
+namespace Kv
+{
+
+/// A file of the system, by its path; the file need not exist.
+class KV_API OsFile
+{
+public:
+    /// While one lives, no other thread that uses the guard opens or closes a descriptor. Who forks takes it too, so
+    /// that the child inherits no descriptor that is half set up. One thread may hold several.
+    class KV_API FileDescriptorManipGuard
+    {
+    public:
+        FileDescriptorManipGuard();
+        FileDescriptorManipGuard(FileDescriptorManipGuard const&) = delete;
+        FileDescriptorManipGuard& operator=(FileDescriptorManipGuard const&) = delete;
+        ~FileDescriptorManipGuard();
+
+    private:
+        std::lock_guard<std::recursive_mutex> _lock;
+    };
+
+    explicit OsFile(OsFilePath path);
+    OsFile(OsFile const&) = delete;
+    OsFile& operator=(OsFile const&) = delete;
+    ~OsFile();
+
+    /// Size in bytes, asked of the system at each call. Throws `ExBase`, naming the path, where there is no file, or
+    /// what is there is a directory or something else without a size.
+    std::uint64_t getSize() const;
+
+    /// The whole content. Throws `ExBase`, naming the path, where there is no regular file that can be read, and for
+    /// one of more than `maxSize` bytes.
+    std::string read(std::uint64_t maxSize) const;
+
+    /// A text that is another one once the file has been written or replaced; empty where there is no regular file.
+    std::string getVersion() const;
+
+    /// Whether `replace` would find what it needs: a regular file that can be written, or none, in a folder that can be
+    /// written. A file that nobody may write, by its permissions, cannot be written by the superuser either.
+    bool isWritable() const;
+
+    /// Makes `content` the whole content of the file, at once or not at all: another process sees the old file or the
+    /// new one, and so does whoever comes after a failure. Symbolic links are followed, and a file that is there keeps
+    /// its permissions and, where the system allows it, its owner. Throws `ExBase`, naming the path, where it cannot be
+    /// done.
+    void replace(std::string const& content) const;
+
+private:
+    OsFilePath _path;
+};
+
+} // namespace Kv

@@ -1,0 +1,36 @@
+#pragma once
+
+#include "kvExport.h"
+
+#include <string>
+
+namespace Kv
+{
+
+/// Where a path leads: to a directory, or to an entry in one. All are bytes of the file system.
+struct KV_API OsPlace
+{
+    /// Absolute, without a slash at the end but for the root.
+    std::string directory;
+    /// Empty for the directory itself.
+    std::string name;
+
+    /// `path` is absolute, relative to the directory `base`, or begins with the home directory as "~". An empty base
+    /// is the current directory of the process. Throws `ExBase`, with words that name the path, where nothing is there.
+    static OsPlace find(std::string const& path, std::string const& base);
+
+    /// The same for an entry that is not there yet. Throws `ExBase` where it is, or where its directory is not.
+    static OsPlace findNew(std::string const& path, std::string const& base);
+
+    /// The directory, or where it is gone, the nearest one above it that exists.
+    static std::string findNearest(std::string const& directory);
+
+    /// The path of an entry; of the directory itself where the name is empty.
+    static std::string join(std::string const& directory, std::string const& name);
+
+    /// A path within words for a person: in quotes, and whole however long, since it is the end that tells it from
+    /// others.
+    static std::string quote(std::string const& path);
+};
+
+} // namespace Kv

@@ -1,0 +1,60 @@
+#pragma once
+
+#include "kvExport.h"
+
+#include <iosfwd>
+#include <set>
+#include <string>
+#include <vector>
+
+namespace Kv
+{
+
+/// Writes one XML document, in UTF-8, onto a stream as the calls come; behind the last `closeTag` the stream holds all
+/// of it. What XML cannot hold, and calls that would give no document, throw `XmlError` and leave stream and writer as
+/// they were. A stream that fails throws `XmlError` too, and is of no more use.
+class KV_API XmlWriter
+{
+public:
+    /// The stream is borrowed for the writer's lifetime. `indent` is the number of blanks per level, 0 or more.
+    XmlWriter(std::ostream& stream, int indent);
+    XmlWriter(XmlWriter const&) = delete;
+    XmlWriter& operator=(XmlWriter const&) = delete;
+    ~XmlWriter();
+
+    /// Begins an element inside the innermost open one; the first is the root.
+    void openTag(std::string const& name);
+
+    /// Adds an attribute to the element just opened, before anything stands in it, each name once.
+    void writeAttrib(std::string const& name, std::string const& value);
+    void writeAttrib(std::string const& name, char const* value);
+    void writeAttrib(std::string const& name, int value);
+
+    /// Writes a whole element with nothing but a text in it. A null text is the empty one.
+    void writeTag(std::string const& name, std::string const& text);
+    void writeTag(std::string const& name, char const* text);
+    void writeTag(std::string const& name, int number);
+
+    /// Ends the innermost open element.
+    void closeTag();
+
+    /// Throws for what cannot be written as a text or as the value of an attribute; the words begin with `what`.
+    static void requireText(std::string const& text, std::string const& what);
+
+private:
+    void requireElement(std::string const& name) const;
+    void requireAttribute(std::string const& name) const;
+    std::string getLead() const;
+    std::string getLineLead(std::size_t depth) const;
+    char const* getTrail(std::size_t depth) const;
+    void write(std::string const& text);
+
+    std::ostream& _stream;
+    std::size_t _indent;
+    std::vector<std::string> _openNames;
+    std::set<std::string> _attributeNames;
+    bool _isStartTagOpen = false;
+    bool _hasRoot = false;
+};
+
+} // namespace Kv
