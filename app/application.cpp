@@ -142,7 +142,7 @@ void Application::makeHost()
     // Where that is gone the browser stays at the root.
     std::error_code nowhere;
     _browser->setURL(std::filesystem::current_path(nowhere).string(), HistoryEnum(0), UpdateEnum(0));
-    _workspace = makeShd<UiCompositionWorkspace>([this] { return _hostWindow->findKeyboardHolder(); });
+    _workspace = makeShd<UiCompositionWorkspace>([this] { return _hostWindow->findWidgetWithKeyboard(); });
     _workspace->setChangeCallback([this] { showCompositionsLater(); });
     UiWorkspace::setCurrentWorkspace(_workspace);
     UiAppMgr::getInstance().setApplication(_hostWindow, panel, _browser->getView());

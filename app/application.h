@@ -8,8 +8,8 @@
 #include "settings.h"
 
 #include "brBrowser.h"
+#include "piWidget.h"
 #include "uiCompositionWorkspace.h"
-#include "uiEventCallback.h"
 #include "uiMainWindow.h"
 
 #include <QTimer>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "brBrowserFloatingHandler.h"
-#include "uiEventCallback.h"
+#include "piWidget.h"
 
 #include <functional>
 #include <string>

@@ -4,7 +4,6 @@
 #include "exBase.h"
 #include "files/osPlace.h"
 #include "fwComposition.h"
-#include "ntPlatform.h"
 #include "uiContainer.h"
 
 #include <filesystem>
@@ -41,7 +40,7 @@ private:
     BrBrowser const* _browser;
 };
 
-BrBrowser::BrBrowser(std::string name) : UiWidget(std::move(name)), _view(makeShd<View>(*this))
+BrBrowser::BrBrowser(std::string name) : UiPeeredWidget(std::move(name)), _view(makeShd<View>(*this))
 {
     addClientData(_view);
 }
@@ -68,16 +67,6 @@ bool BrBrowser::isScript(std::string const& name)
     return std::filesystem::path(name).extension() == ".py";
 }
 
-RttiType const& BrBrowser::getClassType()
-{
-    return RttiGenType1<BrBrowser, UiWidget>::getInstance();
-}
-
-RttiType const& BrBrowser::getRttiType() const
-{
-    return getClassType();
-}
-
 void BrBrowser::setFolderOption(PaneEnum) {}
 
 void BrBrowser::setViewType(BrTypes::ViewType) {}
@@ -86,14 +75,16 @@ void BrBrowser::setSequencesCollapsed(bool collapsed)
 {
     requireUiThread();
     _sequencesCollapsed = collapsed;
-    showCollapsing();
+    if (NtBrowser* const peer = getPeer())
+        showCollapsing(*peer);
 }
 
 void BrBrowser::setCompositionsCollapsed(bool collapsed)
 {
     requireUiThread();
     _compositionsCollapsed = collapsed;
-    showCollapsing();
+    if (NtBrowser* const peer = getPeer())
+        showCollapsing(*peer);
 }
 
 void BrBrowser::setDontLoadCompositions(bool dontLoad)
@@ -112,8 +103,8 @@ void BrBrowser::setMultiple(bool multiple)
 {
     requireUiThread();
     _multiple = multiple;
-    if (_native)
-        _native->setMultiple(multiple);
+    if (NtBrowser* const peer = getPeer())
+        peer->setMultiple(multiple);
 }
 
 bool BrBrowser::setURL(LiString const& url, HistoryEnum, UpdateEnum)
@@ -131,8 +122,8 @@ bool BrBrowser::setURL(LiString const& url, HistoryEnum, UpdateEnum)
     onDirectoryChanged(place.directory);
     if (!place.name.empty())
         onSelectionChanged(place.name, {place.name});
-    if (_native)
-        _native->goTo(_directory, _focus, _selected);
+    if (NtBrowser* const peer = getPeer())
+        peer->goTo(_directory, _focus, _selected);
     return true;
 }
 
@@ -155,8 +146,8 @@ void BrBrowser::select(RCShdPtr<SnSelection> const& selection)
     if (!_multiple)
         names.resize(1);
     onSelectionChanged(names.front(), names);
-    if (_native)
-        _native->goTo(_directory, _focus, _selected);
+    if (NtBrowser* const peer = getPeer())
+        peer->goTo(_directory, _focus, _selected);
 }
 
 LiString BrBrowser::getInputFocusPath() const
@@ -187,25 +178,16 @@ bool BrBrowser::takeTypedPath()
 {
     RCShdPtr<BrBrowser> const self(this);
     requireUiThread();
-    std::optional<std::string> const typed = _native ? _native->takeTypedPath(_takesNew) : std::string();
+    std::optional<std::string> const typed = getPeer() ? getPeer()->takeTypedPath(_takesNew) : std::string();
     _newPath = typed.value_or("");
     return typed.has_value();
 }
 
-std::unique_ptr<NtPeer> BrBrowser::createPeer(NtPlatform& platform, NtContainer& parent)
+void BrBrowser::showState(NtBrowser& peer)
 {
-    std::unique_ptr<NtBrowser> peer = platform.createBrowser(parent, getName(), *this);
-    _native = peer.get();
-    showCollapsing();
-    _native->setMultiple(_multiple);
-    _native->goTo(_directory, _focus, _selected);
-    return peer;
-}
-
-void BrBrowser::dropPeer()
-{
-    _native = nullptr;
-    UiWidget::dropPeer();
+    showCollapsing(peer);
+    peer.setMultiple(_multiple);
+    peer.goTo(_directory, _focus, _selected);
 }
 
 void BrBrowser::onDirectoryChanged(std::string const& directory)
@@ -233,12 +215,10 @@ void BrBrowser::onActivated()
         fire(PiWidget::Activate);
 }
 
-void BrBrowser::showCollapsing()
+void BrBrowser::showCollapsing(NtBrowser& peer) const
 {
-    if (_native)
-        _native->setCollapsing(
-            [sequences = _sequencesCollapsed, compositions = _compositionsCollapsed](std::string const& name)
-            { return isComposition(name) ? compositions : sequences && !isScript(name); });
+    peer.setCollapsing([sequences = _sequencesCollapsed, compositions = _compositionsCollapsed](std::string const& name)
+                       { return isComposition(name) ? compositions : sequences && !isScript(name); });
 }
 
 RCShdPtr<SnSelection> BrBrowser::makeSelection() const

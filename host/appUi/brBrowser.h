@@ -3,11 +3,11 @@
 #include "brTypes.h"
 #include "cbHandler.h"
 #include "kvExport.h"
-#include "ntPeers.h"
+#include "ntBrowser.h"
 #include "snSelection.h"
 #include "text/liString.h"
+#include "uiPeeredWidget.h"
 #include "uiView.h"
-#include "uiWidget.h"
 
 #include <string>
 #include <vector>
@@ -21,7 +21,7 @@ namespace Kv
 ///
 /// Paths are bytes of the file system, absolute, and those of a collapsed sequence are that of its first file. All of
 /// it works without a window too: directory, focus and selection are the widget's own.
-class KV_API BrBrowser : public UiWidget, private NtBrowserListener
+class KV_API BrBrowser : public UiPeeredWidget<NtBrowser>
 {
 public:
     /// A browser at the end of `parent`. There are no resource tables for it: pass null.
@@ -34,9 +34,6 @@ public:
     static bool isScript(std::string const& name);
 
     ~BrBrowser() override;
-
-    static RttiType const& getClassType();
-    RttiType const& getRttiType() const override;
 
     /// Where folders are shown.
     void setFolderOption(PaneEnum);
@@ -89,17 +86,15 @@ public:
 protected:
     explicit BrBrowser(std::string name);
 
-    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
-
 private:
     class View;
 
-    void dropPeer() override;
+    void showState(NtBrowser& peer) override;
     void onDirectoryChanged(std::string const& directory) override;
     void onSelectionChanged(std::string const& focus, std::vector<std::string> const& selected) override;
     void onActivated() override;
 
-    void showCollapsing();
+    void showCollapsing(NtBrowser& peer) const;
     RCShdPtr<SnSelection> makeSelection() const;
 
     std::string _directory = "/";
@@ -115,7 +110,6 @@ private:
     bool _multiple = false;
     CbHandler<EvEvent>* _loadCb = nullptr;
     RCShdPtr<View> _view;
-    NtBrowser* _native = nullptr;
 };
 
 } // namespace Kv

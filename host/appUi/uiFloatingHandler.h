@@ -2,8 +2,8 @@
 
 #include "geVector2.h"
 #include "kvExport.h"
+#include "piWidget.h"
 #include "pointers/rcShdPtr.h"
-#include "uiEventCallback.h"
 #include "uiMoveContainer.h"
 
 namespace Kv

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "kvExport.h"
-#include "ntPeers.h"
+#include "ntWindow.h"
 #include "pointers/rcBase.h"
 
 #include <memory>

@@ -68,4 +68,11 @@ private:
     PiWidget::EventType _type;
 };
 
+/// Handler of widget events that calls a member function of an object, which it does not own.
+template <typename Object> class UiEventCallback : public CbMethod<Object, EvEvent>
+{
+public:
+    using CbMethod<Object, EvEvent>::CbMethod;
+};
+
 } // namespace Kv

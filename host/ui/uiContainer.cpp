@@ -13,6 +13,19 @@
 namespace Kv
 {
 
+namespace
+{
+
+void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element)
+{
+    RCShdPtr<UiContainer> const container = UiContainer::create(parent, element.getName().c_str(), nullptr);
+    UiWidgetFactory::createGroup(container, element);
+}
+
+UiWidgetKind const registered("Container", &build);
+
+} // namespace
+
 UiContainer::UiContainer(std::string name) : UiWidget(std::move(name)) {}
 
 UiContainer::~UiContainer()
@@ -27,23 +40,6 @@ RCShdPtr<UiContainer> UiContainer::create(RCShdPtr<UiContainer> const& parent, c
     RCShdPtr<UiContainer> container(new UiContainer(name));
     parent->addChild(container);
     return container;
-}
-
-void UiContainer::build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element)
-{
-    RCShdPtr<UiContainer> const container = create(parent, element.getName().c_str(), nullptr);
-    container->setConstraint(element.getConstraint());
-    UiWidgetFactory::createGroup(container, element);
-}
-
-RttiType const& UiContainer::getClassType()
-{
-    return RttiGenType1<UiContainer, UiWidget>::getInstance();
-}
-
-RttiType const& UiContainer::getRttiType() const
-{
-    return getClassType();
 }
 
 UiWindow* UiContainer::getWindow() const
@@ -124,7 +120,8 @@ void UiContainer::addChild(RCShdPtr<UiWidget> const& child)
 
 std::unique_ptr<NtPeer> UiContainer::createPeer(NtPlatform& platform, NtContainer& parent)
 {
-    std::unique_ptr<NtContainer> peer = platform.createContainer(parent, getName());
+    NtNoListener nobody;
+    std::unique_ptr<NtContainer> peer = platform.create<NtContainer>(parent, getName(), nobody);
     attachNative(platform, *peer);
     return peer;
 }

@@ -11,8 +11,6 @@
 namespace Kv
 {
 
-class UiWidgetElement;
-
 /// Widget that holds others, lays them out by their constraints and finds them by name.
 class KV_API UiContainer : public UiWidget
 {
@@ -20,13 +18,7 @@ public:
     /// A container at the end of `parent`. There are no resource tables for the built-in kinds: pass null.
     static RCShdPtr<UiContainer> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
 
-    /// The `Container` of a description, with all that it holds.
-    static void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
-
     ~UiContainer() override;
-
-    static RttiType const& getClassType();
-    RttiType const& getRttiType() const override;
 
     UiWindow* getWindow() const override;
 

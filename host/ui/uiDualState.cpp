@@ -1,40 +1,36 @@
 #include "uiDualState.h"
 
-#include "ntPlatform.h"
 #include "uiContainer.h"
 #include "uiWidgetElement.h"
+#include "uiWidgetFactory.h"
 
 #include <utility>
 
 namespace Kv
 {
 
-UiDualState::UiDualState(std::string name) : UiWidget(std::move(name)) {}
+namespace
+{
+
+void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element)
+{
+    RCShdPtr<UiDualState> const toggle = UiDualState::create(parent, element.getName().c_str(), nullptr);
+    element.takeAlign(NtAlign::Left);
+    if (std::optional<int> const state = element.takeInt("State"))
+        toggle->setState(*state != 0, false);
+}
+
+UiWidgetKind const registered("ToggleButton", &build);
+
+} // namespace
+
+UiDualState::UiDualState(std::string name) : UiPeeredWidget(std::move(name)) {}
 
 RCShdPtr<UiDualState> UiDualState::create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*)
 {
     RCShdPtr<UiDualState> toggle(new UiDualState(name));
     parent->addChild(toggle);
     return toggle;
-}
-
-void UiDualState::build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element)
-{
-    RCShdPtr<UiDualState> const toggle = create(parent, element.getName().c_str(), nullptr);
-    toggle->setConstraint(element.getConstraint());
-    element.takeAlign(NtAlign::Left);
-    if (std::optional<int> const state = element.takeInt("State"))
-        toggle->setState(*state != 0, false);
-}
-
-RttiType const& UiDualState::getClassType()
-{
-    return RttiGenType1<UiDualState, UiWidget>::getInstance();
-}
-
-RttiType const& UiDualState::getRttiType() const
-{
-    return getClassType();
 }
 
 bool UiDualState::getState() const
@@ -47,8 +43,8 @@ void UiDualState::setState(bool state, bool notify)
     requireUiThread();
     RCShdPtr<UiDualState> const self(this);
     _state = state;
-    if (_native)
-        _native->setState(state);
+    if (NtToggle* const peer = getPeer())
+        peer->setState(state);
     if (notify)
         fire(PiWidget::State);
 }
@@ -63,18 +59,9 @@ void UiDualState::onToggled(bool state)
     fire(PiWidget::Activate);
 }
 
-std::unique_ptr<NtPeer> UiDualState::createPeer(NtPlatform& platform, NtContainer& parent)
+void UiDualState::showState(NtToggle& peer)
 {
-    std::unique_ptr<NtToggle> peer = platform.createToggle(parent, getName(), *this);
-    peer->setState(_state);
-    _native = peer.get();
-    return peer;
-}
-
-void UiDualState::dropPeer()
-{
-    _native = nullptr;
-    UiWidget::dropPeer();
+    peer.setState(_state);
 }
 
 } // namespace Kv

@@ -17,7 +17,7 @@ bool isDisplayedThroughout(UiWidget const& widget)
 
 Iterator<RCShdPtr<UiWidget>> findButtons(UiContainer const& container)
 {
-    return container.findWidgets(UiWidgetPredicate::isType(UiPushButton::getClassType()) &&
+    return container.findWidgets(UiWidgetPredicate::isType(RttiGenType1<UiPushButton, UiWidget>::getInstance()) &&
                                  PrdPredicate<UiWidget>(&isDisplayedThroughout));
 }
 

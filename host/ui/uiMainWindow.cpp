@@ -43,16 +43,6 @@ RCShdPtr<UiMainWindow> UiMainWindow::create(char const* name, char const* title,
     return window;
 }
 
-RttiType const& UiMainWindow::getClassType()
-{
-    return RttiGenType1<UiMainWindow, UiTopLevel>::getInstance();
-}
-
-RttiType const& UiMainWindow::getRttiType() const
-{
-    return getClassType();
-}
-
 void UiMainWindow::refuseInput()
 {
     requireUiThread();
@@ -68,7 +58,7 @@ void UiMainWindow::admitInput()
     _native->admitInput();
 }
 
-UiWidget* UiMainWindow::findKeyboardHolder() const
+UiWidget* UiMainWindow::findWidgetWithKeyboard() const
 {
     return findHolderIn(*getRootContainer());
 }

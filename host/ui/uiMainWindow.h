@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ntPeers.h"
+#include "ntWindow.h"
 #include "uiTopLevel.h"
 
 #include <functional>
@@ -20,9 +20,6 @@ public:
 
     ~UiMainWindow() override;
 
-    static RttiType const& getClassType();
-    RttiType const& getRttiType() const override;
-
     int getInputLevel() const override { return _inputLevel; }
 
     /// Keeps input from the window until the matching `admitInput`, but from the floating containers that come to the
@@ -31,7 +28,7 @@ public:
     void admitInput();
 
     /// The innermost widget that has the keyboard whenever the window has it; borrowed, null if there is none.
-    UiWidget* findKeyboardHolder() const;
+    UiWidget* findWidgetWithKeyboard() const;
 
 protected:
     UiMainWindow(char const* name, char const* title, NtForeignWidget widget, std::function<void(bool)> enableOwn);

@@ -1,28 +1,21 @@
 #include "uiMenu.h"
 
-#include "ntPlatform.h"
 #include "text/liStringUtil.h"
 #include "uiContainer.h"
 #include "uiWidgetElement.h"
+#include "uiWidgetFactory.h"
 
 #include <utility>
 
 namespace Kv
 {
 
-UiMenu::UiMenu(std::string name) : UiWidget(std::move(name)) {}
-
-RCShdPtr<UiMenu> UiMenu::create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*)
+namespace
 {
-    RCShdPtr<UiMenu> menu(new UiMenu(name));
-    parent->addChild(menu);
-    return menu;
-}
 
-void UiMenu::build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element)
+void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element)
 {
-    RCShdPtr<UiMenu> const menu = create(parent, element.getName().c_str(), nullptr);
-    menu->setConstraint(element.getConstraint());
+    RCShdPtr<UiMenu> const menu = UiMenu::create(parent, element.getName().c_str(), nullptr);
     menu->setAlign(element.takeAlign(NtAlign::Left));
     for (std::string const& entry : element.takeTexts("MenuString"))
         menu->append(entry.c_str());
@@ -30,14 +23,17 @@ void UiMenu::build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element
         menu->setSelection(*selection, false);
 }
 
-RttiType const& UiMenu::getClassType()
-{
-    return RttiGenType1<UiMenu, UiWidget>::getInstance();
-}
+UiWidgetKind const registered("Menu", &build);
 
-RttiType const& UiMenu::getRttiType() const
+} // namespace
+
+UiMenu::UiMenu(std::string name) : UiPeeredWidget(std::move(name)) {}
+
+RCShdPtr<UiMenu> UiMenu::create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*)
 {
-    return getClassType();
+    RCShdPtr<UiMenu> menu(new UiMenu(name));
+    parent->addChild(menu);
+    return menu;
 }
 
 char const* UiMenu::getStrPtr() const
@@ -50,8 +46,8 @@ void UiMenu::removeAll()
     requireUiThread();
     _entries.clear();
     _selection = -1;
-    if (_native)
-        _native->removeAll();
+    if (NtMenu* const peer = getPeer())
+        peer->removeAll();
 }
 
 void UiMenu::append(char const* entry)
@@ -59,8 +55,8 @@ void UiMenu::append(char const* entry)
     requireUiThread();
     LiStringUtil::requireUtf8(entry, "Menu entry");
     _entries.emplace_back(entry);
-    if (_native)
-        _native->append(entry);
+    if (NtMenu* const peer = getPeer())
+        peer->append(entry);
 }
 
 void UiMenu::setSelection(int index, bool notify)
@@ -68,8 +64,8 @@ void UiMenu::setSelection(int index, bool notify)
     requireUiThread();
     RCShdPtr<UiMenu> const self(this);
     _selection = index >= 0 && static_cast<std::size_t>(index) < _entries.size() ? index : -1;
-    if (_native)
-        _native->select(_selection);
+    if (NtMenu* const peer = getPeer())
+        peer->select(_selection);
     if (notify)
         fire(PiWidget::ValueChanged);
 }
@@ -78,8 +74,8 @@ void UiMenu::setAlign(NtAlign align)
 {
     requireUiThread();
     _align = align;
-    if (_native)
-        _native->setAlign(align);
+    if (NtMenu* const peer = getPeer())
+        peer->setAlign(align);
 }
 
 void UiMenu::onPicked(int index)
@@ -94,21 +90,12 @@ void UiMenu::onPicked(int index)
     fire(PiWidget::Activate);
 }
 
-std::unique_ptr<NtPeer> UiMenu::createPeer(NtPlatform& platform, NtContainer& parent)
+void UiMenu::showState(NtMenu& peer)
 {
-    std::unique_ptr<NtMenu> peer = platform.createMenu(parent, getName(), *this);
     for (std::string const& entry : _entries)
-        peer->append(entry);
-    peer->select(_selection);
-    peer->setAlign(_align);
-    _native = peer.get();
-    return peer;
-}
-
-void UiMenu::dropPeer()
-{
-    _native = nullptr;
-    UiWidget::dropPeer();
+        peer.append(entry);
+    peer.select(_selection);
+    peer.setAlign(_align);
 }
 
 } // namespace Kv

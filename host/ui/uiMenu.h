@@ -1,7 +1,7 @@
 #pragma once
 
-#include "ntPeers.h"
-#include "uiWidget.h"
+#include "ntMenu.h"
+#include "uiPeeredWidget.h"
 
 #include <string>
 #include <vector>
@@ -9,20 +9,12 @@
 namespace Kv
 {
 
-class UiWidgetElement;
-
 /// A choice among strings. Raises `ValueChanged` when the selection changes, and `Activate` when the user picks.
-class KV_API UiMenu : public UiWidget, private NtMenuListener
+class KV_API UiMenu : public UiPeeredWidget<NtMenu>
 {
 public:
     /// A menu at the end of `parent`. There are no resource tables for the built-in kinds: pass null.
     static RCShdPtr<UiMenu> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
-
-    /// The `Menu` of a description.
-    static void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
-
-    static RttiType const& getClassType();
-    RttiType const& getRttiType() const override;
 
     /// The selected entry, UTF-8, valid until the entries change; null while none is selected.
     char const* getStrPtr() const;
@@ -43,17 +35,14 @@ public:
 protected:
     explicit UiMenu(std::string name);
 
-    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
-
 private:
-    void dropPeer() override;
+    void showState(NtMenu& peer) override;
     void onPicked(int index) override;
 
     std::vector<std::string> _entries;
     /// -1 while nothing is selected.
     int _selection = -1;
     NtAlign _align = NtAlign::Left;
-    NtMenu* _native = nullptr;
 };
 
 } // namespace Kv

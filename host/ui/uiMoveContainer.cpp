@@ -49,16 +49,6 @@ RCShdPtr<UiMoveContainer> UiMoveContainer::create(RCShdPtr<UiContainer> const& p
     return container;
 }
 
-RttiType const& UiMoveContainer::getClassType()
-{
-    return RttiGenType1<UiMoveContainer, UiContainer>::getInstance();
-}
-
-RttiType const& UiMoveContainer::getRttiType() const
-{
-    return getClassType();
-}
-
 void UiMoveContainer::follow(UiContainer const& parent, GeRectangle<int> const& before)
 {
     for (RCShdPtr<UiWidget> const& child : parent.getChildren())
@@ -129,7 +119,7 @@ void UiMoveContainer::followInputLevel(int level)
 
 std::unique_ptr<NtPeer> UiMoveContainer::createPeer(NtPlatform& platform, NtContainer& parent)
 {
-    std::unique_ptr<NtFloat> peer = platform.createFloat(parent, getName(), *this);
+    std::unique_ptr<NtFloat> peer = platform.create<NtFloat>(parent, getName(), *this);
     _float = peer.get();
     attachNative(platform, *peer);
     return peer;

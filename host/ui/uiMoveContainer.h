@@ -1,9 +1,9 @@
 #pragma once
 
 #include "evPointerEvent.h"
-#include "ntPeers.h"
+#include "ntContainer.h"
+#include "piWidget.h"
 #include "uiContainer.h"
-#include "uiEventCallback.h"
 
 #include <optional>
 
@@ -23,9 +23,6 @@ public:
     static RCShdPtr<UiMoveContainer> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
 
     ~UiMoveContainer() override;
-
-    static RttiType const& getClassType();
-    RttiType const& getRttiType() const override;
 
     /// The floating containers directly in `parent` keep their distance from its upper left corner, and stay within
     /// reach: `parent` has just been moved from the rectangle `before`.

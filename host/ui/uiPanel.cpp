@@ -20,16 +20,6 @@ RCShdPtr<UiPanel> UiPanel::create(RCShdPtr<UiContainer> const& parent, char cons
     return panel;
 }
 
-RttiType const& UiPanel::getClassType()
-{
-    return RttiGenType1<UiPanel, UiContainer>::getInstance();
-}
-
-RttiType const& UiPanel::getRttiType() const
-{
-    return getClassType();
-}
-
 std::unique_ptr<NtPeer> UiPanel::createPeer(NtPlatform& platform, NtContainer&)
 {
     std::unique_ptr<NtContainer> peer = platform.adoptContainer(_widget, *this);

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ntPeers.h"
+#include "ntContainer.h"
 #include "uiContainer.h"
 
 namespace Kv
@@ -16,9 +16,6 @@ public:
     static RCShdPtr<UiPanel> create(RCShdPtr<UiContainer> const& parent, char const* name, NtForeignWidget widget);
 
     ~UiPanel() override;
-
-    static RttiType const& getClassType();
-    RttiType const& getRttiType() const override;
 
 protected:
     UiPanel(char const* name, NtForeignWidget widget);

@@ -34,7 +34,7 @@ void UiPointerCallbacks::run(CbHandler<EvEvent>* handler, int x, int y, Args con
         return;
     // What the handler does may end the widget, and with it these.
     RCShdPtr<UiWidget> const keeper(_widget);
-    Event event(_widget->turnOver(x, y), args...);
+    Event event(_widget->flipY(x, y), args...);
     handler->call(event);
 }
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "evPointerEvent.h"
-#include "ntPeers.h"
+#include "ntPeer.h"
 
 namespace Kv
 {

@@ -1,41 +1,37 @@
 #include "uiTextField.h"
 
-#include "ntPlatform.h"
 #include "text/liStringUtil.h"
 #include "uiContainer.h"
 #include "uiWidgetElement.h"
+#include "uiWidgetFactory.h"
 
 #include <utility>
 
 namespace Kv
 {
 
-UiTextField::UiTextField(std::string name) : UiWidget(std::move(name)) {}
+namespace
+{
+
+void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element)
+{
+    RCShdPtr<UiTextField> const field = UiTextField::create(parent, element.getName().c_str(), nullptr);
+    field->setAlign(element.takeAlign(NtAlign::Left));
+    if (std::optional<std::string> const text = element.takeLabelString())
+        field->setString(text->c_str(), UiTextField::End, false, false);
+}
+
+UiWidgetKind const registered("TextField", &build);
+
+} // namespace
+
+UiTextField::UiTextField(std::string name) : UiPeeredWidget(std::move(name)) {}
 
 RCShdPtr<UiTextField> UiTextField::create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*)
 {
     RCShdPtr<UiTextField> field(new UiTextField(name));
     parent->addChild(field);
     return field;
-}
-
-void UiTextField::build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element)
-{
-    RCShdPtr<UiTextField> const field = create(parent, element.getName().c_str(), nullptr);
-    field->setConstraint(element.getConstraint());
-    field->setAlign(element.takeAlign(NtAlign::Left));
-    if (std::optional<std::string> const text = element.takeLabelString())
-        field->setString(text->c_str(), End, false, false);
-}
-
-RttiType const& UiTextField::getClassType()
-{
-    return RttiGenType1<UiTextField, UiWidget>::getInstance();
-}
-
-RttiType const& UiTextField::getRttiType() const
-{
-    return getClassType();
 }
 
 char const* UiTextField::getString() const
@@ -54,8 +50,8 @@ void UiTextField::setString(char const* text, CursorPosition position, bool appe
     else if (!append)
         _text = text ? std::optional<std::string>(text) : std::nullopt;
     _textBeforeEdit = _text;
-    if (_native)
-        _native->setText(_text.value_or(""), position == End);
+    if (NtTextField* const peer = getPeer())
+        peer->setText(_text.value_or(""), position == End);
     if (notify)
         fire(PiWidget::ValueChanged);
 }
@@ -64,8 +60,8 @@ void UiTextField::setAlign(NtAlign align)
 {
     requireUiThread();
     _align = align;
-    if (_native)
-        _native->setAlign(align);
+    if (NtTextField* const peer = getPeer())
+        peer->setAlign(align);
 }
 
 void UiTextField::onClicked()
@@ -89,19 +85,10 @@ void UiTextField::onEditEnded()
     fire(PiWidget::ValueChanged);
 }
 
-std::unique_ptr<NtPeer> UiTextField::createPeer(NtPlatform& platform, NtContainer& parent)
+void UiTextField::showState(NtTextField& peer)
 {
-    std::unique_ptr<NtTextField> peer = platform.createTextField(parent, getName(), *this);
-    peer->setText(_text.value_or(""), true);
-    peer->setAlign(_align);
-    _native = peer.get();
-    return peer;
-}
-
-void UiTextField::dropPeer()
-{
-    _native = nullptr;
-    UiWidget::dropPeer();
+    peer.setText(_text.value_or(""), true);
+    peer.setAlign(_align);
 }
 
 } // namespace Kv

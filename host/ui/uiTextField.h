@@ -1,16 +1,14 @@
 #pragma once
 
-#include "ntPeers.h"
-#include "uiWidget.h"
+#include "ntTextField.h"
+#include "uiPeeredWidget.h"
 
 namespace Kv
 {
 
-class UiWidgetElement;
-
 /// An editable line of text. Raises `ValueChanged` when the user ends an edit with Enter that has changed the text, and
 /// `Activate` when the user clicks it. Its text is what stands on the screen, Enter pressed or not.
-class KV_API UiTextField : public UiWidget, private NtTextFieldListener
+class KV_API UiTextField : public UiPeeredWidget<NtTextField>
 {
 public:
     /// Where a new text leaves the text cursor.
@@ -22,12 +20,6 @@ public:
 
     /// A text field at the end of `parent`. There are no resource tables for the built-in kinds: pass null.
     static RCShdPtr<UiTextField> create(RCShdPtr<UiContainer> const& parent, char const* name, UiResTable const*);
-
-    /// The `TextField` of a description.
-    static void build(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
-
-    static RttiType const& getClassType();
-    RttiType const& getRttiType() const override;
 
     /// UTF-8, valid until the text changes; null where a null text was the last that was set.
     char const* getString() const;
@@ -43,10 +35,8 @@ public:
 protected:
     explicit UiTextField(std::string name);
 
-    std::unique_ptr<NtPeer> createPeer(NtPlatform& platform, NtContainer& parent) override;
-
 private:
-    void dropPeer() override;
+    void showState(NtTextField& peer) override;
     void onClicked() override;
     void onTextEdited(std::string const& text) override;
     void onEditEnded() override;
@@ -55,7 +45,6 @@ private:
     /// The text that an edit under way began with.
     std::optional<std::string> _textBeforeEdit = "";
     NtAlign _align = NtAlign::Left;
-    NtTextField* _native = nullptr;
 };
 
 } // namespace Kv

@@ -42,16 +42,6 @@ RCShdPtr<UiTopLevel> UiTopLevel::create(char const* name, char const* title, RCS
     return RCShdPtr<UiTopLevel>(new UiTopLevel(name, title, style));
 }
 
-RttiType const& UiTopLevel::getClassType()
-{
-    return RttiGenType1<UiTopLevel, UiWidget>::getInstance();
-}
-
-RttiType const& UiTopLevel::getRttiType() const
-{
-    return getClassType();
-}
-
 UiWindow* UiTopLevel::getWindow() const
 {
     return const_cast<UiTopLevel*>(this);

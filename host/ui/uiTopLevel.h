@@ -22,9 +22,6 @@ public:
 
     ~UiTopLevel() override;
 
-    static RttiType const& getClassType();
-    RttiType const& getRttiType() const override;
-
     UiWindow* getWindow() const override;
     RCShdPtr<UiContainer> getRootContainer() const override;
     RCShdPtr<WsWindow> getOSWindow() const override;

@@ -24,16 +24,6 @@ UiWidget::UiWidget(std::string name) : _name(std::move(name))
 
 UiWidget::~UiWidget() = default;
 
-RttiType const& UiWidget::getClassType()
-{
-    return RttiGenType0<UiWidget>::getInstance();
-}
-
-RttiType const& UiWidget::getRttiType() const
-{
-    return getClassType();
-}
-
 std::string const& UiWidget::getName() const
 {
     return _name;
@@ -228,7 +218,7 @@ void UiWidget::forgetHandlers()
         _pointerCallbacks->clear();
 }
 
-GeVector2<int> UiWidget::turnOver(int x, int y) const
+GeVector2<int> UiWidget::flipY(int x, int y) const
 {
     UiWindow const* const window = getWindow();
     return {x, window ? window->getRootContainer()->getRect().yMax - y : -y};

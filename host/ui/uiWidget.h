@@ -6,7 +6,6 @@
 #include "kvExport.h"
 #include "piWidget.h"
 #include "pointers/rcShdPtr.h"
-#include "rttiType.h"
 #include "text/liString.h"
 #include "uiConstraint.h"
 #include "uiFrame.h"
@@ -41,9 +40,6 @@ public:
     static char const* const BackgroundColor;
 
     ~UiWidget() override;
-
-    static RttiType const& getClassType();
-    virtual RttiType const& getRttiType() const;
 
     std::string const& getName() const;
 
@@ -161,7 +157,7 @@ protected:
     virtual void cameToFront() {}
 
     /// A point of the window, in pixels, with y growing downward, as one with y growing upward.
-    GeVector2<int> turnOver(int x, int y) const;
+    GeVector2<int> flipY(int x, int y) const;
 
 private:
     friend class UiContainer;

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "kvExport.h"
-#include "ntPeers.h"
+#include "ntPeer.h"
 #include "uiConstraint.h"
 #include "xml/xmlElement.h"
 
@@ -21,6 +21,9 @@ public:
     UiWidgetElement(XmlElement const& element, int depth);
 
     int getDepth() const { return _depth; }
+
+    /// The line of the description that it begins in, from 1.
+    int getLine() const { return _element.getLine(); }
 
     std::string const& getName() const { return _name; }
 

@@ -1,11 +1,6 @@
 #include "uiWidgetFactory.h"
 
-#include "uiDualState.h"
-#include "uiLabel.h"
 #include "uiLayout.h"
-#include "uiMenu.h"
-#include "uiPushButton.h"
-#include "uiTextField.h"
 #include "uiWidgetElement.h"
 #include "xml/xmlError.h"
 
@@ -18,9 +13,14 @@ namespace Kv
 namespace
 {
 
-using Builder = void (*)(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
+using Builders = std::map<std::string, UiWidgetKind::Build>;
 
-using Builders = std::map<std::string, Builder>;
+/// By the names of the elements.
+Builders& getBuilders()
+{
+    static Builders builders;
+    return builders;
+}
 
 /// The letters of a text, all of them small.
 std::string toLetters(std::string const& text)
@@ -57,15 +57,11 @@ bool isNear(std::string const& name, std::string const& kind)
     throw XmlError(__FILE__, __LINE__, element.getLine(), words + ". Known are " + kinds + "." + meant);
 }
 
-Builder findBuilder(XmlElement const& element)
+UiWidgetKind::Build findBuilder(XmlElement const& element)
 {
-    static Builders const builders{
-        {"Container", &UiContainer::build},   {"Label", &UiLabel::build},         {"Menu", &UiMenu::build},
-        {"PushButton", &UiPushButton::build}, {"TextField", &UiTextField::build}, {"ToggleButton", &UiDualState::build},
-    };
-    auto const found = builders.find(element.getName());
-    if (found == builders.end())
-        failUnknown(element, builders);
+    auto const found = getBuilders().find(element.getName());
+    if (found == getBuilders().end())
+        failUnknown(element, getBuilders());
     return found->second;
 }
 
@@ -99,6 +95,11 @@ private:
 
 } // namespace
 
+UiWidgetKind::UiWidgetKind(char const* element, Build build)
+{
+    getBuilders().emplace(element, build);
+}
+
 RCShdPtr<UiWidget> UiWidgetFactory::createWidget(RCShdPtr<UiContainer> const& parent, XmlElement const& element)
 {
     Rollback rollback(parent);
@@ -109,6 +110,9 @@ RCShdPtr<UiWidget> UiWidgetFactory::createWidget(RCShdPtr<UiContainer> const& pa
 
 void UiWidgetFactory::createGroup(RCShdPtr<UiContainer> const& container, UiWidgetElement& element)
 {
+    if (element.getDepth() > maxDepth)
+        throw XmlError(__FILE__, __LINE__, element.getLine(),
+                       "containers nested deeper than " + std::to_string(maxDepth));
     createAll(container, element.takeGroup(), element.getDepth() + 1);
 }
 
@@ -118,12 +122,10 @@ void UiWidgetFactory::createAll(RCShdPtr<UiContainer> const& container, std::vec
     std::size_t const first = container->getChildren().size();
     for (XmlElement const& element : elements)
     {
-        Builder const build = findBuilder(element);
-        if (build == &UiContainer::build && depth > maxDepth)
-            throw XmlError(__FILE__, __LINE__, element.getLine(),
-                           "containers nested deeper than " + std::to_string(maxDepth));
+        UiWidgetKind::Build const build = findBuilder(element);
         UiWidgetElement widget(element, depth);
         build(container, widget);
+        container->getChildren().back()->setConstraint(widget.getConstraint());
         widget.finish();
     }
     if (std::optional<UiLayout::Fault> const fault = UiLayout(*container).findFault())

@@ -8,6 +8,19 @@
 namespace Kv
 {
 
+class UiWidgetElement;
+
+/// Makes a kind of widget known to descriptions. Each kind has one in its own source file.
+class UiWidgetKind
+{
+public:
+    /// Builds the widget of an element as the last in `parent`, without its constraint.
+    using Build = void (*)(RCShdPtr<UiContainer> const& parent, UiWidgetElement& element);
+
+    /// `element` is the name of the kind's elements.
+    UiWidgetKind(char const* element, Build build);
+};
+
 /// Builds widgets from the elements of a description.
 class KV_API UiWidgetFactory
 {

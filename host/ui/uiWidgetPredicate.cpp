@@ -3,9 +3,11 @@
 namespace Kv
 {
 
+RttiType::RttiType(Test test) : _test(test) {}
+
 PrdPredicate<UiWidget> UiWidgetPredicate::isType(RttiType const& type)
 {
-    return PrdPredicate<UiWidget>([&type](UiWidget const& widget) { return widget.getRttiType().isA(type); });
+    return PrdPredicate<UiWidget>([&type](UiWidget const& widget) { return type.isInstance(widget); });
 }
 
 PrdPredicate<UiWidget> UiWidgetPredicate::nameStartsWith(std::string const& prefix)

@@ -3,7 +3,7 @@
 #include "exBase.h"
 #include "files/osDirOrder.h"
 #include "files/osPlace.h"
-#include "uiEventCallback.h"
+#include "piWidget.h"
 #include "uiTopLevel.h"
 #include "uiView.h"
 

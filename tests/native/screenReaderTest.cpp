@@ -1,5 +1,5 @@
+#include "piWidget.h"
 #include "uiDualState.h"
-#include "uiEventCallback.h"
 #include "uiLabel.h"
 #include "uiMainWindow.h"
 #include "uiMenu.h"

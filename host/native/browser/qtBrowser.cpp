@@ -1,47 +1,52 @@
-#include "browser/qtBrowser.h"
+#include "browser/qtBrowserPane.h"
+#include "ntBrowser.h"
+#include "peers/qtPeer.h"
 
 #include <utility>
 
 namespace Kv
 {
 
-QtBrowser::QtBrowser(QWidget* parent, std::string const& name, NtBrowserListener& listener)
-    : QtBrowser(parent, name, QtListenerHandle<NtBrowserListener>(listener))
+namespace
 {
-}
 
-QtBrowser::QtBrowser(QWidget* parent, std::string const& name, QtListenerHandle<NtBrowserListener> const& handle)
-    : QtPeer(makeNative<QtBrowserPane>(parent, name, handle), name, 0), _handle(handle)
+/// A directory to look at and to choose from.
+class Browser final : public QtPeerOf<NtBrowser, QtBrowserPane>
 {
-}
+public:
+    Browser(QWidget* parent, std::string const& name, NtBrowserListener& listener) : QtPeerOf(parent, name, 0, listener)
+    {
+        if (QtBrowserPane* const pane = getNative())
+            pane->nameParts();
+    }
 
-QtBrowser::~QtBrowser()
-{
-    _handle.close();
-}
+    void goTo(std::string const& directory, std::string const& focus, std::vector<std::string> const& selected) override
+    {
+        if (QtBrowserPane* const pane = getNative())
+            pane->goTo(directory, {focus, selected});
+    }
 
-void QtBrowser::goTo(std::string const& directory, std::string const& focus, std::vector<std::string> const& selected)
-{
-    if (QtBrowserPane* const pane = getNative())
-        pane->goTo(directory, {focus, selected});
-}
+    void setCollapsing(std::function<bool(std::string const&)> collapses) override
+    {
+        if (QtBrowserPane* const pane = getNative())
+            pane->setCollapsing(std::move(collapses));
+    }
 
-void QtBrowser::setCollapsing(std::function<bool(std::string const&)> collapses)
-{
-    if (QtBrowserPane* const pane = getNative())
-        pane->setCollapsing(std::move(collapses));
-}
+    void setMultiple(bool multiple) override
+    {
+        if (QtBrowserPane* const pane = getNative())
+            pane->setMultiple(multiple);
+    }
 
-void QtBrowser::setMultiple(bool multiple)
-{
-    if (QtBrowserPane* const pane = getNative())
-        pane->setMultiple(multiple);
-}
+    std::optional<std::string> takeTypedPath(bool takesNew) override
+    {
+        QtBrowserPane* const pane = getNative();
+        return pane ? pane->takeTypedPath(takesNew) : std::string();
+    }
+};
 
-std::optional<std::string> QtBrowser::takeTypedPath(bool takesNew)
-{
-    QtBrowserPane* const pane = getNative();
-    return pane ? pane->takeTypedPath(takesNew) : std::string();
-}
+QtPeerKind<NtBrowser, Browser> const registered;
+
+} // namespace
 
 } // namespace Kv

@@ -70,8 +70,7 @@ QString makeWrappable(QString text)
 
 } // namespace
 
-QtBrowserPane::QtBrowserPane(QWidget* parent, std::string const& name,
-                             QtListenerHandle<NtBrowserListener> const& handle)
+QtBrowserPane::QtBrowserPane(QWidget* parent, QtListenerHandle<NtBrowserListener> const& handle)
     : QWidget(parent), _handle(handle), _up(new QToolButton(this)),
       _path(new QtPathField(this, [this] { takeTypedPath(false); })),
       _model(new QtDirModel(this, [this] { onRead(); })),
@@ -88,7 +87,9 @@ QtBrowserPane::QtBrowserPane(QWidget* parent, std::string const& name,
     _message->hide();
     // Whoever gives the keyboard to the browser gives it to the list.
     setFocusProxy(_list);
-    makeNames(toQString(name));
+    _up->setAccessibleName(QStringLiteral("Up"));
+    _path->setAccessibleName(QStringLiteral("Folder"));
+    _list->setAccessibleName(QStringLiteral("Files"));
     layOut();
     connect(_up, &QToolButton::clicked, this, [this] { goUp(); });
     connect(_list->selectionModel(), &QItemSelectionModel::selectionChanged, this, [this] { onChosen(); });
@@ -99,14 +100,11 @@ QtBrowserPane::QtBrowserPane(QWidget* parent, std::string const& name,
     connect(&_patience, &QTimer::timeout, this, [this] { showState(); });
 }
 
-void QtBrowserPane::makeNames(QString const& name)
+void QtBrowserPane::nameParts()
 {
     for (auto const& [widget, part] : std::initializer_list<std::pair<QWidget*, char const*>>{
              {_up, ".up"}, {_path, ".path"}, {_list, ".list"}, {_message, ".message"}})
-        widget->setObjectName(name + QLatin1String(part));
-    _up->setAccessibleName(QStringLiteral("Up"));
-    _path->setAccessibleName(QStringLiteral("Folder"));
-    _list->setAccessibleName(QStringLiteral("Files"));
+        widget->setObjectName(objectName() + QLatin1String(part));
 }
 
 void QtBrowserPane::layOut()

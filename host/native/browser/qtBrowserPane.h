@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ntPeers.h"
+#include "ntBrowser.h"
 #include "peers/qtListenerHandle.h"
 
 #include <QLabel>
@@ -37,8 +37,10 @@ public:
         }
     };
 
-    /// The widgets in it are named after it.
-    QtBrowserPane(QWidget* parent, std::string const& name, QtListenerHandle<NtBrowserListener> const& handle);
+    QtBrowserPane(QWidget* parent, QtListenerHandle<NtBrowserListener> const& handle);
+
+    /// Names the widgets in it after it.
+    void nameParts();
 
     /// Shows a directory, an absolute path, and selects what is in it of a choice. The listener hears nothing.
     void goTo(std::string const& directory, Choice const& choice);
@@ -67,7 +69,6 @@ private:
         int scroll = 0;
     };
 
-    void makeNames(QString const& name);
     void layOut();
 
     void activate();

@@ -3,12 +3,13 @@
 #include "exBase.h"
 #include "geRectangle.h"
 #include "geVector2.h"
-#include "ntPeers.h"
+#include "ntWindow.h"
 
 #include <exception>
 #include <functional>
 #include <memory>
 #include <string>
+#include <typeindex>
 
 namespace Kv
 {
@@ -95,21 +96,13 @@ public:
     /// Takes a widget of the application's window as a container, which stays where the application has it.
     virtual std::unique_ptr<NtContainer> adoptContainer(NtForeignWidget widget, NtPlaceListener& listener) = 0;
 
-    /// Peers are made displayed and enabled, without a cell. Listeners are borrowed and outlive the peer.
-    virtual std::unique_ptr<NtContainer> createContainer(NtContainer& parent, std::string const& name) = 0;
-    virtual std::unique_ptr<NtFloat> createFloat(NtContainer& parent, std::string const& name,
-                                                 NtFloatListener& listener) = 0;
-    virtual std::unique_ptr<NtLabel> createLabel(NtContainer& parent, std::string const& name) = 0;
-    virtual std::unique_ptr<NtTextField> createTextField(NtContainer& parent, std::string const& name,
-                                                         NtTextFieldListener& listener) = 0;
-    virtual std::unique_ptr<NtToggle> createToggle(NtContainer& parent, std::string const& name,
-                                                   NtToggleListener& listener) = 0;
-    virtual std::unique_ptr<NtMenu> createMenu(NtContainer& parent, std::string const& name,
-                                               NtMenuListener& listener) = 0;
-    virtual std::unique_ptr<NtPushButton> createPushButton(NtContainer& parent, std::string const& name,
-                                                           NtPushButtonListener& listener) = 0;
-    virtual std::unique_ptr<NtBrowser> createBrowser(NtContainer& parent, std::string const& name,
-                                                     NtBrowserListener& listener) = 0;
+    /// Makes a peer of the kind that `Face` is, displayed and enabled, without a cell. The listener is borrowed and
+    /// outlives the peer.
+    template <typename Face>
+    std::unique_ptr<Face> create(NtContainer& parent, std::string const& name, typename Face::Listener& listener)
+    {
+        return std::unique_ptr<Face>(dynamic_cast<Face*>(createPeer(typeid(Face), parent, name, &listener).release()));
+    }
 
     /// Dispatches events until `*until` is true, however it came to be. What a handler throws ends the loop and is
     /// thrown on from here. When the application is asked to quit, `*end` is set to true. Loops nest.
@@ -132,6 +125,11 @@ public:
     /// True if the address is that of a living object of Qt that the application made, not a script. Then `onGone` is
     /// called when it goes.
     virtual bool observe(void const* object, std::function<void()> onGone) = 0;
+
+private:
+    /// Makes a peer with that face; `listener` is a `Listener` of the face.
+    virtual std::unique_ptr<NtPeer> createPeer(std::type_index face, NtContainer& parent, std::string const& name,
+                                               void* listener) = 0;
 };
 
 /// Name of the function that libKVnative exports; gives the process's one platform, which lives as long as the process.

@@ -3,6 +3,11 @@
 namespace Kv
 {
 
-QtContainer::QtContainer(QWidget* parent, std::string const& name) : QtPeer(makeNative<QWidget>(parent), name, 0) {}
+namespace
+{
+
+QtPeerKind<NtContainer, QtContainer> const registered;
+
+} // namespace
 
 } // namespace Kv

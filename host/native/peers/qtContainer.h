@@ -1,20 +1,18 @@
 #pragma once
 
-#include "peers/qtHolder.h"
+#include "ntContainer.h"
 #include "peers/qtPeer.h"
 
 namespace Kv
 {
 
 /// Plain widget that holds other peers' widgets.
-class QtContainer final : public QtPeer<NtContainer, QWidget>, public QtHolder
+class QtContainer final : public QtPeerOf<NtContainer, QWidget>
 {
 public:
-    /// `parent`, which owns the widget natively, can be null.
-    QtContainer(QWidget* parent, std::string const& name);
+    QtContainer(QWidget* parent, std::string const& name, NtNoListener& nobody) : QtPeerOf(parent, name, 0, nobody) {}
 
     void focusFirst() override { focusFirstInContent(); }
-    QWidget* getContent() const override { return getNative(); }
 };
 
 } // namespace Kv

@@ -1,24 +1,43 @@
 #pragma once
 
-#include "ntPeers.h"
-#include "peers/qtLabelWidget.h"
-#include "peers/qtPeer.h"
+#include "peers/qtLongText.h"
+
+#include <QLabel>
 
 namespace Kv
 {
 
-/// The alignment as the toolkit has it, centred from bottom to top.
-Qt::Alignment toQtAlignment(NtAlign align);
-
-/// Text as it is, without markup or shortcuts.
-class QtLabel final : public QtPeer<NtLabel, QtLabelWidget>
+/// A label on the screen: a text as it is, without markup or shortcuts. Of a text that it has no room for it shows the
+/// first lines, and the whole in a tooltip. The mouse can select in it and copy.
+class QtLabel final : public QLabel
 {
 public:
-    /// `parent`, which owns the widget natively, can be null.
-    QtLabel(QWidget* parent, std::string const& name);
+    explicit QtLabel(QWidget* parent);
 
-    void setText(std::string const& text) override;
-    void setAlign(NtAlign align) override;
+    QString const& getWords() const { return _words; }
+    void setWords(QString const& words);
+
+    /// Makes it the title of what it stands in, which is dragged by it and called by it.
+    void makeTitle();
+
+    /// Says which widget the label names, for those who do not see it stand beside it; null for none.
+    void setNamed(QWidget* widget);
+
+protected:
+    bool event(QEvent* event) override;
+    void enterEvent(QEnterEvent* event) override;
+    void mouseReleaseEvent(QMouseEvent* event) override;
+    void contextMenuEvent(QContextMenuEvent* event) override;
+    void paintEvent(QPaintEvent* event) override;
+
+private:
+    void showWords();
+    QRect getRoom() const;
+    TextLines getLines() const;
+    void nameSoon() const;
+
+    QString _words;
+    bool _isTitle = false;
 };
 
 } // namespace Kv

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "loop/qtGuard.h"
+#include "ntPeer.h"
 
 #include <atomic>
 #include <memory>
@@ -32,6 +33,15 @@ public:
 
 private:
     std::shared_ptr<std::atomic<Listener*>> _listener;
+};
+
+/// A peer that has nothing to tell needs no way.
+template <> class QtListenerHandle<NtNoListener>
+{
+public:
+    explicit QtListenerHandle(NtNoListener&) {}
+
+    void close() const {}
 };
 
 } // namespace Kv

@@ -1,11 +1,11 @@
-#include "peers/qtMenu.h"
-
-#include "peers/qtLabel.h"
+#include "ntMenu.h"
 #include "peers/qtLongText.h"
+#include "peers/qtPeer.h"
 #include "peers/qtText.h"
 #include "windows/qtFocusOrder.h"
 
 #include <QAbstractItemView>
+#include <QComboBox>
 #include <QScreen>
 #include <QScrollBar>
 #include <QStylePainter>
@@ -115,50 +115,47 @@ private:
     NtAlign _align = NtAlign::Left;
 };
 
+/// A combo box, with room in its popup for long entries.
+class Menu final : public QtPeerOf<NtMenu, ComboBox>
+{
+public:
+    Menu(QWidget* parent, std::string const& name, NtMenu::Listener& listener)
+        : QtPeerOf(parent, name, rowInset, listener)
+    {
+    }
+
+    void removeAll() override
+    {
+        if (ComboBox* const box = getNative())
+            box->clear();
+    }
+
+    void append(std::string const& entry) override
+    {
+        ComboBox* const box = getNative();
+        if (!box)
+            return;
+        // The first entry would select itself.
+        int const selected = box->currentIndex();
+        box->addItem(toQString(entry));
+        box->setCurrentIndex(selected);
+    }
+
+    void select(int index) override
+    {
+        if (ComboBox* const box = getNative())
+            box->setCurrentIndex(index);
+    }
+
+    void setAlign(NtAlign align) override
+    {
+        if (ComboBox* const box = getNative())
+            box->setAlign(align);
+    }
+};
+
+QtPeerKind<NtMenu, Menu> const registered;
+
 } // namespace
-
-QtMenu::QtMenu(QWidget* parent, std::string const& name, NtMenuListener& listener)
-    : QtMenu(parent, name, QtListenerHandle<NtMenuListener>(listener))
-{
-}
-
-QtMenu::QtMenu(QWidget* parent, std::string const& name, QtListenerHandle<NtMenuListener> const& handle)
-    : QtPeer(makeNative<ComboBox>(parent, handle), name, QtNative::rowInset), _handle(handle)
-{
-}
-
-QtMenu::~QtMenu()
-{
-    _handle.close();
-}
-
-void QtMenu::removeAll()
-{
-    if (QComboBox* const box = getNative())
-        box->clear();
-}
-
-void QtMenu::append(std::string const& entry)
-{
-    QComboBox* const box = getNative();
-    if (!box)
-        return;
-    // The first entry would select itself.
-    int const selected = box->currentIndex();
-    box->addItem(toQString(entry));
-    box->setCurrentIndex(selected);
-}
-
-void QtMenu::select(int index)
-{
-    if (QComboBox* const box = getNative())
-        box->setCurrentIndex(index);
-}
-
-void QtMenu::setAlign(NtAlign align)
-{
-    if (auto* const box = static_cast<ComboBox*>(getNative()))
-        box->setAlign(align);
-}
 
 } // namespace Kv

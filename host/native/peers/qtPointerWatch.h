@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ntPeers.h"
+#include "ntPeer.h"
 #include "peers/qtListenerHandle.h"
 
 #include <QObject>

@@ -1,10 +1,10 @@
-#include "peers/qtPushButton.h"
-
-#include "peers/qtLabel.h"
+#include "ntPushButton.h"
 #include "peers/qtLongText.h"
+#include "peers/qtPeer.h"
 #include "peers/qtText.h"
 
 #include <QKeyEvent>
+#include <QPushButton>
 #include <QStyleOptionButton>
 #include <QStylePainter>
 
@@ -28,8 +28,7 @@ public:
     void setWords(QString const& words)
     {
         _words = words;
-        // A lone ampersand would become the mark of a shortcut.
-        setText(QString(words).replace(QLatin1Char('&'), QLatin1String("&&")));
+        setText(withoutShortcuts(words));
     }
 
     void setAlign(NtAlign align)
@@ -90,34 +89,30 @@ private:
     NtAlign _align = NtAlign::Center;
 };
 
+/// A push button whose text breaks into lines.
+class PushButtonPeer final : public QtPeerOf<NtPushButton, PushButton>
+{
+public:
+    PushButtonPeer(QWidget* parent, std::string const& name, NtPushButton::Listener& listener)
+        : QtPeerOf(parent, name, rowInset, listener)
+    {
+    }
+
+    void setText(std::string const& text) override
+    {
+        if (PushButton* const button = getNative())
+            button->setWords(toQString(text));
+    }
+
+    void setAlign(NtAlign align) override
+    {
+        if (PushButton* const button = getNative())
+            button->setAlign(align);
+    }
+};
+
+QtPeerKind<NtPushButton, PushButtonPeer> const registered;
+
 } // namespace
-
-QtPushButton::QtPushButton(QWidget* parent, std::string const& name, NtPushButtonListener& listener)
-    : QtPushButton(parent, name, QtListenerHandle<NtPushButtonListener>(listener))
-{
-}
-
-QtPushButton::QtPushButton(QWidget* parent, std::string const& name,
-                           QtListenerHandle<NtPushButtonListener> const& handle)
-    : QtPeer(makeNative<PushButton>(parent, handle), name, QtNative::rowInset), _handle(handle)
-{
-}
-
-QtPushButton::~QtPushButton()
-{
-    _handle.close();
-}
-
-void QtPushButton::setText(std::string const& text)
-{
-    if (auto* const button = static_cast<PushButton*>(getNative()))
-        button->setWords(toQString(text));
-}
-
-void QtPushButton::setAlign(NtAlign align)
-{
-    if (auto* const button = static_cast<PushButton*>(getNative()))
-        button->setAlign(align);
-}
 
 } // namespace Kv

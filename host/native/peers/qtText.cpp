@@ -11,6 +11,16 @@ QString toQString(std::string const& text)
     return decoder(QByteArrayView(text));
 }
 
+QString withoutShortcuts(QString text)
+{
+    return text.replace(QLatin1Char('&'), QLatin1String("&&"));
+}
+
+Qt::Alignment toQtAlignment(NtAlign align)
+{
+    return Qt::AlignVCenter | (align == NtAlign::Center ? Qt::AlignHCenter : Qt::AlignLeft);
+}
+
 QString toShownPath(std::string const& path)
 {
     QString text = toQString(path);

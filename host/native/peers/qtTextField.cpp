@@ -1,10 +1,10 @@
-#include "peers/qtTextField.h"
-
-#include "peers/qtLabel.h"
+#include "ntTextField.h"
+#include "peers/qtPeer.h"
 #include "peers/qtText.h"
 #include "windows/qtFocusOrder.h"
 
 #include <QKeyEvent>
+#include <QLineEdit>
 #include <QMouseEvent>
 
 #include <limits>
@@ -64,38 +64,35 @@ private:
     QtListenerHandle<NtTextFieldListener> _handle;
 };
 
+/// A line edit.
+class TextField final : public QtPeerOf<NtTextField, LineEdit>
+{
+public:
+    TextField(QWidget* parent, std::string const& name, NtTextField::Listener& listener)
+        : QtPeerOf(parent, name, rowInset, listener)
+    {
+    }
+
+    void setText(std::string const& text, bool cursorAtEnd) override
+    {
+        LineEdit* const field = getNative();
+        QString const newText = toQString(text);
+        // The same text again would lose the user's selection and undo steps.
+        if (!field || field->text() == newText)
+            return;
+        field->setText(newText);
+        field->setCursorPosition(cursorAtEnd ? static_cast<int>(newText.size()) : 0);
+    }
+
+    void setAlign(NtAlign align) override
+    {
+        if (LineEdit* const field = getNative())
+            field->setAlignment(toQtAlignment(align));
+    }
+};
+
+QtPeerKind<NtTextField, TextField> const registered;
+
 } // namespace
-
-QtTextField::QtTextField(QWidget* parent, std::string const& name, NtTextFieldListener& listener)
-    : QtTextField(parent, name, QtListenerHandle<NtTextFieldListener>(listener))
-{
-}
-
-QtTextField::QtTextField(QWidget* parent, std::string const& name, QtListenerHandle<NtTextFieldListener> const& handle)
-    : QtPeer(makeNative<LineEdit>(parent, handle), name, QtNative::rowInset), _handle(handle)
-{
-}
-
-QtTextField::~QtTextField()
-{
-    _handle.close();
-}
-
-void QtTextField::setText(std::string const& text, bool cursorAtEnd)
-{
-    QLineEdit* const field = getNative();
-    QString const newText = toQString(text);
-    // The same text again would lose the user's selection and undo steps.
-    if (!field || field->text() == newText)
-        return;
-    field->setText(newText);
-    field->setCursorPosition(cursorAtEnd ? static_cast<int>(newText.size()) : 0);
-}
-
-void QtTextField::setAlign(NtAlign align)
-{
-    if (QLineEdit* const field = getNative())
-        field->setAlignment(toQtAlignment(align));
-}
 
 } // namespace Kv

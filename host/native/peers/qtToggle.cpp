@@ -1,6 +1,8 @@
-#include "peers/qtToggle.h"
-
+#include "ntToggle.h"
+#include "peers/qtPeer.h"
 #include "windows/qtFocusOrder.h"
+
+#include <QCheckBox>
 
 namespace Kv
 {
@@ -31,27 +33,23 @@ private:
     QtListenerHandle<NtToggleListener> _handle;
 };
 
+/// A check box without a text of its own; the whole cell takes the click.
+class Toggle final : public QtPeerOf<NtToggle, CheckBox>
+{
+public:
+    Toggle(QWidget* parent, std::string const& name, NtToggle::Listener& listener) : QtPeerOf(parent, name, 0, listener)
+    {
+    }
+
+    void setState(bool state) override
+    {
+        if (CheckBox* const box = getNative())
+            box->setChecked(state);
+    }
+};
+
+QtPeerKind<NtToggle, Toggle> const registered;
+
 } // namespace
-
-QtToggle::QtToggle(QWidget* parent, std::string const& name, NtToggleListener& listener)
-    : QtToggle(parent, name, QtListenerHandle<NtToggleListener>(listener))
-{
-}
-
-QtToggle::QtToggle(QWidget* parent, std::string const& name, QtListenerHandle<NtToggleListener> const& handle)
-    : QtPeer(makeNative<CheckBox>(parent, handle), name, 0), _handle(handle)
-{
-}
-
-QtToggle::~QtToggle()
-{
-    _handle.close();
-}
-
-void QtToggle::setState(bool state)
-{
-    if (QCheckBox* const box = getNative())
-        box->setChecked(state);
-}
 
 } // namespace Kv

@@ -1,21 +1,13 @@
 #include "start/qtPlatform.h"
 
-#include "browser/qtBrowser.h"
 #include "loop/qtGuard.h"
 #include "loop/qtLoop.h"
-#include "peers/qtContainer.h"
-#include "peers/qtLabel.h"
-#include "peers/qtMenu.h"
-#include "peers/qtPushButton.h"
+#include "peers/qtPeer.h"
 #include "peers/qtText.h"
-#include "peers/qtTextField.h"
-#include "peers/qtToggle.h"
 #include "start/qtTextEstimate.h"
 #include "windows/qtAdoptedContainer.h"
-#include "windows/qtFloat.h"
 #include "windows/qtMainWindow.h"
 #include "windows/qtWindow.h"
-#include "windows/qtWindowWidget.h"
 
 #include <QApplication>
 #include <QClipboard>
@@ -49,11 +41,6 @@ QObject* findObject(QObject* root, void const* address)
     return nullptr;
 }
 
-QWidget* nativeOf(NtContainer& container)
-{
-    return dynamic_cast<QtHolder&>(container).getContent();
-}
-
 /// The widest line as it is drawn, with what its first and last glyph let stick out.
 double measureIn(QFont const& font, QString const& text)
 {
@@ -64,7 +51,7 @@ double measureIn(QFont const& font, QString const& text)
         QRectF const ink = metrics.tightBoundingRect(line);
         width = std::max({width, metrics.horizontalAdvance(line), ink.right()});
     }
-    // The toolkit's own size hints come from the metrics in whole pixels.
+    // Qt's own size hints come from the metrics in whole pixels.
     return std::max<double>(width, QFontMetrics(font).size(0, text).width());
 }
 
@@ -161,49 +148,10 @@ std::unique_ptr<NtContainer> QtPlatform::adoptContainer(NtForeignWidget widget, 
     return std::make_unique<QtAdoptedContainer>(widget, listener);
 }
 
-std::unique_ptr<NtContainer> QtPlatform::createContainer(NtContainer& parent, std::string const& name)
+std::unique_ptr<NtPeer> QtPlatform::createPeer(std::type_index face, NtContainer& parent, std::string const& name,
+                                               void* listener)
 {
-    return std::make_unique<QtContainer>(nativeOf(parent), name);
-}
-
-std::unique_ptr<NtFloat> QtPlatform::createFloat(NtContainer& parent, std::string const& name,
-                                                 NtFloatListener& listener)
-{
-    return std::make_unique<QtFloat>(nativeOf(parent), name, listener);
-}
-
-std::unique_ptr<NtLabel> QtPlatform::createLabel(NtContainer& parent, std::string const& name)
-{
-    return std::make_unique<QtLabel>(nativeOf(parent), name);
-}
-
-std::unique_ptr<NtTextField> QtPlatform::createTextField(NtContainer& parent, std::string const& name,
-                                                         NtTextFieldListener& listener)
-{
-    return std::make_unique<QtTextField>(nativeOf(parent), name, listener);
-}
-
-std::unique_ptr<NtToggle> QtPlatform::createToggle(NtContainer& parent, std::string const& name,
-                                                   NtToggleListener& listener)
-{
-    return std::make_unique<QtToggle>(nativeOf(parent), name, listener);
-}
-
-std::unique_ptr<NtMenu> QtPlatform::createMenu(NtContainer& parent, std::string const& name, NtMenuListener& listener)
-{
-    return std::make_unique<QtMenu>(nativeOf(parent), name, listener);
-}
-
-std::unique_ptr<NtPushButton> QtPlatform::createPushButton(NtContainer& parent, std::string const& name,
-                                                           NtPushButtonListener& listener)
-{
-    return std::make_unique<QtPushButton>(nativeOf(parent), name, listener);
-}
-
-std::unique_ptr<NtBrowser> QtPlatform::createBrowser(NtContainer& parent, std::string const& name,
-                                                     NtBrowserListener& listener)
-{
-    return std::make_unique<QtBrowser>(nativeOf(parent), name, listener);
+    return QtPeerKinds::make(face, dynamic_cast<QtPeer&>(parent).getContent(), name, listener);
 }
 
 void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)

@@ -12,7 +12,7 @@
 namespace Kv
 {
 
-/// The window system by way of the toolkit.
+/// The window system by way of Qt.
 class QtPlatform final : public NtPlatform
 {
 public:
@@ -27,19 +27,6 @@ public:
     std::unique_ptr<NtMainWindow> adoptWindow(NtForeignWidget window, std::function<void(bool)> enableOwn,
                                               NtWindowListener& listener) override;
     std::unique_ptr<NtContainer> adoptContainer(NtForeignWidget widget, NtPlaceListener& listener) override;
-    std::unique_ptr<NtContainer> createContainer(NtContainer& parent, std::string const& name) override;
-    std::unique_ptr<NtFloat> createFloat(NtContainer& parent, std::string const& name,
-                                         NtFloatListener& listener) override;
-    std::unique_ptr<NtLabel> createLabel(NtContainer& parent, std::string const& name) override;
-    std::unique_ptr<NtTextField> createTextField(NtContainer& parent, std::string const& name,
-                                                 NtTextFieldListener& listener) override;
-    std::unique_ptr<NtToggle> createToggle(NtContainer& parent, std::string const& name,
-                                           NtToggleListener& listener) override;
-    std::unique_ptr<NtMenu> createMenu(NtContainer& parent, std::string const& name, NtMenuListener& listener) override;
-    std::unique_ptr<NtPushButton> createPushButton(NtContainer& parent, std::string const& name,
-                                                   NtPushButtonListener& listener) override;
-    std::unique_ptr<NtBrowser> createBrowser(NtContainer& parent, std::string const& name,
-                                             NtBrowserListener& listener) override;
 
     void runLoop(bool const volatile* until, bool volatile* end) override;
     void endLoop() override;
@@ -49,6 +36,8 @@ public:
     bool observe(void const* object, std::function<void()> onGone) override;
 
 private:
+    std::unique_ptr<NtPeer> createPeer(std::type_index face, NtContainer& parent, std::string const& name,
+                                       void* listener) override;
     [[noreturn]] void refuseLoop();
 
     QtApplication _application;

@@ -1,7 +1,6 @@
 #pragma once
 
-#include "peers/qtHolder.h"
-#include "peers/qtListenerHandle.h"
+#include "ntContainer.h"
 #include "peers/qtPeer.h"
 
 #include <memory>
@@ -12,7 +11,7 @@ namespace Kv
 class QtPlaceWatch;
 
 /// Widget of the application's that holds peers' widgets beside its own, and says where the application has it.
-class QtAdoptedContainer final : public QtPeer<NtContainer, QWidget>, public QtHolder
+class QtAdoptedContainer final : public NtContainer, public QtPeer
 {
 public:
     /// A container whose place nobody asks for.
@@ -23,7 +22,6 @@ public:
     ~QtAdoptedContainer() override;
 
     void focusFirst() override { focusFirstInContent(); }
-    QWidget* getContent() const override { return getNative(); }
 
 private:
     std::unique_ptr<QtPlaceWatch> _placeWatch;

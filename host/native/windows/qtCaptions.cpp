@@ -1,6 +1,6 @@
 #include "windows/qtCaptions.h"
 
-#include "peers/qtLabelWidget.h"
+#include "peers/qtLabel.h"
 #include "windows/qtFocusOrder.h"
 
 #include <algorithm>
@@ -15,9 +15,9 @@ namespace
 
 using Row = QtFocusOrder::Row;
 
-QtLabelWidget* toLabel(QWidget& widget)
+QtLabel* toLabel(QWidget& widget)
 {
-    return dynamic_cast<QtLabelWidget*>(&widget);
+    return dynamic_cast<QtLabel*>(&widget);
 }
 
 /// Where a label of the row is displayed, those that are not say nothing.
@@ -34,14 +34,14 @@ template <typename Say> void matchRow(Row const& row, Say const& say)
     auto const labelAt = [&row](std::size_t place) { return place < row.size() ? toLabel(*row[place]) : nullptr; };
     auto const isValueAt = [&row](std::size_t place)
     { return place < row.size() && QtFocusOrder::holdsValue(*row[place]); };
-    QtLabelWidget* left = nullptr;
+    QtLabel* left = nullptr;
     for (std::size_t place = 0; place < row.size(); ++place)
     {
-        if (QtLabelWidget* const label = labelAt(place))
+        if (QtLabel* const label = labelAt(place))
             left = label;
         if (!isValueAt(place))
             continue;
-        QtLabelWidget* const right = labelAt(place + 1);
+        QtLabel* const right = labelAt(place + 1);
         bool const isBeside = place > 0 && labelAt(place - 1) && labelAt(place - 1) == left;
         if (right && !isBeside && (!left || !isValueAt(place + 2)))
         {
@@ -58,11 +58,11 @@ template <typename Say> void matchRow(Row const& row, Say const& say)
 
 void nameValuesIn(QWidget const& root)
 {
-    std::unordered_map<QtLabelWidget*, QWidget*> named;
+    std::unordered_map<QtLabel*, QWidget*> named;
     std::vector<QWidget*> widgets;
     for (QWidget* const widget : root.findChildren<QWidget*>())
     {
-        QtLabelWidget* const label = toLabel(*widget);
+        QtLabel* const label = toLabel(*widget);
         if (label)
             named.emplace(label, nullptr);
         if (label ? !label->getWords().isEmpty() : QtFocusOrder::holdsValue(*widget))
@@ -72,7 +72,7 @@ void nameValuesIn(QWidget const& root)
     {
         dropHiddenLabels(row);
         matchRow(row,
-                 [&named](QtLabelWidget& label, QWidget& value)
+                 [&named](QtLabel& label, QWidget& value)
                  {
                      value.setAccessibleName(label.getWords());
                      QWidget*& first = named[&label];

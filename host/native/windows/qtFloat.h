@@ -1,31 +1,53 @@
 #pragma once
 
-#include "peers/qtHolder.h"
-#include "peers/qtPeer.h"
-#include "windows/qtFloatWidget.h"
+#include "ntContainer.h"
+#include "peers/qtListenerHandle.h"
+#include "windows/qtContentArea.h"
+#include "windows/qtStage.h"
+
+#include <QPointer>
+#include <QWidget>
 
 namespace Kv
 {
 
-/// Floating container.
-class QtFloat final : public QtPeer<NtFloat, QtFloatWidget>, public QtHolder
+/// A floating container on the screen: has a ground and an edge of its own, walks the keyboard through the widgets in
+/// it, remembers which of them had it, and passes on Escape.
+class QtFloat final : public QWidget, public QtStage
 {
 public:
-    /// `parent`, which owns the widget natively, can be null. The listener is borrowed.
-    QtFloat(QWidget* parent, std::string const& name, NtFloatListener& listener);
+    QtFloat(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle);
     ~QtFloat() override;
 
-    void raise() override;
-    void focusFirst() override { focusFirstInContent(); }
-    void resumeKeyboard() override;
-    void setContentSize(int width, int height) override;
-    int getBarThickness() const override;
-    QWidget* getContent() const override;
+    /// The innermost one that holds the widget, or is it; null if there is none.
+    static QtFloat* findAround(QWidget& widget);
+
+    /// Where the widgets in it stand; scrolled where it is larger.
+    QWidget* getContent() const { return _area ? _area->widget() : nullptr; }
+    void setContentSize(int width, int height);
+
+    /// Keeps a widget of the content in place when that scrolls. A text in it becomes a title.
+    void pin(QWidget& widget);
+
+    /// Asks to be moved so that a widget in it is seen.
+    void askIntoView(QWidget const& widget) const;
+
+    /// Gives the keyboard to the widget in it that had it last, else to the one that has it first.
+    void resumeKeyboard();
+
+protected:
+    void showEvent(QShowEvent* event) override;
+    void hideEvent(QHideEvent* event) override;
+    void moveEvent(QMoveEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    bool focusNextPrevChild(bool next) override;
 
 private:
-    QtFloat(QWidget* parent, std::string const& name, QtListenerHandle<NtFloatListener> const& handle);
-
     QtListenerHandle<NtFloatListener> _handle;
+    /// Natively children, which others can delete.
+    QPointer<QtContentArea> _area;
+    QPointer<QWidget> _edge;
 };
 
 } // namespace Kv

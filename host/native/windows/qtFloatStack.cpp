@@ -1,6 +1,6 @@
 #include "windows/qtFloatStack.h"
 
-#include "windows/qtFloatWidget.h"
+#include "windows/qtFloat.h"
 #include "windows/qtFocusOrder.h"
 
 #include <QRegion>
@@ -22,9 +22,9 @@ QRect getVisibleRect(QWidget const& floating)
 }
 
 /// Null for what is no float, or gone.
-QtFloatWidget* toFloat(QWidget* widget)
+QtFloat* toFloat(QWidget* widget)
 {
-    return dynamic_cast<QtFloatWidget*>(widget);
+    return dynamic_cast<QtFloat*>(widget);
 }
 
 } // namespace
@@ -36,7 +36,7 @@ QtFloatStack& QtFloatStack::getInstance()
     return *stack;
 }
 
-void QtFloatStack::bringToFront(QtFloatWidget& floating)
+void QtFloatStack::bringToFront(QtFloat& floating)
 {
     floating.raise();
     forget(floating);
@@ -44,7 +44,7 @@ void QtFloatStack::bringToFront(QtFloatWidget& floating)
     cutHoles();
 }
 
-void QtFloatStack::remove(QtFloatWidget& floating)
+void QtFloatStack::remove(QtFloat& floating)
 {
     forget(floating);
     cutHoles();
@@ -65,13 +65,13 @@ void QtFloatStack::cutHoles() const
 {
     for (auto lower = _places.begin(); lower != _places.end(); ++lower)
     {
-        QtFloatWidget* const floating = toFloat(*lower);
+        QtFloat* const floating = toFloat(*lower);
         QWidget const* const window = floating ? floating->parentWidget() : nullptr;
         if (!window || !window->isWindow())
             continue;
         QRegion hole;
         for (auto place = lower + 1; place != _places.end(); ++place)
-            if (QtFloatWidget const* const upper = toFloat(*place);
+            if (QtFloat const* const upper = toFloat(*place);
                 upper && upper->isVisible() && upper->window() == window && upper->parentWidget() != window)
                 hole += getVisibleRect(*upper);
         cutHole(*floating, hole);
@@ -82,7 +82,7 @@ bool QtFloatStack::giveKeyboard(QWidget* place)
 {
     if (!place || !QtFocusOrder::canHold(*place))
         return false;
-    if (QtFloatWidget* const floating = toFloat(place))
+    if (QtFloat* const floating = toFloat(place))
         floating->resumeKeyboard();
     else
         place->setFocus(Qt::OtherFocusReason);

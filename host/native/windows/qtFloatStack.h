@@ -8,7 +8,7 @@
 namespace Kv
 {
 
-class QtFloatWidget;
+class QtFloat;
 
 /// The floats of the process in the order in which they came to the front, and among them what else had the keyboard.
 ///
@@ -19,8 +19,8 @@ class QtFloatStack
 public:
     static QtFloatStack& getInstance();
 
-    void bringToFront(QtFloatWidget& floating);
-    void remove(QtFloatWidget& floating);
+    void bringToFront(QtFloat& floating);
+    void remove(QtFloat& floating);
 
     /// A widget of the window's own, in no float, has got the keyboard: it stands before all floats for now.
     void rememberOwn(QWidget& holder);

@@ -1,6 +1,6 @@
 #include "windows/qtFocusOrder.h"
 
-#include "windows/qtFloatWidget.h"
+#include "windows/qtFloat.h"
 
 #include <QLineEdit>
 #include <QPushButton>
@@ -135,7 +135,7 @@ void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
     for (QWidget* parent = widget.parentWidget(); parent; parent = parent->parentWidget())
         if (auto* const area = qobject_cast<QScrollArea*>(parent))
             reveal(*area, widget);
-    if (QtFloatWidget const* const floating = QtFloatWidget::findAround(widget))
+    if (QtFloat const* const floating = QtFloat::findAround(widget))
         floating->askIntoView(widget);
 }
 

@@ -2,8 +2,8 @@
 
 #include "loop/qtGuard.h"
 #include "loop/qtInputDrop.h"
+#include "windows/qtFloat.h"
 #include "windows/qtFloatStack.h"
-#include "windows/qtFloatWidget.h"
 
 #include <QApplication>
 #include <QEvent>
@@ -97,7 +97,7 @@ void QtMainWindow::onFocusChanged(QWidget* to)
         // Later: Qt is in the middle of taking it from what is disabled.
         QMetaObject::invokeMethod(
             this, [this] { replaceLostHolder(); }, Qt::QueuedConnection);
-    else if (to != native && to->window() == native && !QtFloatWidget::findAround(*to))
+    else if (to != native && to->window() == native && !QtFloat::findAround(*to))
         QtFloatStack::getInstance().rememberOwn(*to);
 }
 
@@ -114,7 +114,7 @@ QWidget* QtMainWindow::findHolder() const
     QWidget* const holder = native ? native->focusWidget() : nullptr;
     if (!holder || holder == native)
         return nullptr;
-    QtFloatWidget* const floating = QtFloatWidget::findAround(*holder);
+    QtFloat* const floating = QtFloat::findAround(*holder);
     return floating ? floating : holder;
 }
 

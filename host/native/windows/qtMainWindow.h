@@ -1,5 +1,6 @@
 #pragma once
 
+#include "ntWindow.h"
 #include "peers/qtListenerHandle.h"
 #include "windows/qtAdoptedContainer.h"
 

@@ -3,12 +3,17 @@
 #include "loop/qtGuard.h"
 #include "loop/qtInputDrop.h"
 #include "peers/qtText.h"
+#include "windows/qtFocusOrder.h"
 #include "windows/qtWindowIcon.h"
-#include "windows/qtWindowWidget.h"
 
 #include <QApplication>
+#include <QCloseEvent>
+#include <QKeyEvent>
 #include <QThread>
+#include <QTimer>
 #include <QWindow>
+
+#include <algorithm>
 
 namespace Kv
 {
@@ -39,15 +44,150 @@ void goWithApplication()
     qAddPostRoutine(&QtWindow::destroyLeft);
 }
 
+/// False where windows never cover each other, and Qt complains when they are asked to.
+bool hasStack()
+{
+    QString const name = QGuiApplication::platformName();
+    return name != QLatin1String("offscreen") && name != QLatin1String("minimal");
+}
+
 } // namespace
+
+QtWindowWidget::QtWindowWidget(QtListenerHandle<NtWindowListener> const& handle)
+    : QWidget(nullptr, Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint), _handle(handle),
+      _area(new QtContentArea(this, [handle](int width, int height)
+                              { handle.tell(&NtWindowListener::onResized, width, height); }))
+{
+    setAttribute(Qt::WA_QuitOnClose, false);
+}
+
+std::vector<QPointer<QtWindowWidget>> QtWindowWidget::findAll()
+{
+    std::vector<QPointer<QtWindowWidget>> windows;
+    for (QWidget* const widget : QApplication::topLevelWidgets())
+        if (auto* const window = dynamic_cast<QtWindowWidget*>(widget))
+            windows.emplace_back(window);
+    return windows;
+}
+
+void QtWindowWidget::showModal()
+{
+    _awaited = true;
+    // A visible window keeps its modality, and its place below those that were shown after it.
+    if (QApplication::activeModalWidget() != this)
+        hide();
+    setWindowModality(Qt::ApplicationModal);
+    show();
+    if (hasStack())
+        raise();
+    else
+        QApplication::setActiveWindow(this);
+    activateWindow();
+}
+
+void QtWindowWidget::stopWaiting()
+{
+    _awaited = false;
+    QTimer::singleShot(0, this, [this] { letOthersIn(); });
+}
+
+void QtWindowWidget::letOthersIn()
+{
+    if (_awaited || !isVisible())
+        return;
+    hide();
+    setWindowModality(Qt::NonModal);
+    setAttribute(Qt::WA_ShowWithoutActivating);
+    show();
+    setAttribute(Qt::WA_ShowWithoutActivating, false);
+    if (QWidget* const modal = QApplication::activeModalWidget())
+        modal->activateWindow();
+}
+
+void QtWindowWidget::setContentSize(int width, int height)
+{
+    if (_area)
+        _area->setContentSize(width, height);
+}
+
+void QtWindowWidget::showEvent(QShowEvent* event)
+{
+    QWidget::showEvent(event);
+    if (!event->spontaneous() && isModal())
+        blockOthers();
+    // Not on the screen yet, but with its final size: the first picture is laid out.
+    if (_area)
+        _area->tellRoom();
+}
+
+void QtWindowWidget::hideEvent(QHideEvent* event)
+{
+    QWidget::hideEvent(event);
+    // The window manager's minimizing is no end.
+    if (event->spontaneous())
+        return;
+    _blocked.clear();
+    if (_area)
+        _area->forgetRoom();
+}
+
+void QtWindowWidget::resizeEvent(QResizeEvent* event)
+{
+    QWidget::resizeEvent(event);
+    if (_area)
+        _area->setGeometry(rect());
+}
+
+void QtWindowWidget::closeEvent(QCloseEvent* event)
+{
+    event->ignore();
+    _handle.tell(&NtWindowListener::onCloseRequested);
+}
+
+void QtWindowWidget::keyPressEvent(QKeyEvent* event)
+{
+    if (event->key() != Qt::Key_Escape)
+    {
+        QWidget::keyPressEvent(event);
+        return;
+    }
+    event->accept();
+    if (!event->isAutoRepeat())
+        _handle.tell(&NtWindowListener::onEscape);
+}
+
+bool QtWindowWidget::focusNextPrevChild(bool next)
+{
+    return QtFocusOrder(*this).step(next);
+}
+
+void QtWindowWidget::unblock(QWidget const& window)
+{
+    auto const isOf = [&window](std::unique_ptr<QtInputDrop> const& drop) { return drop->isFor(window); };
+    _blocked.erase(std::remove_if(_blocked.begin(), _blocked.end(), isOf), _blocked.end());
+}
+
+void QtWindowWidget::blockOthers()
+{
+    // Qt's modality stops only what comes from the window system; events can also be sent to a widget.
+    _blocked.clear();
+    for (QPointer<QtWindowWidget> const& window : findAll())
+        if (window != this && window->isVisible())
+        {
+            window->unblock(*this);
+            _blocked.push_back(std::make_unique<QtInputDrop>(*window));
+        }
+}
 
 QtWindow::QtWindow(std::string const& name, std::string const& title, std::string const& contentName,
                    QRect const& frame, QtWindow const* owner, NtWindowListener& listener)
-    : _handle(listener), _native(new QtWindowWidget(_handle), name, 0), _owner(owner ? owner->_native.get() : nullptr),
-      _content(std::make_unique<QtContainer>(getNative(), contentName))
+    : _handle(listener), _widget(new QtWindowWidget(_handle)), _owner(owner ? owner->getNative() : nullptr)
 {
     goWithApplication();
     QtWindowWidget* const native = getNative();
+    native->setObjectName(toQString(name));
+    NtNoListener nobody;
+    _content = std::make_unique<QtContainer>(native, contentName, nobody);
     // No screen shows more, and a window system can end the process for it.
     constexpr int maxTitle = 4096;
     // Doubled, what marks a changed document for Qt stands for itself.
@@ -62,9 +202,11 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, std::strin
 QtWindow::~QtWindow()
 {
     _handle.close();
-    // Hidden first, as by its owner: another window gets the keyboard. Another thread leaves that to the toolkit.
-    if (QWidget const* const native = _native.get(); native && native->thread() == QThread::currentThread())
+    // Hidden first, as by its owner: another window gets the keyboard. Another thread leaves that to Qt.
+    if (QWidget const* const native = getNative(); native && native->thread() == QThread::currentThread())
         hide();
+    _content.reset();
+    QtGuard::getInstance().destroy(_widget);
 }
 
 void QtWindow::destroyLeft()
@@ -94,7 +236,7 @@ void QtWindow::show()
 void QtWindow::hide()
 {
     QtErrorAside const aside;
-    QWidget* const native = _native.get();
+    QWidget* const native = getNative();
     if (!native || native->isHidden())
         return;
     closePopups(*native);
@@ -106,13 +248,13 @@ void QtWindow::hide()
 
 void QtWindow::redraw()
 {
-    if (QWidget* const native = _native.get())
+    if (QWidget* const native = getNative())
         native->repaint();
 }
 
 void QtWindow::flushInput()
 {
-    QWidget* const native = _native.get();
+    QWidget* const native = getNative();
     if (!native)
         return;
     QtInputDrop const drop(*native);
@@ -121,7 +263,7 @@ void QtWindow::flushInput()
 
 QtWindowWidget* QtWindow::getNative() const
 {
-    return static_cast<QtWindowWidget*>(_native.get());
+    return QCoreApplication::instance() ? _widget.data() : nullptr;
 }
 
 } // namespace Kv

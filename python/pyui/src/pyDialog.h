@@ -5,13 +5,13 @@
 
 #include "iterators/iterator.h"
 #include "kvExport.h"
+#include "piWidget.h"
 #include "pointers/rcShdPtr.h"
 #include "pointers/rcStrongPtr.h"
 #include "pyCallables.h"
 #include "pyWidgetCbs.h"
 #include "uiAppMgr.h"
 #include "uiContainer.h"
-#include "uiEventCallback.h"
 #include "uiTopLevel.h"
 
 #include <string>

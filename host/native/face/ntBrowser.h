@@ -1,0 +1,49 @@
+#pragma once
+
+#include "ntPeer.h"
+
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace Kv
+{
+
+/// Hears of the user of a browser. Names and paths are bytes of the file system.
+class NtBrowserListener
+{
+public:
+    virtual ~NtBrowserListener() = default;
+    /// The user went to another directory, or the one that was shown is gone. Nothing is selected in it yet.
+    virtual void onDirectoryChanged(std::string const& directory) = 0;
+    /// Of the entries of the directory, `focus` has the keyboard and `selected`, as they stand on the screen, are
+    /// selected; `focus` is one of them, or empty. Of a sequence it is the first file.
+    virtual void onSelectionChanged(std::string const& focus, std::vector<std::string> const& selected) = 0;
+    /// The user pressed Enter on a file or clicked it twice; it is in focus.
+    virtual void onActivated() = 0;
+};
+
+/// Shows a directory, and lets the user go from one to another.
+class NtBrowser : public virtual NtPeer
+{
+public:
+    using Listener = NtBrowserListener;
+
+    /// Shows `directory`, an absolute path, with those of `selected` that are in it, and `focus`, selected.
+    virtual void goTo(std::string const& directory, std::string const& focus,
+                      std::vector<std::string> const& selected) = 0;
+
+    /// Which files may become part of a numbered sequence, by their names. Called for each file.
+    virtual void setCollapsing(std::function<bool(std::string const&)> collapses) = 0;
+
+    /// Whether more than one entry can be selected.
+    virtual void setMultiple(bool multiple) = 0;
+
+    /// Goes where the user has typed without pressing Enter, as Enter would, and the listener hears of it; gives an
+    /// empty path. With `takesNew`, where nothing is there but its directory, stays and gives the typed path. Nothing
+    /// in all other cases, which the user is told.
+    virtual std::optional<std::string> takeTypedPath(bool takesNew) = 0;
+};
+
+} // namespace Kv

@@ -1,0 +1,211 @@
+#include "peers/qtPeer.h"
+
+#include "loop/qtGuard.h"
+#include "peers/qtLongText.h"
+#include "peers/qtPointerWatch.h"
+#include "peers/qtText.h"
+#include "windows/qtFloat.h"
+#include "windows/qtFocusOrder.h"
+
+#include <QCoreApplication>
+#include <QEvent>
+#include <QFrame>
+
+#include <algorithm>
+#include <stdexcept>
+#include <unordered_map>
+#include <utility>
+
+namespace Kv
+{
+
+namespace
+{
+
+/// Line along the bottom edge of the widget that it stands in, which owns it.
+class BottomLine final : public QFrame
+{
+public:
+    explicit BottomLine(QWidget* parent) : QFrame(parent)
+    {
+        setFrameStyle(QFrame::HLine | QFrame::Plain);
+        setAttribute(Qt::WA_TransparentForMouseEvents);
+        parent->installEventFilter(this);
+        follow();
+        show();
+    }
+
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override
+    {
+        if (event->type() == QEvent::Resize)
+            follow();
+        return QFrame::eventFilter(watched, event);
+    }
+
+private:
+    void follow()
+    {
+        constexpr int thickness = 1;
+        setGeometry(0, parentWidget()->height() - thickness, parentWidget()->width(), thickness);
+    }
+};
+
+QColor getReadableOn(QColor const& ground)
+{
+    // Weighed as the eye sees them; the middle between black and white text lies well below the middle of the greys.
+    double const light = 0.2126 * ground.redF() + 0.7152 * ground.greenF() + 0.0722 * ground.blueF();
+    return light > 0.46 ? Qt::black : Qt::white;
+}
+
+std::unordered_map<std::type_index, QtPeerKinds::Make>& getKinds()
+{
+    static std::unordered_map<std::type_index, QtPeerKinds::Make> kinds;
+    return kinds;
+}
+
+} // namespace
+
+QtPeer::QtPeer(QWidget* widget, std::string const& name, int inset) : _widget(widget), _inset(inset)
+{
+    if (!_widget)
+        return;
+    _widget->setObjectName(toQString(name));
+    if (_widget->isWindow())
+        return;
+    _widget->setGeometry(0, 0, 0, 0);
+    _widget->show();
+}
+
+QtPeer::QtPeer(NtForeignWidget widget) : _widget(static_cast<QWidget*>(widget.widget)), _foreign(true) {}
+
+QtPeer::~QtPeer()
+{
+    if (!_foreign)
+        QtGuard::getInstance().destroy(_widget);
+}
+
+QWidget* QtPeer::getNative() const
+{
+    return QCoreApplication::instance() ? _widget.data() : nullptr;
+}
+
+void QtPeer::setCell(int x, int y, int width, int height)
+{
+    QWidget* const widget = getNative();
+    if (!widget || _foreign)
+        return;
+    int const inset = widget->sizeHint().height() > height - 2 * _inset ? 0 : _inset;
+    widget->setGeometry(x, y + inset, std::max(width, 0), std::max(height - 2 * inset, 0));
+}
+
+void QtPeer::setDisplayed(bool displayed)
+{
+    QtErrorAside const aside;
+    if (QWidget* const widget = getNative())
+        widget->setVisible(displayed);
+}
+
+void QtPeer::setEnabled(bool enabled)
+{
+    QtErrorAside const aside;
+    if (QWidget* const widget = getNative())
+        widget->setEnabled(enabled);
+}
+
+void QtPeer::setTooltip(std::string const& text)
+{
+    QWidget* const widget = getNative();
+    if (!widget)
+        return;
+    QString const tip = toQString(text);
+    widget->setToolTip(toTooltip(tip));
+    widget->setAccessibleDescription(tip);
+}
+
+void QtPeer::raise()
+{
+    if (QWidget* const widget = getNative())
+        widget->raise();
+}
+
+void QtPeer::setBackground(NtColor const& color)
+{
+    QWidget* const widget = getNative();
+    if (!widget)
+        return;
+    QColor const ground = QColor::fromRgbF(color.red, color.green, color.blue);
+    QPalette palette = widget->palette();
+    palette.setColor(widget->backgroundRole(), ground);
+    palette.setColor(widget->foregroundRole(), getReadableOn(ground));
+    widget->setPalette(palette);
+    widget->setAutoFillBackground(true);
+}
+
+void QtPeer::setLineBelow(bool drawn)
+{
+    QWidget* const widget = getNative();
+    if (!widget)
+        return;
+    if (drawn && !_line)
+        _line = new BottomLine(widget);
+    else if (!drawn)
+        QtGuard::getInstance().destroy(std::exchange(_line, nullptr));
+}
+
+void QtPeer::setPointerListener(NtPointerListener& listener)
+{
+    QWidget* const widget = getNative();
+    if (!widget)
+        return;
+    _pointerWatch = std::make_unique<QtPointerWatch>(*widget, listener);
+    QWidget* const around = widget->parentWidget();
+    if (QtFloat* const floating = around ? QtFloat::findAround(*around) : nullptr)
+        floating->pin(*widget);
+}
+
+void QtPeer::takeKeyboard()
+{
+    if (QWidget* const widget = getNative())
+        widget->setFocus(Qt::OtherFocusReason);
+}
+
+bool QtPeer::hasKeyboard() const
+{
+    QWidget const* const widget = getNative();
+    if (!widget)
+        return false;
+    QWidget const* const holder = widget->window()->focusWidget();
+    return holder && (holder == widget || widget->isAncestorOf(holder));
+}
+
+bool QtPeer::holdsValue() const
+{
+    QWidget const* const widget = getNative();
+    return widget && QtFocusOrder::holdsValue(*widget);
+}
+
+void QtPeer::focusFirstInContent() const
+{
+    QWidget const* const content = getContent();
+    if (!content)
+        return;
+    if (QWidget* const first = QtFocusOrder(*content).getFirst())
+        QtFocusOrder::give(*first, Qt::TabFocusReason);
+}
+
+void QtPeerKinds::add(std::type_index face, Make make)
+{
+    getKinds().emplace(face, make);
+}
+
+std::unique_ptr<NtPeer> QtPeerKinds::make(std::type_index face, QWidget* parent, std::string const& name,
+                                          void* listener)
+{
+    auto const found = getKinds().find(face);
+    if (found == getKinds().end())
+        throw std::logic_error(std::string("No native widget has the face ") + face.name());
+    return found->second(parent, name, listener);
+}
+
+} // namespace Kv
