@@ -4,7 +4,7 @@
 #include "pathQuestion.h"
 
 #include "exBase.h"
-#include "pointers/rcWeakAccessor.h"
+#include "pointers/rcWeakPtr.h"
 #include "uiAppMgr.h"
 #include "wsNative.h"
 

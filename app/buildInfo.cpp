@@ -1,6 +1,6 @@
 #include "buildInfo.h"
 
-#include "packages/inBuildInfoUtil.h"
+#include "packages/inBuildInfo.h"
 
 #include <iomanip>
 

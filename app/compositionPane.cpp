@@ -1,6 +1,6 @@
 #include "compositionPane.h"
 
-#include "piNode.h"
+#include "piGraph.h"
 
 #include <QHeaderView>
 #include <QLabel>

@@ -6,7 +6,7 @@
 #include "theme.h"
 
 #include "exBase.h"
-#include "packages/inBuildInfoUtil.h"
+#include "packages/inBuildInfo.h"
 #include "wsNative.h"
 
 #include <fcntl.h>

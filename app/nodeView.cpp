@@ -1,6 +1,6 @@
 #include "nodeView.h"
 
-#include "piNode.h"
+#include "piGraph.h"
 
 #include <QPainter>
 #include <QPainterPath>

@@ -1,7 +1,6 @@
 #include "pathQuestion.h"
 
 #include "piBrowserSchemes.h"
-#include "uiAppDisabler.h"
 #include "uiAppMgr.h"
 #include "uiApplication.h"
 

@@ -4,8 +4,7 @@
 #include "pointers/rcBase.h"
 #include "pointers/rcShdPtr.h"
 #include "prdPredicate.h"
-#include "snItem.h"
-#include "snItemConvert.h"
+#include "snSelection.h"
 #include "text/liString.h"
 
 namespace Kv

@@ -7,7 +7,7 @@
 #include "snSelection.h"
 #include "text/liString.h"
 #include "uiPeeredWidget.h"
-#include "uiView.h"
+#include "uiWorkspace.h"
 
 #include <string>
 #include <vector>

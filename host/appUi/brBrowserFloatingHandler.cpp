@@ -2,7 +2,7 @@
 
 #include "exBase.h"
 #include "piBrowserSchemes.h"
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 
 namespace Kv
 {

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "brBrowser.h"
-#include "iterators/vector.h"
+#include "iterator.h"
 #include "uiFloatingHandler.h"
 #include "uiPushButton.h"
 

@@ -65,4 +65,16 @@ void UiAppMgr::forgetHidden()
     _told.erase(std::remove_if(_told.begin(), _told.end(), isHidden), _told.end());
 }
 
+UiAppDisabler::UiAppDisabler() : _window(dynamicCast<UiMainWindow>(UiAppMgr::getInstance().getMainWindow()))
+{
+    if (_window)
+        _window->refuseInput();
+}
+
+UiAppDisabler::~UiAppDisabler()
+{
+    if (_window)
+        _window->admitInput();
+}
+
 } // namespace Kv

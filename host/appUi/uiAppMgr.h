@@ -4,7 +4,7 @@
 #include "pointers/rcShdPtr.h"
 #include "uiMainWindow.h"
 #include "uiPanel.h"
-#include "uiView.h"
+#include "uiWorkspace.h"
 
 #include <memory>
 #include <vector>
@@ -51,6 +51,21 @@ private:
 
     /// Told and not yet released, the latest last.
     std::vector<std::weak_ptr<UiTopLevel>> _told;
+};
+
+/// Keeps the application's own widgets from taking input for as long as it lives, while the floating containers that
+/// come to the front meanwhile stay usable. The last one to go leaves the application as it was. Without an application
+/// it does nothing.
+class KV_API UiAppDisabler
+{
+public:
+    UiAppDisabler();
+    UiAppDisabler(UiAppDisabler const&) = delete;
+    UiAppDisabler& operator=(UiAppDisabler const&) = delete;
+    ~UiAppDisabler();
+
+private:
+    RCShdPtr<UiMainWindow> _window;
 };
 
 } // namespace Kv

@@ -2,8 +2,8 @@
 
 #include "brBrowser.h"
 #include "fwComposition.h"
-#include "pointers/rcWeakAccessor.h"
-#include "text/liStringUtil.h"
+#include "pointers/rcWeakPtr.h"
+#include "text/liString.h"
 #include "uiContainer.h"
 
 #include <algorithm>
@@ -23,6 +23,8 @@ template <typename Controller> RCStrongPtr<FwComposition const> findApart(std::s
 }
 
 } // namespace
+
+UiCompositionWorkspaceClientInterface::~UiCompositionWorkspaceClientInterface() = default;
 
 UiCompositionWorkspace::UiCompositionWorkspace(FocusFinder findFocus) : _findFocus(std::move(findFocus)) {}
 

@@ -1,7 +1,7 @@
 #include "uiFloatingHandler.h"
 
-#include "uiColorRegistry.h"
 #include "uiLabel.h"
+#include "uiLook.h"
 
 #include <algorithm>
 

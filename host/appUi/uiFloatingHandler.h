@@ -1,6 +1,6 @@
 #pragma once
 
-#include "geVector2.h"
+#include "geometry.h"
 #include "kvExport.h"
 #include "piWidget.h"
 #include "pointers/rcShdPtr.h"

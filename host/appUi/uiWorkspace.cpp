@@ -16,6 +16,8 @@ RCShdPtr<UiWorkspace>& getCurrent()
 
 } // namespace
 
+UiView::~UiView() = default;
+
 UiWorkspace::~UiWorkspace() = default;
 
 RCShdPtr<UiWorkspace> UiWorkspace::getCurrentWorkspace()

@@ -1,9 +1,8 @@
 #include "exBase.h"
 
-#include <utf8.h>
-
 #include <array>
 #include <cstdio>
+#include <utf8.h>
 #include <utility>
 
 namespace Kv
@@ -63,6 +62,21 @@ ExBase* ExBase::clone() const
 void ExBase::raise() const
 {
     throw ExBase(*this);
+}
+
+ExBase* ExAssertionFailed::clone() const
+{
+    return new ExAssertionFailed(*this);
+}
+
+void ExAssertionFailed::raise() const
+{
+    throw ExAssertionFailed(*this);
+}
+
+void Assertions::throwAssertionFailed(char const* sourcePath, int line, char const* expression)
+{
+    throw ExAssertionFailed(sourcePath, line, std::string("Assertion failed: ") + expression);
 }
 
 } // namespace Kv

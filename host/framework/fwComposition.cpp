@@ -1,12 +1,10 @@
 #include "fwComposition.h"
 
 #include "files/osFile.h"
-#include "fwCompositionFormat.h"
-#include "fwCompositionReader.h"
-#include "fwCompositionWriter.h"
+#include "fwCompositionXml.h"
 #include "fwGraph.h"
 #include "fwNode.h"
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 
 #include <filesystem>
 #include <utility>
@@ -35,8 +33,7 @@ RCStrongPtr<FwComposition> FwComposition::open(OsFilePath const& path)
     RCStrongPtr<FwComposition> composition(std::shared_ptr<FwComposition>(new FwComposition(canonical)));
     composition->_version = version;
     std::string const name = getCompositionName(canonical);
-    composition->_node =
-        makeShd<FwNode>(composition, FwNode::Description{name, FwCompositionFormat::composition, {}, {}});
+    composition->_node = makeShd<FwNode>(composition, FwNode::Description{name, "composition", {}, {}});
     composition->_graph = makeShd<FwGraph>(composition, name, std::move(nodes));
     return composition;
 }

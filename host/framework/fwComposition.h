@@ -3,7 +3,6 @@
 #include "files/osFilePath.h"
 #include "kvExport.h"
 #include "piCompositionGraphInterface.h"
-#include "pointers/rcStrongPtr.h"
 #include "pointers/rcWeakPtr.h"
 
 #include <functional>

@@ -1,8 +1,8 @@
 #include "fwGraph.h"
 
 #include "fwComposition.h"
-#include "pointers/rcWeakAccessor.h"
-#include "text/liStringUtil.h"
+#include "pointers/rcWeakPtr.h"
+#include "text/liString.h"
 #include "xml/xmlWriter.h"
 
 #include <utility>

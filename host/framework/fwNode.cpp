@@ -1,7 +1,7 @@
 #include "fwNode.h"
 
 #include "fwComposition.h"
-#include "pointers/rcWeakAccessor.h"
+#include "pointers/rcWeakPtr.h"
 
 #include <algorithm>
 #include <utility>

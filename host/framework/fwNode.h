@@ -1,6 +1,6 @@
 #pragma once
 
-#include "piNode.h"
+#include "piGraph.h"
 #include "pointers/rcWeakPtr.h"
 
 #include <string>

@@ -1,6 +1,6 @@
 #include "wsFont.h"
 
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 #include "wsNative.h"
 
 namespace Kv
@@ -10,6 +10,17 @@ float WsFont::getStringWidth(char const* text) const
 {
     LiStringUtil::requireUtf8(text, "Text to measure");
     return WsNative::getPlatform().measureText(text);
+}
+
+WsFontRegistry& WsFontRegistry::getInstance()
+{
+    static WsFontRegistry registry;
+    return registry;
+}
+
+RCShdPtr<WsFont> WsFontRegistry::getDefaultFont() const
+{
+    return _defaultFont;
 }
 
 } // namespace Kv

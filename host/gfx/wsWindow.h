@@ -1,13 +1,64 @@
 #pragma once
 
+#include "geometry.h"
 #include "kvExport.h"
 #include "ntWindow.h"
 #include "pointers/rcBase.h"
+#include "pointers/rcShdPtr.h"
 
 #include <memory>
 
 namespace Kv
 {
+
+/// What the window manager puts around and beside a window. One style of each is all that windows have here.
+enum class BorderStyle
+{
+    Resizable = 0,
+};
+
+enum class TitleBarStyle
+{
+    Shown = 0,
+};
+
+enum class TaskBarStyle
+{
+    Shown = 0,
+};
+
+enum class StackingStyle
+{
+    Normal = 0,
+};
+
+enum class CloseButtonStyle
+{
+    None = 1,
+};
+
+/// How a window looks on the screen, and where it stands.
+class KV_API WsWindowStyle : public RCBase<LkCounter<int>>
+{
+public:
+    explicit WsWindowStyle(GeRectangle<int> const& frame) : _frame(frame) {}
+
+    /// Where the content of the window goes, in pixels of the screen, y growing upward.
+    GeRectangle<int> const& getFrame() const { return _frame; }
+
+private:
+    GeRectangle<int> _frame;
+};
+
+/// Makes window styles.
+class KV_API WsWindowStyleUtils
+{
+public:
+    /// The style of a window for `frame`, on the screen of the number `screen`; 0 is the one that there always is.
+    static RCShdPtr<WsWindowStyle> getNormalWindowStyle(GeRectangle<int> const& frame, int screen, BorderStyle border,
+                                                        TitleBarStyle titleBar, TaskBarStyle taskBar,
+                                                        StackingStyle stacking, CloseButtonStyle closeButton);
+};
 
 /// A window of the window system; owns its native side.
 class KV_API WsWindow : public RCBase<LkCounter<int>>

@@ -3,7 +3,6 @@
 #include "files/osFilePath.h"
 #include "kvExport.h"
 #include "piGraph.h"
-#include "piNodeController.h"
 
 namespace Kv
 {

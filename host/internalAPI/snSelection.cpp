@@ -7,6 +7,8 @@
 namespace Kv
 {
 
+SnItem::~SnItem() = default;
+
 SnSelection::SnSelection(Items items) : _items(std::move(items)) {}
 
 SnSelection::~SnSelection() = default;

@@ -1,13 +1,26 @@
 #pragma once
 
+#include "kvExport.h"
+#include "pointers/rcBase.h"
 #include "pointers/rcShdPtr.h"
 #include "prdPredicate.h"
-#include "snItem.h"
 
 #include <list>
 
 namespace Kv
 {
+
+/// Something that can be selected. What it is, those find out who know its kind, through `SnItemConvert`.
+class KV_API SnItem : public RCBase<LkCounter<int>>
+{
+public:
+    ~SnItem() override;
+};
+
+/// How items of a selection become what `T` points to. Each library that has a kind of item specializes it, with two
+/// static operations: `getPredicate`, which holds for the items of that kind, and `get`, which gives what such an item
+/// stands for, and null for any other.
+template <typename T> class SnItemConvert;
 
 /// What was selected at one moment, in the order in which it is shown. Keeps its items; it does not follow later
 /// changes.

@@ -3,6 +3,10 @@
 namespace Kv
 {
 
+PiNodeController::~PiNodeController() = default;
+
+PiNode::~PiNode() = default;
+
 PiGraph::~PiGraph() = default;
 
 } // namespace Kv

@@ -1,10 +1,14 @@
 #pragma once
 
 #include "kvExport.h"
-#include "uuid.h"
+
+#include <boost/uuid/uuid.hpp>
 
 namespace Kv
 {
+
+/// Identity that is unique without a registry.
+using Uuid = boost::uuids::uuid;
 
 /// What native code asks of the running Python.
 class KV_API PiPythonUtils

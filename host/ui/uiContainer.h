@@ -1,6 +1,6 @@
 #pragma once
 
-#include "iterators/iterator.h"
+#include "iterator.h"
 #include "prdPredicate.h"
 #include "uiWidget.h"
 

@@ -1,6 +1,6 @@
 #include "uiString.h"
 
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 
 #include <utility>
 

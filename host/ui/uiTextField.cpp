@@ -1,6 +1,6 @@
 #include "uiTextField.h"
 
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 #include "uiContainer.h"
 #include "uiWidgetElement.h"
 #include "uiWidgetFactory.h"

@@ -1,6 +1,6 @@
 #include "uiTopLevel.h"
 
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 #include "uiEscapeButton.h"
 #include "uiLayout.h"
 #include "wsNative.h"

@@ -2,7 +2,7 @@
 
 #include "uiContainer.h"
 #include "uiWindow.h"
-#include "wsWindowStyle.h"
+#include "wsWindow.h"
 
 #include <memory>
 #include <string>

@@ -1,7 +1,7 @@
 #include "uiWidget.h"
 
 #include "ntPlatform.h"
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 #include "uiContainer.h"
 #include "uiPointerCallbacks.h"
 #include "uiResTable.h"

@@ -1,14 +1,13 @@
 #pragma once
 
 #include "coRgbColor.h"
-#include "geRectangle.h"
-#include "geVector2.h"
+#include "geometry.h"
 #include "kvExport.h"
 #include "piWidget.h"
 #include "pointers/rcShdPtr.h"
 #include "text/liString.h"
 #include "uiConstraint.h"
-#include "uiFrame.h"
+#include "uiLook.h"
 
 #include <memory>
 #include <optional>

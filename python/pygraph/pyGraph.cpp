@@ -4,7 +4,7 @@
 
 #include "pyGraphError.h"
 #include "pyManagedGraph.h"
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 #include "wsThread.h"
 
 namespace bp = boost::python;

@@ -3,7 +3,7 @@
 #include "pyGraphRo.h"
 
 #include "pyGraphError.h"
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 #include "wsThread.h"
 
 #include <functional>

@@ -7,9 +7,8 @@
 #include "kvExport.h"
 #include "piCompositionGraphInterface.h"
 #include "piGraph.h"
-#include "piNode.h"
 #include "pointers/rcShdPtr.h"
-#include "pointers/rcWeakAccessor.h"
+#include "pointers/rcWeakPtr.h"
 
 #include <string>
 

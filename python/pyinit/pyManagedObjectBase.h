@@ -1,8 +1,8 @@
 #pragma once
 
 #include "kvExport.h"
+#include "piPythonUtils.h"
 #include "pointers/rcBase.h"
-#include "uuid.h"
 
 namespace Kv
 {

@@ -2,7 +2,7 @@
 
 #include <Python.h>
 
-#include "assertions.h"
+#include "exBase.h"
 #include "pyInitError.h"
 
 #include <string>

@@ -1,14 +1,11 @@
-#include "assertions.h"
 #include "cbHandler.h"
-#include "iterators/constIterator.h"
-#include "iterators/iterator.h"
-#include "packages/inBuildInfoUtil.h"
+#include "exBase.h"
+#include "iterator.h"
+#include "packages/inBuildInfo.h"
 #include "packages/inInit.h"
+#include "pointers/plainPtr.h"
 #include "pointers/rcShdPtr.h"
-#include "pointers/rcStrongPtr.h"
-#include "pointers/rcWeakAccessor.h"
 #include "pointers/rcWeakPtr.h"
-#include "pointers/uPtr.h"
 
 #include <algorithm>
 #include <gtest/gtest.h>

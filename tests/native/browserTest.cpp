@@ -5,7 +5,7 @@
 #include "files/osPlace.h"
 #include "piWidget.h"
 #include "uiTopLevel.h"
-#include "uiView.h"
+#include "uiWorkspace.h"
 
 #include <QApplication>
 #include <QLabel>

@@ -1,6 +1,6 @@
 #include "fwComposition.h"
-#include "piNode.h"
-#include "pointers/rcWeakAccessor.h"
+#include "piGraph.h"
+#include "pointers/rcWeakPtr.h"
 #include "uiCompositionWorkspace.h"
 
 #include <csignal>

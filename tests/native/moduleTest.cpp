@@ -1,7 +1,7 @@
 #include <boost/python.hpp>
 
 #include "files/osFilePath.h"
-#include "packages/inBuildInfoUtil.h"
+#include "packages/inBuildInfo.h"
 #include "packages/inInit.h"
 #include "pyManagedDialog.h"
 #include "pyUiError.h"

@@ -1,7 +1,6 @@
 #include "files/osFile.h"
 #include "text/liString.h"
 #include "text/liStringSubstituter.h"
-#include "text/liStringUtil.h"
 #include "xml/xmlDocument.h"
 #include "xml/xmlError.h"
 #include "xml/xmlWriter.h"

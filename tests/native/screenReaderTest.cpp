@@ -7,7 +7,7 @@
 #include "uiPushButton.h"
 #include "uiTextField.h"
 #include "uiTopLevel.h"
-#include "wsWindowStyle.h"
+#include "wsWindow.h"
 
 #include <QAccessible>
 #include <QApplication>

@@ -4,7 +4,7 @@
 #include "pyManagedGraph.h"
 #include "uiCompositionWorkspace.h"
 #include "uiLabel.h"
-#include "uiView.h"
+#include "uiWorkspace.h"
 
 #include <filesystem>
 #include <fstream>

@@ -67,8 +67,8 @@ def test_the_module_shows_its_public_operations_and_nothing_else():
         ERROR: error,
         WRAPPER: declared_in('python/pyinit/pyManagedObject.h', 'PyManagedObject'),
         GRAPH: declared_in('python/pyinit/pyManagedObject.h', 'PyManagedObject'),
-        ITERATOR: declared_in('host/base/iterators/iterator.h', 'Iterator'),
-        POINTER: declared_in('host/base/pointers/rcBasePtr.h', 'RCBasePtr'),
+        ITERATOR: declared_in('host/base/iterator.h', 'Iterator'),
+        POINTER: declared_in('host/base/pointers/rcShdPtr.h', 'RCBasePtr'),
     }
     assert {'launch', 'redraw', 'hide', 'getWidget', '~Dialog'} < set(counts[DIALOG])
     assert rest == {'PyInit_libKVpyextUi', 'Kv::InInit<KvInit::pyextUi>::getType()'} | {

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "packages/inBuildInfo.h"
-#include "pointers/oPtr.h"
+#include "pointers/plainPtr.h"
 
 #include <string>
 #include <typeinfo>

@@ -1,5 +1,5 @@
 // The record of each library but the module, made of what the build says of it.
-#include "packages/inBuildInfoUtil.h"
+#include "packages/inBuildInfo.h"
 #include "packages/inInit.h"
 
 #include <memory>

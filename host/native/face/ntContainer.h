@@ -1,6 +1,6 @@
 #pragma once
 
-#include "geRectangle.h"
+#include "geometry.h"
 #include "ntPeer.h"
 
 namespace Kv

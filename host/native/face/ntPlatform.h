@@ -1,8 +1,7 @@
 #pragma once
 
 #include "exBase.h"
-#include "geRectangle.h"
-#include "geVector2.h"
+#include "geometry.h"
 #include "ntWindow.h"
 
 #include <exception>

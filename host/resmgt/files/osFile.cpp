@@ -1,13 +1,13 @@
 #include "files/osFile.h"
 
 #include "exBase.h"
-#include "files/osFileDescriptor.h"
 #include "files/osTemporaryFile.h"
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 
 #include <array>
 #include <cerrno>
 #include <fcntl.h>
+#include <filesystem>
 #include <optional>
 #include <sys/stat.h>
 #include <system_error>
@@ -158,6 +158,12 @@ void OsFile::replace(std::string const& content) const
     {
         fail("write", target, error.code().message());
     }
+}
+
+bool OsFsUtils::fileExists(OsFilePath const& path)
+{
+    std::error_code error;
+    return std::filesystem::exists(path.toString(), error);
 }
 
 } // namespace Kv

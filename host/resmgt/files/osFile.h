@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <mutex>
 #include <string>
+#include <unistd.h>
 
 namespace Kv
 {
@@ -56,6 +57,35 @@ public:
 
 private:
     OsFilePath _path;
+};
+
+/// Owns a descriptor of the system and closes it.
+class OsFileDescriptor
+{
+public:
+    /// A negative descriptor stands for none.
+    explicit OsFileDescriptor(int descriptor) : _descriptor(descriptor) {}
+    OsFileDescriptor(OsFileDescriptor const&) = delete;
+    OsFileDescriptor& operator=(OsFileDescriptor const&) = delete;
+    ~OsFileDescriptor()
+    {
+        if (isOpen())
+            ::close(_descriptor);
+    }
+
+    bool isOpen() const { return _descriptor >= 0; }
+    int get() const { return _descriptor; }
+
+private:
+    int _descriptor;
+};
+
+/// Questions to the file system.
+class KV_API OsFsUtils
+{
+public:
+    /// True for an existing file, directory or anything else that a path can lead to; false also where nobody may look.
+    static bool fileExists(OsFilePath const& path);
 };
 
 } // namespace Kv

@@ -1,7 +1,7 @@
 #include "files/osFilePath.h"
 
 #include "exBase.h"
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 
 #include <system_error>
 #include <utility>

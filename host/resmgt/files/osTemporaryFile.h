@@ -1,6 +1,6 @@
 #pragma once
 
-#include "files/osFileDescriptor.h"
+#include "files/osFile.h"
 #include "files/osFilePath.h"
 
 #include <string>

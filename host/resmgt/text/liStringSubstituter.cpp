@@ -1,7 +1,7 @@
 #include "text/liStringSubstituter.h"
 
 #include "exBase.h"
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 
 #include <algorithm>
 

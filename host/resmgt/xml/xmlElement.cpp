@@ -1,6 +1,6 @@
 #include "xml/xmlElement.h"
 
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 #include "xml/xmlError.h"
 #include "xml/xmlSyntax.h"
 #include "xml/xmlTree.h"

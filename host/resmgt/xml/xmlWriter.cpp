@@ -1,6 +1,6 @@
 #include "xml/xmlWriter.h"
 
-#include "text/liStringUtil.h"
+#include "text/liString.h"
 #include "xml/xmlError.h"
 #include "xml/xmlSyntax.h"
 

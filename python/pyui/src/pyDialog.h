@@ -3,11 +3,11 @@
 #include <boost/python/dict.hpp>
 #include <boost/python/object.hpp>
 
-#include "iterators/iterator.h"
+#include "iterator.h"
 #include "kvExport.h"
 #include "piWidget.h"
 #include "pointers/rcShdPtr.h"
-#include "pointers/rcStrongPtr.h"
+#include "pointers/rcWeakPtr.h"
 #include "pyCallables.h"
 #include "pyWidgetCbs.h"
 #include "uiAppMgr.h"

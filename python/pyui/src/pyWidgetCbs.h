@@ -6,7 +6,7 @@
 #include "piWidget.h"
 #include "pointers/rcBase.h"
 #include "pointers/rcShdPtr.h"
-#include "pointers/rcStrongPtr.h"
+#include "pointers/rcWeakPtr.h"
 
 #include <string>
 #include <vector>

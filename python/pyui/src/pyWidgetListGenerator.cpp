@@ -6,10 +6,10 @@
 #include "pyDialog.h"
 #include "pyErrorNote.h"
 #include "pyUiError.h"
+#include "text/liString.h"
 #include "text/liStringSubstituter.h"
-#include "text/liStringUtil.h"
 #include "uiConstraint.h"
-#include "wsFontRegistry.h"
+#include "wsFont.h"
 #include "xml/xmlWriter.h"
 
 #include <algorithm>

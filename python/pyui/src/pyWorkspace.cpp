@@ -2,17 +2,16 @@
 
 #include "pyWorkspace.h"
 
-#include "assertions.h"
 #include "brBrowsable.h"
+#include "exBase.h"
 #include "piCompositionGraphInterface.h"
-#include "piNode.h"
-#include "pointers/rcWeakAccessor.h"
-#include "pointers/uPtr.h"
+#include "piGraph.h"
+#include "pointers/plainPtr.h"
+#include "pointers/rcWeakPtr.h"
 #include "pyCompat.h"
 #include "pyUiError.h"
 #include "snSelection.h"
-#include "uiCompositionWorkspaceClientInterface.h"
-#include "uiView.h"
+#include "uiCompositionWorkspace.h"
 #include "uiWorkspace.h"
 
 #include <cstring>

@@ -1,6 +1,6 @@
 #include <boost/python.hpp>
 
-#include "packages/inBuildInfoUtil.h"
+#include "packages/inBuildInfo.h"
 #include "packages/inInit.h"
 #include "piBrowserSchemes.h"
 #include "pyArgumentNote.h"

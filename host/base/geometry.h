@@ -3,6 +3,13 @@
 namespace Kv
 {
 
+/// Pair of numbers: a point, a size or a factor in two directions.
+template <typename Number> struct GeVector2
+{
+    Number x{};
+    Number y{};
+};
+
 /// Rectangle by its edges. Y grows upward: `yMax` is the top edge.
 template <typename Number> struct GeRectangle
 {

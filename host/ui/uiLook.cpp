@@ -1,9 +1,20 @@
-#include "uiColorRegistry.h"
+#include "uiLook.h"
 
 #include "exBase.h"
 
 namespace Kv
 {
+
+UiFrame::~UiFrame() = default;
+
+UiFrameLineBottom::UiFrameLineBottom() = default;
+
+UiFrameLineBottom::~UiFrameLineBottom() = default;
+
+bool UiFrameLineBottom::hasBottomLine() const
+{
+    return true;
+}
 
 LiString const UiColorRegistry::Grey65("grey65");
 

@@ -2,6 +2,7 @@
 
 #include "files/osFilePath.h"
 #include "fwNode.h"
+#include "piGraph.h"
 #include "xml/xmlElement.h"
 
 #include <set>
@@ -35,6 +36,14 @@ private:
     std::set<std::string> _names;
     /// An input can refer to a node further down.
     std::vector<Reference> _references;
+};
+
+/// Writes compositions as `FwCompositionReader` reads them.
+class FwCompositionWriter
+{
+public:
+    /// The text of the whole file, which gives exactly the same nodes when it is read.
+    static std::string write(PiGraph const& graph);
 };
 
 } // namespace Kv

@@ -1,25 +1,49 @@
-#include "fwCompositionReader.h"
+#include "fwCompositionXml.h"
 
 #include "files/osFile.h"
-#include "fwCompositionFormat.h"
-#include "text/liStringUtil.h"
+#include "piGraph.h"
+#include "text/liString.h"
 #include "xml/xmlDocument.h"
 #include "xml/xmlError.h"
+#include "xml/xmlWriter.h"
 
 #include <algorithm>
 #include <charconv>
 #include <cstdint>
 #include <initializer_list>
 #include <optional>
+#include <sstream>
+#include <string>
 #include <system_error>
 
 namespace Kv
 {
 
-namespace Format = FwCompositionFormat;
-
 namespace
 {
+
+/// The words of a composition's file: an element for the whole, in it the nodes, in each its values and inputs, all of
+/// them with attributes and nothing else. An input refers to any node of the file by its name.
+namespace Format
+{
+
+constexpr char const* composition = "composition";
+constexpr char const* node = "node";
+constexpr char const* value = "value";
+constexpr char const* input = "input";
+
+/// Of the whole: the version of these words. A file without one is of the first.
+constexpr char const* version = "version";
+constexpr int currentVersion = 1;
+
+/// Of a node, a value or an input.
+constexpr char const* name = "name";
+/// Of a node.
+constexpr char const* type = "type";
+/// Of a value.
+constexpr char const* text = "text";
+
+} // namespace Format
 
 [[noreturn]] void fail(int line, std::string const& words)
 {
@@ -156,6 +180,46 @@ void FwCompositionReader::requireReferencedNodes() const
         if (_names.count(reference.nodeName) == 0)
             fail(reference.line, "input " + LiStringUtil::getPrintable(reference.inputName) + " refers to node " +
                                      LiStringUtil::getPrintable(reference.nodeName) + ", which is not there");
+}
+
+namespace
+{
+
+constexpr int indent = 2;
+
+void writeEntry(XmlWriter& writer, char const* element, std::string const& name, char const* attribute,
+                std::string const& text)
+{
+    writer.openTag(element);
+    writer.writeAttrib(Format::name, name);
+    writer.writeAttrib(attribute, text);
+    writer.closeTag();
+}
+
+void writeNode(XmlWriter& writer, PiNode const& node)
+{
+    writer.openTag(Format::node);
+    writer.writeAttrib(Format::name, node.getName());
+    writer.writeAttrib(Format::type, node.getType());
+    for (auto const& value : node.getValues())
+        writeEntry(writer, Format::value, value.first, Format::text, value.second);
+    for (auto const& input : node.getInputs())
+        writeEntry(writer, Format::input, input.first, Format::node, input.second);
+    writer.closeTag();
+}
+
+} // namespace
+
+std::string FwCompositionWriter::write(PiGraph const& graph)
+{
+    std::ostringstream stream;
+    XmlWriter writer(stream, indent);
+    writer.openTag(Format::composition);
+    writer.writeAttrib(Format::version, std::to_string(Format::currentVersion));
+    for (RCShdPtr<const PiNode> const& node : graph.getNodes())
+        writeNode(writer, *node);
+    writer.closeTag();
+    return stream.str();
 }
 
 } // namespace Kv

@@ -1,7 +1,9 @@
 #pragma once
 
+#include "coRgbColor.h"
 #include "kvExport.h"
 #include "pointers/rcBase.h"
+#include "text/liString.h"
 
 namespace Kv
 {
@@ -24,6 +26,19 @@ public:
     ~UiFrameLineBottom() override;
 
     bool hasBottomLine() const override;
+};
+
+/// The colours by name.
+class KV_API UiColorRegistry
+{
+public:
+    /// "grey65": grey of 65 % of the light of white.
+    static LiString const Grey65;
+
+    static UiColorRegistry& getInstance();
+
+    /// Throws an `ExBase` for a name that no colour has.
+    CoRgbColorTyped<float> getColor(LiString const& name) const;
 };
 
 } // namespace Kv

@@ -2,8 +2,13 @@
 
 #include "pointers/rcExUtil.h"
 
+#include <memory>
+
 namespace Kv
 {
+
+/// Pointer that owns its object alone; as a parameter it takes the object over.
+template <typename T> using OPtr = std::unique_ptr<T>;
 
 /// Borrowed pointer that can be null. Going through a null one throws `ExNullPtr`.
 template <typename T> class UPtr

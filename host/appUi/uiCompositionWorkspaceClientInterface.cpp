@@ -1,8 +1,0 @@
-#include "uiCompositionWorkspaceClientInterface.h"
-
-namespace Kv
-{
-
-UiCompositionWorkspaceClientInterface::~UiCompositionWorkspaceClientInterface() = default;
-
-} // namespace Kv

@@ -1,8 +1,0 @@
-#include "uiView.h"
-
-namespace Kv
-{
-
-UiView::~UiView() = default;
-
-} // namespace Kv

@@ -1,8 +1,0 @@
-#include "snItem.h"
-
-namespace Kv
-{
-
-SnItem::~SnItem() = default;
-
-} // namespace Kv

@@ -1,8 +1,0 @@
-#include "piNode.h"
-
-namespace Kv
-{
-
-PiNode::~PiNode() = default;
-
-} // namespace Kv

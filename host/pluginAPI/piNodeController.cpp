@@ -1,8 +1,0 @@
-#include "piNodeController.h"
-
-namespace Kv
-{
-
-PiNodeController::~PiNodeController() = default;
-
-} // namespace Kv
