@@ -1,7 +1,7 @@
 #include "brBrowsable.h"
 #include "brBrowser.h"
+#include "browser/qtDirListing.h"
 #include "exBase.h"
-#include "files/osDirOrder.h"
 #include "files/osPlace.h"
 #include "piWidget.h"
 #include "uiTopLevel.h"
@@ -55,19 +55,15 @@ protected:
     }
 
     /// The titles as they stand from top to bottom.
-    std::vector<std::string> list(bool collapsed, OsDirOrder::Key key = OsDirOrder::Name, bool descending = false) const
+    std::vector<std::string> list(bool collapsed, QtDirListing::Key key = QtDirListing::Name,
+                                  bool descending = false) const
     {
-        OsDirScan::Options options;
+        QtDirListing::Options options;
         options.collapses = [collapsed](std::string const&) { return collapsed; };
-        OsDirScan scan(folder, options);
-        while (!scan.step())
-            continue;
-        OsDirOrder order(scan.getEntries(), key, descending);
-        while (!order.step())
-            continue;
+        QtDirListing const listing(folder, options, false);
         std::vector<std::string> titles;
-        for (int const index : order.take())
-            titles.push_back(scan.getEntries().at(static_cast<std::size_t>(index)).title);
+        for (int const index : listing.sort(key, descending))
+            titles.push_back(listing.getEntries().at(static_cast<std::size_t>(index)).title);
         return titles;
     }
 
@@ -158,29 +154,18 @@ protected:
 
 } // namespace
 
-TEST_F(Folder, IsReadAndSortedInSmallStepsWhateverItsSize)
+TEST_F(Folder, IsReadAndSortedWhateverItsSizeAndNoLongerThanItIsWanted)
 {
     constexpr std::size_t count = 10000;
     for (std::size_t number = 0; number < count; ++number)
         make({"file" + std::to_string(number * 7919 % count)});
-    OsDirScan scan(folder, {});
-    std::size_t before = 0;
-    for (bool done = false; !done; before = scan.getEntries().size())
-    {
-        done = scan.step();
-        ASSERT_LE(scan.getEntries().size() - before, OsDirScan::namesPerStep);
-    }
-    ASSERT_EQ(scan.getEntries().size(), count);
-    OsDirOrder order(scan.getEntries(), OsDirOrder::Name, true);
-    std::size_t steps = 1;
-    while (!order.step())
-        ++steps;
-    // Each step moves so many entries at most, and a merge of runs takes more than one pass.
-    EXPECT_GE(steps, 2 * count / OsDirOrder::entriesPerStep);
-    std::vector<int> const sorted = order.take();
-    auto const keyOf = [&](int index) { return scan.getEntries()[static_cast<std::size_t>(index)].sortKey; };
+    QtDirListing const listing(folder, {}, false);
+    ASSERT_EQ(listing.getEntries().size(), count);
+    std::vector<int> const sorted = listing.sort(QtDirListing::Name, true);
+    auto const keyOf = [&](int index) { return listing.getEntries()[static_cast<std::size_t>(index)].sortKey; };
     EXPECT_TRUE(std::is_sorted(sorted.begin(), sorted.end(), [&](int a, int b) { return keyOf(a) > keyOf(b); }));
     EXPECT_EQ(std::set<int>(sorted.begin(), sorted.end()).size(), count);
+    EXPECT_EQ(QtDirListing(folder, {}, true).getEntries().size(), 0U);
 }
 
 TEST_F(Folder, IsListedAsPeopleCountWithFoldersFirst)
@@ -190,7 +175,7 @@ TEST_F(Folder, IsListedAsPeopleCountWithFoldersFirst)
     fs::create_symlink("/nowhere", folder / "link");
     using Names = std::vector<std::string>;
     EXPECT_EQ(list(false), (Names{"c", "Z9", "z10", "a", "b1", "B2", "b02x", "b10", "link", "\xff"}));
-    Names const bySize = list(false, OsDirOrder::Size, true);
+    Names const bySize = list(false, QtDirListing::Size, true);
     EXPECT_EQ(bySize.at(0), "z10");
     EXPECT_EQ(bySize.at(3), "a");
 }
@@ -341,6 +326,7 @@ TEST_F(Browser, SaysWhyADirectoryCannotBeRead)
     ASSERT_EQ(seteuid(user == 0 ? nobody : user), 0);
     showAt(folder);
     press({Qt::Key_Down, Qt::Key_Return});
+    wait([] { return !words().empty(); });
     ASSERT_EQ(seteuid(user), 0);
     EXPECT_EQ(place(), folder / "locked");
     EXPECT_EQ(rows(), 0);

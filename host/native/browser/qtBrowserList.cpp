@@ -49,7 +49,7 @@ protected:
 
 } // namespace
 
-QtBrowserList::QtBrowserList(QWidget* parent, Wishes wishes) : QTreeView(parent), _wishes(std::move(wishes))
+QtBrowserList::QtBrowserList(QWidget* parent, Actions actions) : QTreeView(parent), _actions(std::move(actions))
 {
     QtFocusOrder::markAsValue(*this);
     setItemDelegate(new RowDelegate(this));
@@ -82,11 +82,11 @@ void QtBrowserList::keyPressEvent(QKeyEvent* event)
     if (event->modifiers() & Qt::AltModifier)
         event->ignore();
     else if (event->key() == Qt::Key_Backspace)
-        _wishes.goUp();
+        _actions.goUp();
     else if ((isEnter && event->isAutoRepeat()) || ((isEnter || isArrow) && selectFirst()))
         event->accept();
     else if (isEnter)
-        _wishes.activate();
+        _actions.activate();
     else
     {
         QTreeView::keyPressEvent(event);
@@ -108,7 +108,7 @@ void QtBrowserList::mouseDoubleClickEvent(QMouseEvent* event)
     QTreeView::mouseDoubleClickEvent(event);
     bool const isLeft = event->button() == Qt::LeftButton;
     if (isLeft && currentIndex().isValid() && indexAt(event->position().toPoint()).row() == currentIndex().row())
-        _wishes.activate();
+        _actions.activate();
 }
 
 void QtBrowserList::resizeEvent(QResizeEvent* event)

@@ -7,20 +7,20 @@
 namespace Kv
 {
 
-/// The list of a browser: keys and clicks, and which columns there is room for. What is not its own, as Escape, goes on
-/// to what holds it.
+/// The list of a browser with its keys and clicks; shows the columns that there is room for. A key that is not its own,
+/// as Escape, goes on to what holds it.
 class QtBrowserList final : public QTreeView
 {
 public:
-    /// What the list asks for; all are set before it is shown.
-    struct Wishes
+    /// Functions that keys and clicks call; all are set before the list is shown.
+    struct Actions
     {
         /// Enter, or a double click, on the current row.
         std::function<void()> activate;
         std::function<void()> goUp;
     };
 
-    QtBrowserList(QWidget* parent, Wishes wishes);
+    QtBrowserList(QWidget* parent, Actions actions);
 
     /// Words that stand in the list while it has no rows.
     void setPlaceholder(QString const& text);
@@ -39,7 +39,7 @@ private:
     bool selectFirst();
     void fitColumns();
 
-    Wishes _wishes;
+    Actions _actions;
     QString _placeholder;
 };
 

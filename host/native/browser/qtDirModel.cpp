@@ -1,17 +1,17 @@
 #include "browser/qtDirModel.h"
 
+#include "browser/qtNumberedName.h"
 #include "exBase.h"
-#include "files/osNumberedName.h"
 #include "peers/qtText.h"
 
 #include <QApplication>
 #include <QDateTime>
-#include <QElapsedTimer>
 #include <QLocale>
 #include <QStyle>
 #include <QTextDocument>
 
 #include <algorithm>
+#include <exception>
 #include <optional>
 #include <unordered_set>
 #include <utility>
@@ -22,14 +22,6 @@ namespace Kv
 namespace
 {
 
-/// How long the loop waits for one slice of work, in milliseconds.
-constexpr qint64 sliceLength = 4;
-
-std::string foldCase(std::string const& text)
-{
-    return toQString(text).toCaseFolded().toStdString();
-}
-
 Qt::Alignment getAlignment(int column)
 {
     if (column == QtDirModel::NameColumn)
@@ -38,7 +30,7 @@ Qt::Alignment getAlignment(int column)
     return column == QtDirModel::SizeColumn ? Qt::AlignRight | Qt::AlignVCenter : Qt::AlignCenter;
 }
 
-bool isSame(OsDirEntry const& a, OsDirEntry const& b)
+bool isSame(QtDirEntry const& a, QtDirEntry const& b)
 {
     return a.name == b.name && a.title == b.title && a.isDirectory == b.isDirectory && a.size == b.size &&
            a.modified == b.modified;
@@ -51,43 +43,53 @@ QtDirModel::QtDirModel(QObject* parent, std::function<void()> onRead)
       _directoryIcon(QApplication::style()->standardIcon(QStyle::SP_DirIcon)),
       _fileIcon(QApplication::style()->standardIcon(QStyle::SP_FileIcon))
 {
-    _options.foldCase = &foldCase;
-    connect(&_timer, &QTimer::timeout, this, [this] { work(); });
 }
 
 void QtDirModel::open(std::string const& directory, std::string const& hiddenName)
 {
     _directory = directory;
     _options.hiddenName = hiddenName;
-    replaceRows({}, {});
+    replaceRows(nullptr, {});
     reread();
 }
 
 void QtDirModel::reread()
 {
-    _sorting.reset();
-    _readEntries.reset();
-    try
+    auto const read = [this, directory = _directory, options = _options, key = _key,
+                       descending = _descending](std::atomic<bool> const& cancelled) -> std::function<void()>
     {
-        _scan = std::make_unique<OsDirScan>(_directory, _options);
-        _timer.start(0);
-    }
-    catch (ExBase const& error)
-    {
-        fail(error.getReason());
-    }
+        try
+        {
+            auto const listing = std::make_shared<QtDirListing const>(directory, options, cancelled);
+            return [this, listing, rows = listing->sort(key, descending)]
+            {
+                _error.clear();
+                replaceRows(listing, rows);
+                _onRead();
+            };
+        }
+        catch (ExBase const& error)
+        {
+            return [this, reason = std::string(error.getReason())] { fail(reason); };
+        }
+        catch (std::exception const& error)
+        {
+            return [this, reason = std::string(error.what())] { fail(reason); };
+        }
+    };
+    _worker.start(read);
 }
 
 void QtDirModel::rereadIfChanged()
 {
-    OsDirStamp const stamp = OsDirStamp::take(_directory);
-    if (!isReading() && (!_error.empty() || !_stamp.isUnchangedIn(stamp)))
+    QtDirStamp const stamp = QtDirStamp::take(_directory);
+    if (!isReading() && (!_listing || !_listing->getStamp().isUnchangedIn(stamp)))
         reread();
 }
 
-OsDirEntry const& QtDirModel::getEntry(int row) const
+QtDirEntry const& QtDirModel::getEntry(int row) const
 {
-    return _entries[static_cast<std::size_t>(_rows[static_cast<std::size_t>(row)])];
+    return _listing->getEntries()[static_cast<std::size_t>(_rows[static_cast<std::size_t>(row)])];
 }
 
 std::vector<int> QtDirModel::findRows(std::vector<std::string> const& names) const
@@ -98,11 +100,11 @@ std::vector<int> QtDirModel::findRows(std::vector<std::string> const& names) con
         return {};
     std::unordered_set<std::string> sequences;
     for (std::string const& name : names)
-        if (std::optional<OsNumberedName> const numbered = OsNumberedName::parse(name))
+        if (std::optional<QtNumberedName> const numbered = QtNumberedName::parse(name))
             sequences.insert(numbered->getSequenceKey());
     std::vector<int> found;
     for (int row = 0; row < rowCount(); ++row)
-        if (OsDirEntry const& entry = getEntry(row);
+        if (QtDirEntry const& entry = getEntry(row);
             wanted.count(entry.name) > 0 || (!entry.sequenceKey.empty() && sequences.count(entry.sequenceKey) > 0))
             found.push_back(row);
     return found;
@@ -120,7 +122,7 @@ int QtDirModel::columnCount(QModelIndex const& parent) const
 
 QVariant QtDirModel::data(QModelIndex const& index, int role) const
 {
-    OsDirEntry const& entry = getEntry(index.row());
+    QtDirEntry const& entry = getEntry(index.row());
     bool const isName = index.column() == NameColumn;
     if (role == Qt::DisplayRole)
         return getText(entry, index.column());
@@ -147,86 +149,41 @@ QVariant QtDirModel::headerData(int section, Qt::Orientation orientation, int ro
 
 void QtDirModel::sort(int column, Qt::SortOrder order)
 {
-    _key = column == SizeColumn ? OsDirOrder::Size : column == ModifiedColumn ? OsDirOrder::Modified : OsDirOrder::Name;
+    _key = column == SizeColumn       ? QtDirListing::Size
+           : column == ModifiedColumn ? QtDirListing::Modified
+                                      : QtDirListing::Name;
     _descending = order == Qt::DescendingOrder;
-    if (!_scan)
-        startSorting(_readEntries ? *_readEntries : _entries);
-}
-
-void QtDirModel::work()
-{
-    QElapsedTimer clock;
-    clock.start();
-    try
+    if (!_listing)
     {
-        while (!clock.hasExpired(sliceLength))
-            if (advance())
-            {
-                _timer.stop();
-                finish();
-                return;
-            }
-    }
-    catch (ExBase const& error)
-    {
-        fail(error.getReason());
-    }
-}
-
-bool QtDirModel::advance()
-{
-    if (!_scan)
-        return _sorting->step();
-    if (_scan->step())
-    {
-        _stamp = _scan->getStamp();
-        _readEntries = std::make_unique<std::vector<OsDirEntry>>(_scan->takeEntries());
-        _scan.reset();
-        startSorting(*_readEntries);
-    }
-    return false;
-}
-
-void QtDirModel::startSorting(std::vector<OsDirEntry> const& entries)
-{
-    _sorting = std::make_unique<OsDirOrder>(entries, _key, _descending);
-    _timer.start(0);
-}
-
-void QtDirModel::finish()
-{
-    std::vector<int> rows = _sorting->take();
-    _sorting.reset();
-    if (!_readEntries)
-    {
-        reorderRows(std::move(rows));
+        if (isReading())
+            reread();
         return;
     }
-    _error.clear();
-    std::unique_ptr<std::vector<OsDirEntry>> const entries = std::move(_readEntries);
-    replaceRows(std::move(*entries), std::move(rows));
-    _onRead();
+    _worker.start([this, listing = _listing, key = _key, descending = _descending](std::atomic<bool> const&)
+                  { return [this, rows = listing->sort(key, descending)] { reorderRows(rows); }; });
 }
 
 void QtDirModel::fail(std::string const& reason)
 {
-    _timer.stop();
-    _scan.reset();
     _error = reason;
-    replaceRows({}, {});
+    replaceRows(nullptr, {});
     _onRead();
 }
 
-void QtDirModel::replaceRows(std::vector<OsDirEntry> entries, std::vector<int> rows)
+void QtDirModel::replaceRows(Listing listing, std::vector<int> rows)
 {
     auto const isSameRow = [&](int mine, int other)
-    { return isSame(_entries[static_cast<std::size_t>(mine)], entries[static_cast<std::size_t>(other)]); };
-    if (std::equal(_rows.begin(), _rows.end(), rows.begin(), rows.end(), isSameRow))
-        return;
-    beginResetModel();
-    _entries = std::move(entries);
+    {
+        return isSame(_listing->getEntries()[static_cast<std::size_t>(mine)],
+                      listing->getEntries()[static_cast<std::size_t>(other)]);
+    };
+    bool const isNew = !std::equal(_rows.begin(), _rows.end(), rows.begin(), rows.end(), isSameRow);
+    if (isNew)
+        beginResetModel();
+    _listing = std::move(listing);
     _rows = std::move(rows);
-    endResetModel();
+    if (isNew)
+        endResetModel();
 }
 
 void QtDirModel::reorderRows(std::vector<int> rows)
@@ -248,7 +205,7 @@ void QtDirModel::reorderRows(std::vector<int> rows)
     emit layoutChanged({}, VerticalSortHint);
 }
 
-QVariant QtDirModel::getText(OsDirEntry const& entry, int column) const
+QVariant QtDirModel::getText(QtDirEntry const& entry, int column) const
 {
     if (column == NameColumn)
         return toShownPath(entry.title);

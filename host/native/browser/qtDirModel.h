@@ -1,11 +1,10 @@
 #pragma once
 
-#include "files/osDirOrder.h"
-#include "files/osDirScan.h"
+#include "browser/qtDirListing.h"
+#include "browser/qtDirWorker.h"
 
 #include <QAbstractTableModel>
 #include <QIcon>
-#include <QTimer>
 
 #include <functional>
 #include <memory>
@@ -15,8 +14,8 @@
 namespace Kv
 {
 
-/// The listing of a directory as a table, a row an entry. It reads and sorts in slices of a few milliseconds whenever
-/// the loop has nothing else to do; until a reading is done the rows stay as they were.
+/// The listing of a directory as a table, a row an entry. A worker reads and sorts; until that is done the rows stay as
+/// they were.
 class QtDirModel final : public QAbstractTableModel
 {
 public:
@@ -45,12 +44,12 @@ public:
     /// Reads the directory again where it has changed. Throws an `ExBase` where it cannot be asked.
     void rereadIfChanged();
 
-    bool isReading() const { return _timer.isActive(); }
+    bool isReading() const { return _worker.isBusy(); }
 
     /// Why the directory could not be read, in words; else empty.
     std::string const& getError() const { return _error; }
 
-    OsDirEntry const& getEntry(int row) const;
+    QtDirEntry const& getEntry(int row) const;
 
     /// The rows, from top to bottom, of files and directories, or of the sequences that they are part of.
     std::vector<int> findRows(std::vector<std::string> const& names) const;
@@ -62,36 +61,27 @@ public:
     void sort(int column, Qt::SortOrder order) override;
 
 private:
-    void work();
-    /// True once the work at hand is done.
-    bool advance();
-    void startSorting(std::vector<OsDirEntry> const& entries);
-    void finish();
+    using Listing = std::shared_ptr<QtDirListing const>;
+
     void fail(std::string const& reason);
-    void replaceRows(std::vector<OsDirEntry> entries, std::vector<int> rows);
+    void replaceRows(Listing listing, std::vector<int> rows);
     void reorderRows(std::vector<int> rows);
-    QVariant getText(OsDirEntry const& entry, int column) const;
+    QVariant getText(QtDirEntry const& entry, int column) const;
 
     std::function<void()> _onRead;
     std::string _directory;
-    OsDirScan::Options _options;
-    OsDirStamp _stamp;
+    QtDirListing::Options _options;
     std::string _error;
 
-    std::vector<OsDirEntry> _entries;
-    /// The entries as they stand from top to bottom.
+    Listing _listing;
+    /// The entries of the listing as they stand from top to bottom.
     std::vector<int> _rows;
 
-    /// The work at hand: a reading, then its sorting, or the sorting of the rows that there are.
-    std::unique_ptr<OsDirScan> _scan;
-    std::unique_ptr<std::vector<OsDirEntry>> _readEntries;
-    std::unique_ptr<OsDirOrder> _sorting;
-    QTimer _timer;
-
-    OsDirOrder::Key _key = OsDirOrder::Name;
+    QtDirListing::Key _key = QtDirListing::Name;
     bool _descending = false;
     QIcon _directoryIcon;
     QIcon _fileIcon;
+    QtDirWorker _worker;
 };
 
 } // namespace Kv

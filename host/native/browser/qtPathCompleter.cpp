@@ -1,11 +1,12 @@
 #include "browser/qtPathCompleter.h"
 
-#include "exBase.h"
+#include "browser/qtDirListing.h"
 #include "peers/qtText.h"
 
 #include <QAbstractItemView>
 
 #include <algorithm>
+#include <exception>
 #include <utility>
 
 namespace Kv
@@ -17,6 +18,31 @@ namespace
 /// More than these nobody reads.
 constexpr int maxProposals = 200;
 
+/// The sorted names of a directory's entries as one types them; none where it cannot be read.
+QStringList readNames(std::string const& directory, std::atomic<bool> const& cancelled)
+{
+    QtDirListing::Options options;
+    options.showsHidden = true;
+    QStringList names;
+    try
+    {
+        QtDirListing const listing(directory, options, cancelled);
+        for (QtDirEntry const& entry : listing.getEntries())
+        {
+            QString const name = toQString(entry.name);
+            // A name that cannot be typed leads nowhere.
+            if (toPath(name) == entry.name)
+                names.append(entry.isDirectory ? name + QLatin1Char('/') : name);
+        }
+    }
+    catch (std::exception const&)
+    {
+        return {};
+    }
+    names.sort();
+    return names;
+}
+
 } // namespace
 
 QtPathCompleter::QtPathCompleter(QObject* parent, std::function<void()> onReady)
@@ -24,7 +50,6 @@ QtPathCompleter::QtPathCompleter(QObject* parent, std::function<void()> onReady)
 {
     setCompletionMode(UnfilteredPopupCompletion);
     setModel(&_model);
-    connect(&_timer, &QTimer::timeout, this, [this] { work(); });
 }
 
 void QtPathCompleter::propose(QString const& text, std::string const* directory)
@@ -37,19 +62,18 @@ void QtPathCompleter::propose(QString const& text, std::string const* directory)
     {
         _directory = wanted;
         _names.clear();
-        _timer.stop();
-        try
-        {
-            OsDirScan::Options options;
-            options.showsHidden = true;
-            _scan = wanted.empty() ? nullptr : std::make_unique<OsDirScan>(wanted, options);
-            if (_scan)
-                _timer.start(0);
-        }
-        catch (ExBase const&)
-        {
-            _scan = nullptr;
-        }
+        _worker.cancel();
+        if (!wanted.empty())
+            _worker.start(
+                [this, wanted](std::atomic<bool> const& cancelled)
+                {
+                    return [this, names = readNames(wanted, cancelled)]
+                    {
+                        _names = names;
+                        filter();
+                        _onReady();
+                    };
+                });
     }
     filter();
 }
@@ -57,31 +81,6 @@ void QtPathCompleter::propose(QString const& text, std::string const* directory)
 QString QtPathCompleter::pathFromIndex(QModelIndex const& index) const
 {
     return _typedDirectory + index.data().toString();
-}
-
-void QtPathCompleter::work()
-{
-    try
-    {
-        if (!_scan->step())
-            return;
-        for (OsDirEntry const& entry : _scan->getEntries())
-        {
-            QString const name = toQString(entry.name);
-            // A name that cannot be typed leads nowhere.
-            if (toPath(name) == entry.name)
-                _names.append(entry.isDirectory ? name + QLatin1Char('/') : name);
-        }
-    }
-    catch (ExBase const&)
-    {
-        _names.clear();
-    }
-    _timer.stop();
-    _scan = nullptr;
-    _names.sort();
-    filter();
-    _onReady();
 }
 
 void QtPathCompleter::filter()

@@ -1,21 +1,19 @@
 #pragma once
 
-#include "files/osDirScan.h"
+#include "browser/qtDirWorker.h"
 
 #include <QCompleter>
 #include <QStringList>
 #include <QStringListModel>
-#include <QTimer>
 
 #include <functional>
-#include <memory>
 #include <string>
 
 namespace Kv
 {
 
-/// Proposes the entries of a directory that begin as the last part of a path that is being typed. Reads the directory
-/// in slices, and proposes when it is done.
+/// Proposes the entries of a directory that begin as the last part of a path that is being typed. A worker reads the
+/// directory; the proposals come when it is done.
 class QtPathCompleter final : public QCompleter
 {
 public:
@@ -28,18 +26,16 @@ public:
     QString pathFromIndex(QModelIndex const& index) const override;
 
 private:
-    void work();
     void filter();
 
     std::function<void()> _onReady;
     std::string _directory;
-    std::unique_ptr<OsDirScan> _scan;
-    QTimer _timer;
     /// Of the directory, sorted; a directory has a slash behind its name.
     QStringList _names;
     QString _typedDirectory;
     QString _typedName;
     QStringListModel _model;
+    QtDirWorker _worker;
 };
 
 } // namespace Kv

@@ -1,7 +1,5 @@
 #pragma once
 
-#include "kvExport.h"
-
 #include <cstdint>
 #include <optional>
 #include <string>
@@ -12,7 +10,7 @@ namespace Kv
 
 /// The name of a file that is one of a numbered sequence: "frame.0001.exr" is "frame.", the number 1 in 4 digits, and
 /// ".exr".
-struct KV_API OsNumberedName
+struct QtNumberedName
 {
     std::string prefix;
     std::string suffix;
@@ -20,7 +18,7 @@ struct KV_API OsNumberedName
     std::uint64_t number = 0;
 
     /// The last number of two digits or more that is no part of an extension such as ".mp42"; null where there is none.
-    static std::optional<OsNumberedName> parse(std::string const& name);
+    static std::optional<QtNumberedName> parse(std::string const& name);
 
     /// The same for all files of one sequence, and for no others.
     std::string getSequenceKey() const;

@@ -1,4 +1,4 @@
-#include "files/osNumberedName.h"
+#include "browser/qtNumberedName.h"
 
 #include <algorithm>
 #include <charconv>
@@ -37,7 +37,7 @@ std::string describeRange(std::uint64_t first, std::uint64_t last)
 
 } // namespace
 
-std::optional<OsNumberedName> OsNumberedName::parse(std::string const& name)
+std::optional<QtNumberedName> QtNumberedName::parse(std::string const& name)
 {
     std::size_t end = findExtension(name);
     while (end > 0)
@@ -50,7 +50,7 @@ std::optional<OsNumberedName> OsNumberedName::parse(std::string const& name)
         std::size_t const digits = end - begin;
         if (digits >= leastDigits && digits <= mostDigits)
         {
-            OsNumberedName parsed{name.substr(0, begin), name.substr(end), static_cast<int>(digits), 0};
+            QtNumberedName parsed{name.substr(0, begin), name.substr(end), static_cast<int>(digits), 0};
             std::from_chars(name.data() + begin, name.data() + end, parsed.number);
             return parsed;
         }
@@ -59,17 +59,17 @@ std::optional<OsNumberedName> OsNumberedName::parse(std::string const& name)
     return std::nullopt;
 }
 
-std::string OsNumberedName::getSequenceKey() const
+std::string QtNumberedName::getSequenceKey() const
 {
     return prefix + '/' + std::to_string(digits) + '/' + suffix;
 }
 
-std::string OsNumberedName::getPattern() const
+std::string QtNumberedName::getPattern() const
 {
     return prefix + std::string(static_cast<std::size_t>(digits), '#') + suffix;
 }
 
-std::string OsNumberedName::describe(std::vector<std::uint64_t> const& numbers)
+std::string QtNumberedName::describe(std::vector<std::uint64_t> const& numbers)
 {
     std::string text;
     int rangeCount = 0;
