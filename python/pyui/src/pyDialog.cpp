@@ -3,18 +3,15 @@
 #include "pyDialog.h"
 
 #include "evPointerEvent.h"
-#include "pyErrorNote.h"
 #include "pyUiError.h"
+#include "pyWidgetValue.h"
 #include "uiAppDisabler.h"
 #include "uiApplication.h"
 #include "uiColorRegistry.h"
 #include "uiCursorGuard.h"
-#include "uiDualState.h"
 #include "uiLabel.h"
-#include "uiMenu.h"
 #include "uiMoveContainer.h"
 #include "uiPushButton.h"
-#include "uiTextField.h"
 #include "uiWidgetFactory.h"
 #include "uiWidgetPredicate.h"
 #include "wsCursorRegistry.h"
@@ -44,71 +41,10 @@ int sizeOnScreen(int wanted, int screen)
     return wanted < 1 ? static_cast<int>(static_cast<float>(screen) * 0.8F) : wanted;
 }
 
-/// The face for events of a widget of one of the four kinds that raise any; null for every other.
+/// The face for events of a widget that raises any; null for every other.
 RCShdPtr<PiWidget> findEventFace(RCShdPtr<UiWidget> const& widget)
 {
-    bool const raisesEvents = dynamicCast<UiTextField>(widget) || dynamicCast<UiDualState>(widget) ||
-                              dynamicCast<UiMenu>(widget) || dynamicCast<UiPushButton>(widget);
-    return raisesEvents ? widget->getPiWidget() : nullptr;
-}
-
-bool hasValue(RCShdPtr<UiWidget> const& widget)
-{
-    return dynamicCast<UiTextField>(widget) || dynamicCast<UiDualState>(widget) || dynamicCast<UiMenu>(widget);
-}
-
-/// The value of a widget that has one.
-bp::object readValue(RCShdPtr<UiWidget> const& widget)
-{
-    if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
-        return bp::object(field->getString());
-    if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
-        return bp::object(toggle->getState());
-    return bp::object(dynamicCast<UiMenu>(widget)->getStrPtr());
-}
-
-/// A text, or null for None. Boost.Python hides the error of a text that has no UTF-8 behind one about its type.
-char const* readText(bp::object const& value)
-{
-    bp::extract<char const*> text(value);
-    if (!text.check() && PyErr_Occurred())
-        bp::throw_error_already_set();
-    return text();
-}
-
-enum class MenuEntries
-{
-    Replace,
-    Add,
-};
-
-/// Gives the index that the value selects.
-int fillMenu(UiMenu& menu, bp::object const& value, MenuEntries mode)
-{
-    bp::tuple const form = bp::extract<bp::tuple>(value);
-    bp::list const entries = bp::extract<bp::list>(form[0]);
-    int const count = bp::extract<int>(entries.attr("__len__")());
-    if (mode == MenuEntries::Replace)
-        menu.removeAll();
-    for (int i = 0; i < count; ++i)
-        menu.append(bp::extract<std::string>(entries[i])().c_str());
-    return bp::extract<int>(form[1]);
-}
-
-/// Writes the value of a widget that has one. What the setters raise, by callbacks, is not about the value.
-void writeValue(RCShdPtr<UiWidget> const& widget, bp::object const& value, MenuEntries mode, bool invokeCallback)
-{
-    auto const read = [&](auto action, char const* form)
-    { return withNote(action, [&] { return describeValue(form, widget->getName(), value); }); };
-    if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
-        field->setString(read([&] { return readText(value); }, textFieldForm), UiTextField::End, false, invokeCallback);
-    else if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
-        toggle->setState(read([&] { return bp::extract<bool>(value)(); }, toggleButtonForm), invokeCallback);
-    else
-    {
-        RCShdPtr<UiMenu> const menu = dynamicCast<UiMenu>(widget);
-        menu->setSelection(read([&] { return fillMenu(*menu, value, mode); }, menuForm), invokeCallback);
-    }
+    return hasValue(widget) || dynamicCast<UiPushButton>(widget) ? widget->getPiWidget() : nullptr;
 }
 
 } // namespace

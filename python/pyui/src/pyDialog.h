@@ -7,7 +7,6 @@
 #include "kvExport.h"
 #include "pointers/rcShdPtr.h"
 #include "pointers/rcStrongPtr.h"
-#include "pyCallables.h"
 #include "pyWidgetCbs.h"
 #include "uiAppMgr.h"
 #include "uiContainer.h"

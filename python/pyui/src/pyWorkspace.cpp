@@ -8,14 +8,11 @@
 #include "piNode.h"
 #include "pointers/rcWeakAccessor.h"
 #include "pointers/uPtr.h"
-#include "pyCompat.h"
 #include "pyUiError.h"
 #include "snSelection.h"
 #include "uiCompositionWorkspaceClientInterface.h"
 #include "uiView.h"
 #include "uiWorkspace.h"
-
-#include <cstring>
 
 namespace bp = boost::python;
 
@@ -91,14 +88,6 @@ RCShdPtr<UiView> findView(UiWidget const& widget)
     return nullptr;
 }
 
-/// In the bytes of the file system, as all paths cross.
-bp::object toPythonPath(LiString const& path)
-{
-    char const* const text = path.getChars();
-    return bp::object(
-        bp::handle<>(PyextUi::PyCompat::pathFromStringAndSize(text, static_cast<Py_ssize_t>(std::strlen(text)))));
-}
-
 } // namespace
 
 RCShdPtr<ManagedGraph> Workspace::getCurrentComposition()
@@ -159,7 +148,7 @@ bp::list Workspace::getBrowserSelection()
     using Convert = SnItemConvert<RCShdPtr<BrBrowsable>>;
     RCShdPtr<const SnSelection> const browsables = selection->filter(Convert::getPredicate());
     for (RCShdPtr<const SnItem> const& item : *browsables)
-        paths.append(toPythonPath(Convert::get(item)->getPath()));
+        paths.append(OsFilePath(Convert::get(item)->getPath().toString()));
     return paths;
 }
 

@@ -4,7 +4,7 @@
 
 #include "files/osFilePath.h"
 #include "pointers/rcShdPtr.h"
-#include "pyManagedGraph.h"
+#include "pyGraph.h"
 
 namespace Kv
 {

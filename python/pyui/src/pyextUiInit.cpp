@@ -3,11 +3,9 @@
 #include "packages/inBuildInfoUtil.h"
 #include "packages/inInit.h"
 #include "piBrowserSchemes.h"
-#include "pyArgumentNote.h"
-#include "pyCompat.h"
 #include "pyConvenienceFunctions.h"
 #include "pyManagedDialog.h"
-#include "pySharedClass.h"
+#include "pyModule.h"
 #include "pyUiError.h"
 #include "pyWorkspace.h"
 #include "pyextUiDocs.h"
@@ -86,16 +84,12 @@ bp::handle<> importGraphModule()
     std::string const name = "libKVpyextGraph";
     std::string const fullName = "quorvane_velmora.libs." + name;
     auto const import = [](std::string const& moduleName)
-    { return PyImport_ImportModuleLevel(moduleName.c_str(), nullptr, nullptr, nullptr, PyCompat::importLevel); };
-    PyObject* module = import(fullName);
-    if (!module)
-    {
-        PyErr_Clear();
-        module = import(name);
-    }
-    if (!module)
-        bp::throw_error_already_set();
-    return bp::handle<>(module);
+    { return PyImport_ImportModuleLevel(moduleName.c_str(), nullptr, nullptr, nullptr, 0); };
+    bp::handle<> const module(bp::allow_null(import(fullName)));
+    if (module)
+        return module;
+    PyErr_Clear();
+    return bp::handle<>(import(name));
 }
 
 template <typename Overloads, typename Function, std::size_t count>
@@ -238,20 +232,7 @@ void moduleBody()
 
 } // namespace Kv::PyextUi
 
-#if PY_MAJOR_VERSION >= 3
-
 extern "C" KV_API PyObject* PyInit_libKVpyextUi()
 {
-    static PyModuleDef definition{
-        PyModuleDef_HEAD_INIT, "libKVpyextUi", nullptr, -1, nullptr, nullptr, nullptr, nullptr, nullptr};
-    return Kv::PyextUi::PyCompat::initModule(definition, &Kv::PyextUi::moduleBody);
+    return Kv::PyextInit::initModule<&Kv::PyextUi::moduleBody>("libKVpyextUi");
 }
-
-#else
-
-BOOST_PYTHON_MODULE(libKVpyextUi)
-{
-    Kv::PyextUi::moduleBody();
-}
-
-#endif

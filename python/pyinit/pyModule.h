@@ -5,6 +5,19 @@
 namespace Kv::PyextInit
 {
 
+/// Makes the extension module of that name by running its body; for the module's entry function. Boost.Python gives the
+/// module also where the body has failed, which the interpreter takes for a fault of its own.
+template <void (*body)()> PyObject* initModule(char const* name)
+{
+    static PyModuleDef definition{
+        PyModuleDef_HEAD_INIT, name, nullptr, -1, nullptr, nullptr, nullptr, nullptr, nullptr};
+    PyObject* const module = boost::python::detail::init_module(definition, body);
+    if (!PyErr_Occurred())
+        return module;
+    Py_XDECREF(module);
+    return nullptr;
+}
+
 /// The package and the bare name of an extension module are two modules of one process, and its body runs for each.
 /// They share one class for each type, so that what a script has from the one is good for the other. True if the class
 /// of `T` is there already; it has then become the attribute `name` of the module whose body runs.
