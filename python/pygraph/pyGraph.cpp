@@ -15,7 +15,7 @@ namespace Kv::PyextGraph
 namespace
 {
 
-/// To a script, what the graph refuses is no other failure than what the module itself refuses.
+/// Runs `action`. What the graph refuses is a failure of the module to a script.
 template <typename Action> auto runForScript(Action const& action)
 {
     try

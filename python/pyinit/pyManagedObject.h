@@ -13,7 +13,7 @@
 namespace Kv
 {
 
-/// Base of what is handed to Python by reference: knows the interpreter that it was handed to.
+/// Base of the objects that are handed to Python by reference. It knows the interpreter that it was handed to.
 class KV_API PyManagedObjectBase : public RCBase<LkCounter<int>>
 {
 public:

@@ -94,7 +94,7 @@ public:
 
     BrBrowserFloatingHandler& getHandler() { return *_handler; }
 
-    /// What was picked; empty if nothing was.
+    /// The path that was picked; empty if none was.
     OsFilePath const& getPath() const { return _path; }
 
 private:

@@ -29,16 +29,21 @@ namespace Kv::PyextUi
 namespace
 {
 
-// In pixels: what the title takes of a window of its own, and of a floating container.
+// In pixels: the height of the title in a window of its own, and in a floating container.
 constexpr int titleHeight = 24;
 constexpr int floatingTitleHeight = 25;
 
-/// More than any window, and far from where sums of sizes end.
+/// Larger than any window, and small enough for sums of sizes.
 constexpr int maxSize = 1 << 23;
 
 int sizeOnScreen(int wanted, int screen)
 {
     return wanted < 1 ? static_cast<int>(static_cast<float>(screen) * 0.8F) : wanted;
+}
+
+GeRectangle<int> makeFrame(int x, int y, int width, int height)
+{
+    return {x, x + width, y, y + height};
 }
 
 /// The face for events of a widget that raises any; null for every other.
@@ -82,11 +87,8 @@ void Dialog::createUi(Positionner const& position)
     if (_topLevel.isNull())
     {
         GeVector2<int> const screen = WsScreen::getInstance().getSize();
-        GeRectangle<int> frame;
-        frame.xMin = (screen.x - width) / 2;
-        frame.yMin = (screen.y - height) / 2;
-        frame.xMax = frame.xMin + width;
-        frame.yMax = frame.yMin + height + titleHeight;
+        GeRectangle<int> const frame =
+            makeFrame((screen.x - width) / 2, (screen.y - height) / 2, width, height + titleHeight);
         RCShdPtr<WsWindowStyle> const style = WsWindowStyleUtils::getNormalWindowStyle(
             frame, 0, BorderStyle(0), TitleBarStyle(0), TaskBarStyle(0), StackingStyle(0), CloseButtonStyle(1));
         _topLevel = UiTopLevel::create(_title.c_str(), _title.c_str(), style, nullptr);
@@ -119,12 +121,9 @@ RCShdPtr<UiContainer> Dialog::createFloatingContainer(int width, int height, int
     GeRectangle<int> const size = panel->getRect();
     RCShdPtr<UiContainer> container = UiMoveContainer::create(panel, "Whatever", nullptr);
     GeRectangle<int> const place = panel->getRect();
-    GeRectangle<int> rect;
-    rect.xMin = size.getWidth() / 2 - width / 2 + place.xMin;
-    rect.yMin = size.getHeight() / divisions * position - height / 2 + place.yMin;
-    rect.xMax = rect.xMin + width;
-    rect.yMax = rect.yMin + height + floatingTitleHeight;
-    container->setRect(rect, true);
+    int const x = size.getWidth() / 2 - width / 2 + place.xMin;
+    int const y = size.getHeight() / divisions * position - height / 2 + place.yMin;
+    container->setRect(makeFrame(x, y, width, height + floatingTitleHeight), true);
     createTitleBar(container, title);
     container->setKeyboardFocusable(true);
     if (RCShdPtr<UiContainer> const root = container->getWindow()->getRootContainer())

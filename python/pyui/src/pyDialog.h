@@ -50,8 +50,8 @@ public:
     Dialog& operator=(Dialog const&) = delete;
     ~Dialog() override;
 
-    /// Shows the dialog and blocks until a close button ends it. Gives the button's name. What a script's callback
-    /// raises comes out of it.
+    /// Shows the dialog and blocks until a close button ends it. Gives the button's name. An exception that a
+    /// script's callback raises comes out of it.
     virtual std::string launch();
 
     /// Paints the window anew.
@@ -169,7 +169,7 @@ private:
 namespace Kv
 {
 
-// Whoever uses dialogs shares these with the module.
+// Users of dialogs share these with the module.
 extern template class KV_API RCBasePtr<PyextUi::Dialog>;
 extern template class KV_API Iterator<RCShdPtr<UiWidget>>;
 

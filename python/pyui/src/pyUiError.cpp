@@ -13,7 +13,7 @@ namespace Kv::PyextUi
 namespace
 {
 
-/// What `add_note` does, which Python has from 3.11 on.
+/// Does the work of `add_note`, which Python has from 3.11 on.
 void appendNote(bp::object error, bp::object const& note)
 {
     if (!PyObject_HasAttrString(error.ptr(), "__notes__"))
@@ -38,7 +38,7 @@ std::string join(Names const& names)
     return text;
 }
 
-/// What is wrong with `given`, arguments by name behind `count` ones by place; empty if nothing is.
+/// The fault of `given`, arguments by name behind `count` ones by place; empty if there is none.
 std::string findFault(Names const& parameters, std::size_t count, Names const& given)
 {
     if (parameters.empty())

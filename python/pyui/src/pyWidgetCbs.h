@@ -80,7 +80,7 @@ public:
     /// Wires a set of a script to a widget's events.
     void addPythonHandler(RCShdPtr<PiWidget> const& piWidget, RCStrongPtr<CallbackSet> const& set);
 
-    /// Lets go of what a set and its handler hold of each other. A dispatch under way goes on with both.
+    /// Lets a set and its handler go of each other. A dispatch under way goes on with both.
     static void release(RCStrongPtr<CallbackSet> const& set);
 
     /// Releases each set, first to last, and empties the vector.

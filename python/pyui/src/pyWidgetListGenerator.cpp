@@ -107,12 +107,12 @@ WidgetListGenerator::RowKind const& WidgetListGenerator::findRowKind(std::string
 {
     using Generator = WidgetListGenerator;
     static std::array<RowKind, 6> const kinds{{
-        {textFieldType, rightMargin, "r", &Generator::writeTextValue, textFieldForm},
-        {toggleButtonType, toggleButtonWidth, "w", &Generator::writeStateValue, toggleButtonForm},
-        {menuType, menuWidth, "w", &Generator::writeMenuValue, menuForm},
-        {labelType, 0, "r", &Generator::writeTextValue, labelForm},
-        {pushButtonType, 0, "w", nullptr, nullptr},
-        {"", rightMargin, "r", nullptr, nullptr},
+        {textFieldType, rightMargin, "r", &Generator::writeTextValue},
+        {toggleButtonType, toggleButtonWidth, "w", &Generator::writeStateValue},
+        {menuType, menuWidth, "w", &Generator::writeMenuValue},
+        {labelType, 0, "r", &Generator::writeTextValue},
+        {pushButtonType, 0, "w", nullptr},
+        {"", rightMargin, "r", nullptr},
     }};
     return *std::find_if(kinds.begin(), kinds.end() - 1, [&type](RowKind const& kind) { return kind.name == type; });
 }
@@ -191,8 +191,7 @@ void WidgetListGenerator::writeRow(WidgetEntry const& entry, int rowOffset)
     int const x2Value = entry.type == pushButtonType ? measureInUnits(entry.name) + pushButtonMargin : kind.x2Value;
     openRowWidget(entry.type, entry.name, rowOffset, x2Value, kind.x2Target);
     if (kind.writeValue)
-        withNote([&] { writeValue(kind, entry); },
-                 [&] { return describeValue(kind.valueForm, entry.name, entry.value); });
+        withNote([&] { writeValue(kind, entry); }, [&] { return describeValue(kind.name, entry.name, entry.value); });
     closeWidget();
 }
 

@@ -53,7 +53,6 @@ private:
         int x2Value;
         std::string x2Target;
         void (WidgetListGenerator::*writeValue)(boost::python::object const&);
-        char const* valueForm;
     };
 
     /// The place of an edge, as the description says it.

@@ -8,6 +8,8 @@
 #include "uiMenu.h"
 #include "uiTextField.h"
 
+#include <map>
+
 namespace bp = boost::python;
 
 namespace Kv::PyextUi
@@ -15,6 +17,13 @@ namespace Kv::PyextUi
 
 namespace
 {
+
+std::map<std::string, char const*> const forms{
+    {"TextField", "The text field %r takes a str or None"},
+    {"ToggleButton", "The toggle button %r takes a bool, an int or None"},
+    {"Menu", "The menu %r takes a tuple of a list of str and an index, as (['a', 'b'], 0)"},
+    {"Label", "The label %r takes a str or None"},
+};
 
 /// A text, or null for None. Boost.Python hides the error of a text that has no UTF-8 behind one about its type.
 char const* readText(bp::object const& value)
@@ -56,22 +65,22 @@ bp::object readValue(RCShdPtr<UiWidget> const& widget)
 
 void writeValue(RCShdPtr<UiWidget> const& widget, bp::object const& value, MenuEntries mode, bool invokeCallback)
 {
-    auto const read = [&](auto action, char const* form)
-    { return withNote(action, [&] { return describeValue(form, widget->getName(), value); }); };
+    auto const read = [&](auto action, char const* kind)
+    { return withNote(action, [&] { return describeValue(kind, widget->getName(), value); }); };
     if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
-        field->setString(read([&] { return readText(value); }, textFieldForm), UiTextField::End, false, invokeCallback);
+        field->setString(read([&] { return readText(value); }, "TextField"), UiTextField::End, false, invokeCallback);
     else if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
-        toggle->setState(read([&] { return bp::extract<bool>(value)(); }, toggleButtonForm), invokeCallback);
+        toggle->setState(read([&] { return bp::extract<bool>(value)(); }, "ToggleButton"), invokeCallback);
     else
     {
         RCShdPtr<UiMenu> const menu = dynamicCast<UiMenu>(widget);
-        menu->setSelection(read([&] { return fillMenu(*menu, value, mode); }, menuForm), invokeCallback);
+        menu->setSelection(read([&] { return fillMenu(*menu, value, mode); }, "Menu"), invokeCallback);
     }
 }
 
-bp::object describeValue(char const* form, std::string const& widgetName, bp::object const& value)
+bp::object describeValue(std::string const& kind, std::string const& widgetName, bp::object const& value)
 {
-    return bp::str(form) % bp::make_tuple(widgetName) + "; it was given " + toShortText(value);
+    return bp::str(forms.at(kind)) % bp::make_tuple(widgetName) + "; it was given " + toShortText(value);
 }
 
 } // namespace Kv::PyextUi

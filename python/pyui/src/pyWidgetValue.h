@@ -10,7 +10,7 @@
 namespace Kv::PyextUi
 {
 
-// The values of widgets as scripts see them. All that depends on the kind of widget stands in the source of this file.
+// The values of widgets as scripts see them. The source of this file knows the kinds that have one.
 
 /// True for a widget of a kind that has a value.
 bool hasValue(RCShdPtr<UiWidget> const& widget);
@@ -29,14 +29,8 @@ enum class MenuEntries
 void writeValue(RCShdPtr<UiWidget> const& widget, boost::python::object const& value, MenuEntries mode,
                 bool invokeCallback);
 
-// The forms of the values, for `describeValue`.
-inline constexpr char const* textFieldForm = "The text field %r takes a str or None";
-inline constexpr char const* toggleButtonForm = "The toggle button %r takes a bool, an int or None";
-inline constexpr char const* menuForm = "The menu %r takes a tuple of a list of str and an index, as (['a', 'b'], 0)";
-inline constexpr char const* labelForm = "The label %r takes a str or None";
-
-/// Says what the widget of that name takes, and what it was given.
-boost::python::object describeValue(char const* form, std::string const& widgetName,
+/// Says what the widget of that name takes, and what it was given. `kind` is the kind's name in a description.
+boost::python::object describeValue(std::string const& kind, std::string const& widgetName,
                                     boost::python::object const& value);
 
 } // namespace Kv::PyextUi

@@ -9,7 +9,7 @@
 namespace Kv
 {
 
-/// What a script sees of the running application. Nothing is stored: every call asks the current workspace anew. Where
+/// The running application as a script sees it. Nothing is stored: every call asks the current workspace anew. Where
 /// there is no application, each throws `UiError`.
 class Workspace
 {
