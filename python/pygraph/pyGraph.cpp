@@ -15,7 +15,7 @@ namespace Kv::PyextGraph
 namespace
 {
 
-/// Runs `action`. What the graph refuses is a failure of the module to a script.
+/// Runs `action`. To a script, its failures are failures of the module.
 template <typename Action> auto runForScript(Action const& action)
 {
     try
@@ -105,7 +105,7 @@ GraphRO::Composition GraphRO::findComposition() const
 
 GraphRO::Composition GraphRO::requireComposition() const
 {
-    // Whoever shows the composition hears of changes on the thread that they come on.
+    // Those who show the composition hear of a change on the thread that makes it.
     runForScript([] { WsThread::require("Graph"); });
     Composition composition = findComposition();
     if (composition.isNull())

@@ -25,8 +25,8 @@ class KV_API GraphModule;
 /// The module's own failures. Scripts see them as `GraphError`.
 using GraphError = PyextInit::ModError<GraphModule>;
 
-/// The reading part of a composition as a script has it. It keeps the graph, but not the composition: once that is
-/// closed, whatever asks for it throws `GraphError`.
+/// The reading part of a composition as a script has it. It keeps the graph, but not the composition. Once that is
+/// closed, each operation that needs it throws `GraphError`.
 class KV_API GraphRO : public RCBase<LkCounter<int>>
 {
 public:
@@ -84,7 +84,7 @@ public:
     explicit Graph(RCShdPtr<const PiGraph> const& graph);
 
     /// Reads the file of a composition, which is writable if the file can be written now. Until a workspace opens it,
-    /// it is open for as long as the result. Throws `GraphError` for what is wrong with the file.
+    /// it is open for as long as the result. Throws `GraphError` for a fault of the file.
     static RCShdPtr<Graph> read(OsFilePath const& path);
 
     ~Graph() override;

@@ -5,8 +5,8 @@
 namespace Kv::PyextInit
 {
 
-/// Makes the extension module of that name by running its body; for the module's entry function. Boost.Python gives the
-/// module also where the body has failed, which the interpreter takes for a fault of its own.
+/// Makes the extension module of that name by running its body; for the module's entry function. Where the body has
+/// failed, Boost.Python would give the module all the same, and the interpreter would hide the failure behind its own.
 template <void (*body)()> PyObject* initModule(char const* name)
 {
     static PyModuleDef definition{
@@ -18,9 +18,9 @@ template <void (*body)()> PyObject* initModule(char const* name)
     return nullptr;
 }
 
-/// The package and the bare name of an extension module are two modules of one process, and its body runs for each.
-/// They share one class for each type, so that what a script has from the one is good for the other. True if the class
-/// of `T` is there already; it has then become the attribute `name` of the module whose body runs.
+/// Makes the class of `T` the attribute `name` of the module whose body runs. False if there is no such class yet. The
+/// package and the bare name of an extension module are two modules of one process, and its body runs for each. They
+/// share their classes, so that objects of the one are good for the other.
 template <typename T> bool shareClass(char const* name)
 {
     namespace bp = boost::python;

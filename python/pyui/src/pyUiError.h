@@ -25,7 +25,7 @@ using NoteMaker = std::function<boost::python::object()>;
 /// made is left out.
 void addErrorNote(NoteMaker const& makeNote);
 
-/// Throws the exception that is being caught on as the Python error that scripts see of it, with a note.
+/// Throws the exception that is caught right now on, as the Python error that scripts see of it and with a note.
 [[noreturn]] void rethrowWithNote(NoteMaker const& makeNote);
 
 /// Runs `action` and gives its result. An exception that comes out of it gets a note.
@@ -55,8 +55,8 @@ void forEachEntry(boost::python::object const& list, int count, char const* list
         withNote([&] { action(i); }, [&] { return describeEntry(listName, i, list[i]); });
 }
 
-/// Has a function of Boost.Python say in a note why it cannot be called with the arguments by name that it was given.
-/// `parameters` are the names of its parameters in order, empty for those that go by place; without any all do.
+/// Lets a function of Boost.Python say in a note why it refuses the arguments by name that it was given. `parameters`
+/// are the names of its parameters in order, empty for those that go by place. Without any, all go by place.
 void explainArguments(boost::python::object const& function, std::vector<std::string> const& parameters);
 
 } // namespace Kv::PyextUi

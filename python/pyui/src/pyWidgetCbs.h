@@ -35,10 +35,9 @@ namespace Kv::PyextUi
 
 class Dialog;
 
-/// The callables of a dialog's script callbacks, kept in a Python dictionary, so that Python's garbage collector can
-/// follow a callable that refers to its own dialog. Each Python object that shares the dialog has a reference of its
-/// own to the dictionary, which it reports to the collector; while there is no such object, the dialog has the one
-/// reference.
+/// The callables of a dialog's script callbacks. They are kept in a Python dictionary, so that Python's garbage
+/// collector can follow a callable that refers to its own dialog. Each Python object that shares the dialog has one
+/// reference to the dictionary and reports it to the collector. Without such an object, the dialog has the only one.
 class PyCallables
 {
 public:

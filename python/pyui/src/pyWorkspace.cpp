@@ -139,7 +139,6 @@ bp::list Workspace::getBrowserSelection()
     if (focus.isNull())
         return paths;
     RCShdPtr<UiView> const view = findView(*focus);
-    // Scripts are told that the list is empty where no browser has the keyboard.
     if (view.isNull())
         return paths;
     RCShdPtr<SnSelection> const selection = view->getSelection();

@@ -58,9 +58,9 @@ namespace Kv::PyextUi
 namespace
 {
 
-/// Boost.Python binds a keyword list to the last parameters of an overload and takes its last name away for each
-/// overload that has a parameter less. The list names every parameter, the positional ones with nothing: one that is
-/// shorter ends the process when a script passes another parameter by name.
+/// The place of a parameter without a name in a keyword list, which must have one for every parameter. Boost.Python
+/// binds the list to the last parameters of an overload and takes its last name away for each overload that has a
+/// parameter less. A shorter list ends the process when a script passes another parameter by name.
 bp::arg positional()
 {
     return bp::arg("");
@@ -78,7 +78,7 @@ void instantiateAppMgr()
     UiAppMgr::getInstance();
 }
 
-/// Without it the converters for what the graph module hands out do not exist.
+/// Imports the module that has the converters for graphs.
 bp::handle<> importGraphModule()
 {
     std::string const name = "libKVpyextGraph";
