@@ -21,6 +21,49 @@ void appendNote(bp::object error, bp::object const& note)
     error.attr("__notes__").attr("append")(note);
 }
 
+} // namespace
+
+void addErrorNote(NoteMaker const& makeNote)
+{
+    PyObject* type = nullptr;
+    PyObject* value = nullptr;
+    PyObject* traceback = nullptr;
+    PyErr_Fetch(&type, &value, &traceback);
+    PyErr_NormalizeException(&type, &value, &traceback);
+    try
+    {
+        bp::object const note = makeNote();
+        if (!note.is_none())
+            appendNote(bp::object(bp::handle<>(bp::borrowed(value))), note);
+    }
+    catch (...)
+    {
+        bp::handle_exception();
+        PyErr_Clear();
+    }
+    PyErr_Restore(type, value, traceback);
+}
+
+void rethrowWithNote(NoteMaker const& makeNote)
+{
+    bp::handle_exception();
+    addErrorNote(makeNote);
+    throw bp::error_already_set();
+}
+
+bp::object toShortText(bp::object const& object)
+{
+    return bp::import("reprlib").attr("repr")(object);
+}
+
+bp::object describeEntry(char const* list, int index, bp::object const& entry)
+{
+    return bp::str("Entry [%d] of the %s is %s") % bp::make_tuple(index, list, toShortText(entry));
+}
+
+namespace
+{
+
 using Names = std::vector<std::string>;
 
 /// The names of the parameters, by function. A function that is gone leaves its entry to the next at its place.
@@ -104,44 +147,6 @@ PyTypeObject* getExplainedType(PyTypeObject* base)
 }
 
 } // namespace
-
-void addErrorNote(NoteMaker const& makeNote)
-{
-    PyObject* type = nullptr;
-    PyObject* value = nullptr;
-    PyObject* traceback = nullptr;
-    PyErr_Fetch(&type, &value, &traceback);
-    PyErr_NormalizeException(&type, &value, &traceback);
-    try
-    {
-        bp::object const note = makeNote();
-        if (!note.is_none())
-            appendNote(bp::object(bp::handle<>(bp::borrowed(value))), note);
-    }
-    catch (...)
-    {
-        bp::handle_exception();
-        PyErr_Clear();
-    }
-    PyErr_Restore(type, value, traceback);
-}
-
-void rethrowWithNote(NoteMaker const& makeNote)
-{
-    bp::handle_exception();
-    addErrorNote(makeNote);
-    throw bp::error_already_set();
-}
-
-bp::object toShortText(bp::object const& object)
-{
-    return bp::import("reprlib").attr("repr")(object);
-}
-
-bp::object describeEntry(char const* list, int index, bp::object const& entry)
-{
-    return bp::str("Entry [%d] of the %s is %s") % bp::make_tuple(index, list, toShortText(entry));
-}
 
 void explainArguments(bp::object const& function, Names const& parameters)
 {
