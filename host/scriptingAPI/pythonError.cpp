@@ -38,6 +38,17 @@ PythonError PythonError::fetch()
     return PythonError(value);
 }
 
+PythonError::PythonError(PythonError const&) = default;
+
+PythonError& PythonError::operator=(PythonError const&) = default;
+
+PythonError::~PythonError() = default;
+
+PyObject* PythonError::getException() const
+{
+    return _exception.get();
+}
+
 void PythonError::restore() const
 {
     PyObject* const value = _exception.get();

@@ -2,6 +2,8 @@
 
 #include "pyUiError.h"
 
+#include "pythonError.h"
+
 #include <algorithm>
 #include <map>
 
@@ -25,23 +27,19 @@ void appendNote(bp::object error, bp::object const& note)
 
 void addErrorNote(NoteMaker const& makeNote)
 {
-    PyObject* type = nullptr;
-    PyObject* value = nullptr;
-    PyObject* traceback = nullptr;
-    PyErr_Fetch(&type, &value, &traceback);
-    PyErr_NormalizeException(&type, &value, &traceback);
+    PythonError const error = PythonError::fetch();
     try
     {
         bp::object const note = makeNote();
         if (!note.is_none())
-            appendNote(bp::object(bp::handle<>(bp::borrowed(value))), note);
+            appendNote(bp::object(bp::handle<>(bp::borrowed(error.getException()))), note);
     }
     catch (...)
     {
         bp::handle_exception();
         PyErr_Clear();
     }
-    PyErr_Restore(type, value, traceback);
+    error.restore();
 }
 
 void rethrowWithNote(NoteMaker const& makeNote)
