@@ -78,12 +78,11 @@ std::string WidgetListGenerator::generate()
     writeContainerHead("MainContainer", {1, "u", "l"}, {1, "u", "b"}, {-1, "uu", "r"}, {-4, "uu", "t"});
     writeContainerHead(closeButtonsContainer, {0, "u", "l"}, {0, "u", "b"}, {0, "uu", "r"}, {closeBarHeight, "u", "h"});
     writeCloseButtons();
-    closeWidget();
+    closeTags(2);
     writeContainerHead("UserDefinedWidgetsContainer", {0, "u", "l"}, {1, "u", "s", closeButtonsContainer},
                        {0, "uu", "r"}, {0, "uu", "t"});
     int const labelColumnWidth = writeRows();
-    for (int i = 0; i < 4; ++i)
-        _writer->closeTag();
+    closeTags(4);
     std::string text = stream.str();
     _writer.reset();
     substitutePlaceholders(text, labelColumnWidth);
@@ -161,7 +160,7 @@ void WidgetListGenerator::writeCloseButton(std::string const& label, int x, int 
     else
         writeConstraint({x, "u", "l"}, {0, "u", "b"}, {width, "u", "w"}, {closeButtonHeight, "u", "h"});
     writeLabelAlign("Center", "Center");
-    closeWidget();
+    closeTags(2);
 }
 
 WidgetListGenerator::WidgetEntry WidgetListGenerator::readWidgetEntry(int index) const
@@ -185,14 +184,14 @@ void WidgetListGenerator::writeRow(WidgetEntry const& entry, int rowOffset)
     if (!entry.label.empty())
     {
         writeRowLabel(entry.label, rowOffset);
-        closeWidget();
+        closeTags(2);
     }
     RowKind const& kind = findRowKind(entry.type);
     int const x2Value = entry.type == pushButtonType ? measureInUnits(entry.name) + pushButtonMargin : kind.x2Value;
     openRowWidget(entry.type, entry.name, rowOffset, x2Value, kind.x2Target);
     if (kind.writeValue)
         withNote([&] { writeValue(kind, entry); }, [&] { return describeValue(kind.name, entry.name, entry.value); });
-    closeWidget();
+    closeTags(2);
 }
 
 void WidgetListGenerator::writeValue(RowKind const& kind, WidgetEntry const& entry)
@@ -228,10 +227,10 @@ void WidgetListGenerator::openWidget(std::string const& element, std::string con
     _writer->writeAttrib("Name", name);
 }
 
-void WidgetListGenerator::closeWidget()
+void WidgetListGenerator::closeTags(int count)
 {
-    _writer->closeTag();
-    _writer->closeTag();
+    for (int i = 0; i < count; ++i)
+        _writer->closeTag();
 }
 
 void WidgetListGenerator::writeConstraint(Edge const& x1, Edge const& y1, Edge const& x2, Edge const& y2)
@@ -242,8 +241,7 @@ void WidgetListGenerator::writeConstraint(Edge const& x1, Edge const& y1, Edge c
     writeEdge("Y1", y1);
     writeEdge("X2", x2);
     writeEdge("Y2", y2);
-    _writer->closeTag();
-    _writer->closeTag();
+    closeTags(2);
 }
 
 void WidgetListGenerator::writeEdge(std::string const& edge, Edge const& place)
@@ -270,8 +268,7 @@ void WidgetListGenerator::writeLabelAlign(std::string const& h, std::string cons
     _writer->openTag("Align");
     _writer->writeAttrib("H", h);
     _writer->writeAttrib("V", v);
-    _writer->closeTag();
-    _writer->closeTag();
+    closeTags(2);
 }
 
 void WidgetListGenerator::writeTextValue(bp::object const& value)

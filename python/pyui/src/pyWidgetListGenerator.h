@@ -84,7 +84,7 @@ private:
                        std::string const& x2Target);
     /// Leaves the element and its `Widget` open.
     void openWidget(std::string const& element, std::string const& name);
-    void closeWidget();
+    void closeTags(int count);
     void writeConstraint(Edge const& x1, Edge const& y1, Edge const& x2, Edge const& y2);
     void writeEdge(std::string const& edge, Edge const& place);
     void writeLabelString(std::string const& text);
