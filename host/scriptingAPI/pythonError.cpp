@@ -8,6 +8,7 @@ namespace
 
 using boost::python::allow_null;
 using boost::python::handle;
+using boost::python::incref;
 
 handle<> contextOf(PyObject* exception)
 {
@@ -38,11 +39,21 @@ PythonError PythonError::fetch()
     return PythonError(value);
 }
 
+PythonError::PythonError(PythonError const&) = default;
+
+PythonError& PythonError::operator=(PythonError const&) = default;
+
+PythonError::~PythonError() = default;
+
+PyObject* PythonError::getException() const
+{
+    return _exception.get();
+}
+
 void PythonError::restore() const
 {
     PyObject* const value = _exception.get();
-    PyErr_Restore(Py_NewRef(reinterpret_cast<PyObject*>(Py_TYPE(value))), Py_NewRef(value),
-                  PyException_GetTraceback(value));
+    PyErr_Restore(incref(reinterpret_cast<PyObject*>(Py_TYPE(value))), incref(value), PyException_GetTraceback(value));
 }
 
 bool PythonError::addContext(PythonError const& later) const
@@ -56,7 +67,7 @@ bool PythonError::addContext(PythonError const& later) const
             return false;
         last = next;
     }
-    PyException_SetContext(last.get(), Py_NewRef(later._exception.get()));
+    PyException_SetContext(last.get(), incref(later._exception.get()));
     return true;
 }
 

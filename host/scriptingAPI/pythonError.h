@@ -4,16 +4,25 @@
 
 #include <boost/python/handle.hpp>
 
+#include "kvExport.h"
+
 namespace Kv
 {
 
 /// A Python error that was taken off the interpreter, to be put back later. Made, copied and dropped with the
 /// interpreter lock held.
-class PythonError
+class KV_API PythonError
 {
 public:
     /// Takes the error that is set.
     static PythonError fetch();
+
+    PythonError(PythonError const&);
+    PythonError& operator=(PythonError const&);
+    ~PythonError();
+
+    /// The exception object, borrowed.
+    PyObject* getException() const;
 
     /// Sets the error again.
     void restore() const;

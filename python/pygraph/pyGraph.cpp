@@ -2,10 +2,10 @@
 
 #include "pyGraph.h"
 
-#include "pyGraphError.h"
-#include "pyManagedGraph.h"
 #include "text/liString.h"
 #include "wsThread.h"
+
+#include <functional>
 
 namespace bp = boost::python;
 
@@ -15,7 +15,7 @@ namespace Kv::PyextGraph
 namespace
 {
 
-/// To a script, what the graph refuses is no other failure than what the module itself refuses.
+/// Runs `action`. To a script, its failures are failures of the module.
 template <typename Action> auto runForScript(Action const& action)
 {
     try
@@ -28,7 +28,105 @@ template <typename Action> auto runForScript(Action const& action)
     }
 }
 
+bp::dict toDict(PiNode::NamedTexts const& texts)
+{
+    bp::dict result;
+    for (auto const& text : texts)
+        result[text.first] = text.second;
+    return result;
+}
+
 } // namespace
+
+GraphRO::GraphRO(RCShdPtr<const PiGraph> const& graph) : _graph(graph)
+{
+    if (graph.isNull())
+        RCExUtil::throwExNullPtr(typeid(PiGraph const*).name());
+}
+
+GraphRO::~GraphRO() = default;
+
+RCShdPtr<const PiGraph> GraphRO::getPiGraphRO() const
+{
+    return _graph;
+}
+
+OsFilePath GraphRO::getName() const
+{
+    requireComposition();
+    return OsFilePath(_graph->getName());
+}
+
+OsFilePath GraphRO::getPath() const
+{
+    return requireComposition()->getPath();
+}
+
+bp::list GraphRO::getNodes() const
+{
+    requireComposition();
+    bp::list names;
+    for (RCShdPtr<const PiNode> const& node : _graph->getNodes())
+        names.append(node->getName());
+    return names;
+}
+
+std::string GraphRO::getNodeType(std::string const& nodeName) const
+{
+    return requireNode(nodeName)->getType();
+}
+
+bp::dict GraphRO::getNodeInputs(std::string const& nodeName) const
+{
+    return toDict(requireNode(nodeName)->getInputs());
+}
+
+bp::dict GraphRO::getNodeValues(std::string const& nodeName) const
+{
+    return toDict(requireNode(nodeName)->getValues());
+}
+
+bool GraphRO::isSameGraph(GraphRO const& other) const
+{
+    return _graph == other._graph;
+}
+
+std::size_t GraphRO::getHash() const
+{
+    return std::hash<PiGraph const*>()(_graph.get());
+}
+
+GraphRO::Composition GraphRO::findComposition() const
+{
+    RCWeakAccessor<const PiNodeController> const controller(_graph->getController());
+    return Composition(controller.isNull() ? RCWeakPtr<const PiCompositionGraphInterface>()
+                                           : controller.castTo<const PiCompositionGraphInterface>());
+}
+
+GraphRO::Composition GraphRO::requireComposition() const
+{
+    // Those who show the composition hear of a change on the thread that makes it.
+    runForScript([] { WsThread::require("Graph"); });
+    Composition composition = findComposition();
+    if (composition.isNull())
+        refuse("has been closed.");
+    return composition;
+}
+
+void GraphRO::refuse(std::string const& why) const
+{
+    throw GraphError(__FILE__, __LINE__,
+                     ("The composition " + LiStringUtil::getPrintable(_graph->getName()) + " " + why).c_str());
+}
+
+RCShdPtr<const PiNode> GraphRO::requireNode(std::string const& name) const
+{
+    requireComposition();
+    RCShdPtr<const PiNode> node = _graph->findNode(name);
+    if (node.isNull())
+        refuse("has no node " + LiStringUtil::getPrintable(name) + ".");
+    return node;
+}
 
 Graph::Graph(RCShdPtr<PiGraph> const& graph) : GraphRO(graph), _writableGraph(graph) {}
 
@@ -84,10 +182,7 @@ PiGraph& Graph::requireWritable() const
 {
     requireComposition();
     if (_writableGraph.isNull())
-        throw GraphError(__FILE__, __LINE__,
-                         ("The composition " + LiStringUtil::getPrintable(getPiGraphRO()->getName()) +
-                          " is read-only: its file could not be written when this Graph was handed out.")
-                             .c_str());
+        refuse("is read-only: its file could not be written when this Graph was handed out.");
     return *_writableGraph;
 }
 
@@ -96,6 +191,7 @@ PiGraph& Graph::requireWritable() const
 namespace Kv
 {
 
+template class PyextInit::ModError<PyextGraph::GraphModule>;
 template class PyManagedObject<RCShdPtr<PyextGraph::Graph>>;
 
 } // namespace Kv

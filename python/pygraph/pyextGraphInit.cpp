@@ -1,8 +1,7 @@
 #include <boost/python.hpp>
 
-#include "pyGraphError.h"
-#include "pyManagedGraph.h"
-#include "pySharedClass.h"
+#include "pyGraph.h"
+#include "pyModule.h"
 #include "pyextGraphDocs.h"
 
 namespace bp = boost::python;
@@ -17,11 +16,6 @@ bool isEqual(Graph const& graph, bp::object const& other)
 {
     bp::extract<Graph const&> const otherGraph(other);
     return otherGraph.check() && graph.isSameGraph(otherGraph());
-}
-
-bool isUnequal(Graph const& graph, bp::object const& other)
-{
-    return !isEqual(graph, other);
 }
 
 RCShdPtr<ManagedGraph> readComposition(OsFilePath const& path)
@@ -44,7 +38,6 @@ void registerGraph()
         .def("setNodeValue", &Graph::setNodeValue, Docs::setNodeValue)
         .def("save", &Graph::save, Docs::save)
         .def("__eq__", &isEqual)
-        .def("__ne__", &isUnequal)
         .def("__hash__", &Graph::getHash)
         .def("__repr__", &Graph::describe);
 }
@@ -68,7 +61,7 @@ void moduleBody()
 
 } // namespace Kv::PyextGraph
 
-BOOST_PYTHON_MODULE(libKVpyextGraph)
+extern "C" KV_API PyObject* PyInit_libKVpyextGraph()
 {
-    Kv::PyextGraph::moduleBody();
+    return Kv::PyextInit::initModule<&Kv::PyextGraph::moduleBody>("libKVpyextGraph");
 }

@@ -3,12 +3,36 @@
 #include <Python.h>
 
 #include "exBase.h"
-#include "pyInitError.h"
+#include "kvExport.h"
 
 #include <string>
 
 namespace Kv::PyextInit
 {
+
+/// Base of the exceptions that extension modules raise on their own account.
+class KV_API Error : public ExBase
+{
+public:
+    /// `modName` is the module as scripts call it. The reason stays as it is given.
+    Error(char const* sourcePath, int line, char const* modName, char const* reason);
+    Error(Error const&);
+    Error& operator=(Error const&);
+    ~Error() override;
+
+    std::string const& getModName() const { return _modName; }
+
+    ExBase* clone() const override;
+    [[noreturn]] void raise() const override;
+
+    /// The Python exception type `modName.className`, derived from `Exception`. The same names give the same type
+    /// again; it lasts as long as the process. Within a module body the type becomes the module's attribute
+    /// `className`.
+    static void* newException(std::string const& modName, std::string const& className);
+
+private:
+    std::string _modName;
+};
 
 /// The one exception of an extension module, which `Tag` stands for. A module instantiates it once and exports it.
 /// Scripts see it as the Python type that `initialize` makes, with the reason as its text.
@@ -32,7 +56,7 @@ public:
     /// Sets the Python error of the module's type; for Boost.Python.
     static void exceptionTranslator(ModError const& error);
 
-    /// There is nothing to take down: the type lasts as long as the process.
+    /// Does nothing: the type lasts as long as the process.
     static void finalize() {}
 
 private:

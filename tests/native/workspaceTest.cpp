@@ -1,7 +1,7 @@
 #include <boost/python.hpp>
 
 #include "brBrowsable.h"
-#include "pyManagedGraph.h"
+#include "pyGraph.h"
 #include "uiCompositionWorkspace.h"
 #include "uiLabel.h"
 #include "uiWorkspace.h"

@@ -66,6 +66,26 @@ for attempt in range(2):
 ''', PYTHONPATH=str(tmp_path))
 
 
+def test_an_import_that_runs_out_of_stack_says_so():
+    run_script('''
+import sys, _imp
+from importlib.machinery import PathFinder
+def try_depths(name):
+    spec = PathFinder.find_spec(name)
+    def load(depth):
+        return load(depth - 1) if depth else _imp.create_dynamic(spec)
+    failures = 0
+    for depth in range(sys.getrecursionlimit(), 0, -1):
+        try:
+            sys.modules[name] = load(depth)
+            return failures
+        except RecursionError:
+            failures += 1
+assert try_depths('libKVpyextGraph')
+assert try_depths('libKVpyextUi')
+''', PYTHONPATH=LIBS)
+
+
 def test_the_toolkit_is_loaded_only_where_a_text_must_be_measured():
     run_script('''
 def toolkit():

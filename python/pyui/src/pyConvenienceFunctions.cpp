@@ -8,8 +8,6 @@
 #include "packages/inBuildInfo.h"
 #include "piBrowserSchemes.h"
 #include "pointers/plainPtr.h"
-#include "pyCompat.h"
-#include "pyErrorNote.h"
 #include "pyUiError.h"
 #include "pyUtils.h"
 #include "pyWidgetListGenerator.h"
@@ -84,11 +82,6 @@ std::string toVisible(std::string const& line)
     return visible;
 }
 
-bp::object toPyPath(std::string const& path)
-{
-    return bp::object(bp::handle<>(PyCompat::pathFromStringAndSize(path.data(), static_cast<Py_ssize_t>(path.size()))));
-}
-
 /// One run of the application's browser, for picking a path.
 class PyBrowser
 {
@@ -100,7 +93,7 @@ public:
 
     BrBrowserFloatingHandler& getHandler() { return *_handler; }
 
-    /// What was picked; empty if nothing was.
+    /// The path that was picked; empty if none was.
     OsFilePath const& getPath() const { return _path; }
 
 private:
@@ -151,13 +144,11 @@ void PyBrowser::onActivate(EvEvent&)
 
 OsFilePath PyBrowser::validate(std::string const& focusPath, std::string const& currentPath) const
 {
-    bp::object const focus = toPyPath(focusPath);
-    bp::object const current = toPyPath(currentPath);
-    bp::handle<> const result(
-        bp::allow_null(PyObject_CallFunction(_pathValidationCb.ptr(), "(OO)", focus.ptr(), current.ptr())));
-    if (!result)
-        bp::throw_error_already_set();
-    return bp::extract<OsFilePath>(bp::object(result));
+    bp::object const focus{OsFilePath(focusPath)};
+    bp::object const current{OsFilePath(currentPath)};
+    bp::object const result(
+        bp::handle<>(PyObject_CallFunction(_pathValidationCb.ptr(), "(OO)", focus.ptr(), current.ptr())));
+    return bp::extract<OsFilePath>(result);
 }
 
 } // namespace
@@ -200,13 +191,13 @@ std::string showMessageBox(std::string const& title, bp::list const& messages, b
     int const height = heightFor(lineCount);
     int contentWidth = closeButtonWidth * buttonCount - closeButtonGap;
     bp::list widgets;
-    for (int i = 0; i < lineCount; ++i)
-    {
-        std::string const line = toVisible(withNote([&] { return bp::extract<std::string>(messages[i])(); },
-                                                    [&] { return describeEntry("list of messages", i, messages[i]); }));
-        contentWidth = std::max(contentWidth, measureInUnits(line));
-        widgets.append(bp::make_tuple("Label", "Msg", "", line));
-    }
+    forEachEntry(messages, lineCount, "list of messages",
+                 [&](int i)
+                 {
+                     std::string const line = toVisible(bp::extract<std::string>(messages[i]));
+                     contentWidth = std::max(contentWidth, measureInUnits(line));
+                     widgets.append(bp::make_tuple("Label", "Msg", "", line));
+                 });
     contentWidth += sideMargin;
     int const width = static_cast<int>(static_cast<float>(contentWidth) * UiConstraint::getUIGrid().x);
     std::string const xmlString = WidgetListGenerator(widgets, closeButtons).generate();

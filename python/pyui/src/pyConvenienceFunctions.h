@@ -38,10 +38,10 @@ std::string showMessageBox(std::string const& title, boost::python::list const& 
 std::string makeXmlFromWidgetList(boost::python::list const& widgets,
                                   boost::python::list const& closeButtons = boost::python::list());
 
-/// Lets the user pick a path in the application's file browser, first at `initialPath` if that exists. On OK
-/// `pathValidationCb`, if it can be called, gets the path in focus, empty if there is none, and the current directory;
-/// what it gives is the path, and the empty one keeps the browser open. Without it the path is the one in focus, else
-/// the directory. Gives the empty path on Cancel. Throws `UiError` outside the application.
+/// Lets the user pick a path in the application's file browser, which begins at `initialPath` if that exists. On OK it
+/// calls `pathValidationCb` with the path in focus, empty if there is none, and the current directory. The callback
+/// gives the path, or the empty one to keep the browser open. Without a callback that can be called, the path is the
+/// one in focus, else the directory. Gives the empty path on Cancel. Throws `UiError` outside the application.
 OsFilePath showBrowser(std::string const& title, OsFilePath const& initialPath = OsFilePath(),
                        boost::python::object const& pathValidationCb = boost::python::object());
 

@@ -3,18 +3,15 @@
 #include "pyDialog.h"
 
 #include "evPointerEvent.h"
-#include "pyErrorNote.h"
 #include "pyUiError.h"
+#include "pyWidgetValue.h"
 #include "uiAppMgr.h"
 #include "uiApplication.h"
 #include "uiCursorGuard.h"
-#include "uiDualState.h"
 #include "uiLabel.h"
 #include "uiLook.h"
-#include "uiMenu.h"
 #include "uiMoveContainer.h"
 #include "uiPushButton.h"
-#include "uiTextField.h"
 #include "uiWidgetFactory.h"
 #include "uiWidgetPredicate.h"
 #include "wsCursorRegistry.h"
@@ -32,11 +29,11 @@ namespace Kv::PyextUi
 namespace
 {
 
-// In pixels: what the title takes of a window of its own, and of a floating container.
+// In pixels: the height of the title in a window of its own, and in a floating container.
 constexpr int titleHeight = 24;
 constexpr int floatingTitleHeight = 25;
 
-/// More than any window, and far from where sums of sizes end.
+/// Larger than any window, and small enough for sums of sizes.
 constexpr int maxSize = 1 << 23;
 
 int sizeOnScreen(int wanted, int screen)
@@ -44,71 +41,15 @@ int sizeOnScreen(int wanted, int screen)
     return wanted < 1 ? static_cast<int>(static_cast<float>(screen) * 0.8F) : wanted;
 }
 
-/// The face for events of a widget of one of the four kinds that raise any; null for every other.
+GeRectangle<int> makeFrame(int x, int y, int width, int height)
+{
+    return {x, x + width, y, y + height};
+}
+
+/// The face for events of a widget that raises any; null for every other.
 RCShdPtr<PiWidget> findEventFace(RCShdPtr<UiWidget> const& widget)
 {
-    bool const raisesEvents = dynamicCast<UiTextField>(widget) || dynamicCast<UiDualState>(widget) ||
-                              dynamicCast<UiMenu>(widget) || dynamicCast<UiPushButton>(widget);
-    return raisesEvents ? widget->getPiWidget() : nullptr;
-}
-
-bool hasValue(RCShdPtr<UiWidget> const& widget)
-{
-    return dynamicCast<UiTextField>(widget) || dynamicCast<UiDualState>(widget) || dynamicCast<UiMenu>(widget);
-}
-
-/// The value of a widget that has one.
-bp::object readValue(RCShdPtr<UiWidget> const& widget)
-{
-    if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
-        return bp::object(field->getString());
-    if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
-        return bp::object(toggle->getState());
-    return bp::object(dynamicCast<UiMenu>(widget)->getStrPtr());
-}
-
-/// A text, or null for None. Boost.Python hides the error of a text that has no UTF-8 behind one about its type.
-char const* readText(bp::object const& value)
-{
-    bp::extract<char const*> text(value);
-    if (!text.check() && PyErr_Occurred())
-        bp::throw_error_already_set();
-    return text();
-}
-
-enum class MenuEntries
-{
-    Replace,
-    Add,
-};
-
-/// Gives the index that the value selects.
-int fillMenu(UiMenu& menu, bp::object const& value, MenuEntries mode)
-{
-    bp::tuple const form = bp::extract<bp::tuple>(value);
-    bp::list const entries = bp::extract<bp::list>(form[0]);
-    int const count = bp::extract<int>(entries.attr("__len__")());
-    if (mode == MenuEntries::Replace)
-        menu.removeAll();
-    for (int i = 0; i < count; ++i)
-        menu.append(bp::extract<std::string>(entries[i])().c_str());
-    return bp::extract<int>(form[1]);
-}
-
-/// Writes the value of a widget that has one. What the setters raise, by callbacks, is not about the value.
-void writeValue(RCShdPtr<UiWidget> const& widget, bp::object const& value, MenuEntries mode, bool invokeCallback)
-{
-    auto const read = [&](auto action, char const* form)
-    { return withNote(action, [&] { return describeValue(form, widget->getName(), value); }); };
-    if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
-        field->setString(read([&] { return readText(value); }, textFieldForm), UiTextField::End, false, invokeCallback);
-    else if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
-        toggle->setState(read([&] { return bp::extract<bool>(value)(); }, toggleButtonForm), invokeCallback);
-    else
-    {
-        RCShdPtr<UiMenu> const menu = dynamicCast<UiMenu>(widget);
-        menu->setSelection(read([&] { return fillMenu(*menu, value, mode); }, menuForm), invokeCallback);
-    }
+    return hasValue(widget) || dynamicCast<UiPushButton>(widget) ? widget->getPiWidget() : nullptr;
 }
 
 } // namespace
@@ -146,11 +87,8 @@ void Dialog::createUi(Positionner const& position)
     if (_topLevel.isNull())
     {
         GeVector2<int> const screen = WsScreen::getInstance().getSize();
-        GeRectangle<int> frame;
-        frame.xMin = (screen.x - width) / 2;
-        frame.yMin = (screen.y - height) / 2;
-        frame.xMax = frame.xMin + width;
-        frame.yMax = frame.yMin + height + titleHeight;
+        GeRectangle<int> const frame =
+            makeFrame((screen.x - width) / 2, (screen.y - height) / 2, width, height + titleHeight);
         RCShdPtr<WsWindowStyle> const style = WsWindowStyleUtils::getNormalWindowStyle(
             frame, 0, BorderStyle(0), TitleBarStyle(0), TaskBarStyle(0), StackingStyle(0), CloseButtonStyle(1));
         _topLevel = UiTopLevel::create(_title.c_str(), _title.c_str(), style, nullptr);
@@ -183,12 +121,9 @@ RCShdPtr<UiContainer> Dialog::createFloatingContainer(int width, int height, int
     GeRectangle<int> const size = panel->getRect();
     RCShdPtr<UiContainer> container = UiMoveContainer::create(panel, "Whatever", nullptr);
     GeRectangle<int> const place = panel->getRect();
-    GeRectangle<int> rect;
-    rect.xMin = size.getWidth() / 2 - width / 2 + place.xMin;
-    rect.yMin = size.getHeight() / divisions * position - height / 2 + place.yMin;
-    rect.xMax = rect.xMin + width;
-    rect.yMax = rect.yMin + height + floatingTitleHeight;
-    container->setRect(rect, true);
+    int const x = size.getWidth() / 2 - width / 2 + place.xMin;
+    int const y = size.getHeight() / divisions * position - height / 2 + place.yMin;
+    container->setRect(makeFrame(x, y, width, height + floatingTitleHeight), true);
     createTitleBar(container, title);
     container->setKeyboardFocusable(true);
     if (RCShdPtr<UiContainer> const root = container->getWindow()->getRootContainer())

@@ -8,7 +8,6 @@
 #include "piWidget.h"
 #include "pointers/rcShdPtr.h"
 #include "pointers/rcWeakPtr.h"
-#include "pyCallables.h"
 #include "pyWidgetCbs.h"
 #include "uiAppMgr.h"
 #include "uiContainer.h"
@@ -23,10 +22,9 @@ namespace Kv::PyextUi
 /// A push button whose name starts with this closes its dialog.
 inline std::string const closeButtonPrefix = "CloseButton_";
 
-/// A dialog: a window built from a description, whose widgets a script fills, reads and hears of, and which runs
-/// modally until one of its close buttons is pressed. Inside the application it floats in the main panel, otherwise it
-/// has a window of its own. Held through `RCShdPtr`; owns that window and every handler that it gives to the widgets in
-/// it.
+/// A dialog: a window built from a description. A script fills, reads and hears of its widgets. It runs modally until
+/// one of its close buttons is pressed. Inside the application it floats in the main panel, otherwise it has a window
+/// of its own. Held through `RCShdPtr`; owns that window and every handler that it gives to the widgets in it.
 ///
 /// A failure that the dialog finds itself is a `UiError`; those of the host pass through.
 class KV_API Dialog : public RCBase<LkCounter<int>>
@@ -51,8 +49,8 @@ public:
     Dialog& operator=(Dialog const&) = delete;
     ~Dialog() override;
 
-    /// Shows the dialog and blocks until a close button ends it. Gives the button's name. What a script's callback
-    /// raises comes out of it.
+    /// Shows the dialog and blocks until a close button ends it. Gives the button's name. An exception that a
+    /// script's callback raises comes out of it.
     virtual std::string launch();
 
     /// Paints the window anew.
@@ -67,7 +65,7 @@ public:
     /// Takes the dialog's widgets off the screen.
     void hide() const;
 
-    /// The next press of a close button, only that, leaves the dialog open.
+    /// Leaves the dialog open at the next press of a close button, only that.
     void disableNextClose();
 
     /// The value of the first widget of that name that has one; None if there is none, or it holds none.
@@ -170,7 +168,7 @@ private:
 namespace Kv
 {
 
-// Whoever uses dialogs shares these with the module.
+// Users of dialogs share these with the module.
 extern template class KV_API RCBasePtr<PyextUi::Dialog>;
 extern template class KV_API Iterator<RCShdPtr<UiWidget>>;
 

@@ -53,7 +53,7 @@ int traverse(PyObject* self, visitproc visit, void* arg)
     return 0;
 }
 
-/// What keeps the callables is their dictionary, which the collector clears itself.
+/// The callables are kept by their dictionary, which the collector clears itself.
 int clear(PyObject* self)
 {
     if (PyObject** const dictionary = _PyObject_GetDictPtr(self))

@@ -1,8 +1,157 @@
+#include <boost/python.hpp>
+
 #include "pyUiError.h"
 
-namespace Kv::PyextInit
+#include "pythonError.h"
+
+#include <algorithm>
+#include <map>
+
+namespace bp = boost::python;
+
+namespace Kv::PyextUi
 {
 
-template class ModError<PyextUi::Ui>;
+namespace
+{
 
-} // namespace Kv::PyextInit
+/// Does the work of `add_note`, which Python has from 3.11 on.
+void appendNote(bp::object error, bp::object const& note)
+{
+    if (!PyObject_HasAttrString(error.ptr(), "__notes__"))
+        error.attr("__notes__") = bp::list();
+    error.attr("__notes__").attr("append")(note);
+}
+
+} // namespace
+
+void addErrorNote(NoteMaker const& makeNote)
+{
+    PythonError const error = PythonError::fetch();
+    try
+    {
+        bp::object const note = makeNote();
+        if (!note.is_none())
+            appendNote(bp::object(bp::handle<>(bp::borrowed(error.getException()))), note);
+    }
+    catch (...)
+    {
+        bp::handle_exception();
+        PyErr_Clear();
+    }
+    error.restore();
+}
+
+void rethrowWithNote(NoteMaker const& makeNote)
+{
+    bp::handle_exception();
+    addErrorNote(makeNote);
+    throw bp::error_already_set();
+}
+
+bp::object toShortText(bp::object const& object)
+{
+    return bp::import("reprlib").attr("repr")(object);
+}
+
+bp::object describeEntry(char const* list, int index, bp::object const& entry)
+{
+    return bp::str("Entry [%d] of the %s is %s") % bp::make_tuple(index, list, toShortText(entry));
+}
+
+namespace
+{
+
+using Names = std::vector<std::string>;
+
+/// The names of the parameters, by function. A function that is gone leaves its entry to the next at its place.
+std::map<PyObject*, Names>& getParameters()
+{
+    static std::map<PyObject*, Names> parameters;
+    return parameters;
+}
+
+std::string join(Names const& names)
+{
+    std::string text;
+    for (std::size_t i = 0; i < names.size(); ++i)
+        text += (i == 0 ? "" : i + 1 < names.size() ? ", " : " and ") + names[i];
+    return text;
+}
+
+/// The fault of `given`, arguments by name behind `count` ones by place; empty if there is none.
+std::string findFault(Names const& parameters, std::size_t count, Names const& given)
+{
+    if (parameters.empty())
+        return "All arguments go by place";
+    Names named(parameters);
+    named.erase(std::remove(named.begin(), named.end(), ""), named.end());
+    auto last = parameters.begin();
+    for (std::string const& name : given)
+    {
+        auto const place = std::find(parameters.begin(), parameters.end(), name);
+        if (place == parameters.end())
+            return "No argument goes by the name " + name + ": those that do are " + join(named);
+        if (place < parameters.begin() + static_cast<std::ptrdiff_t>(count))
+            return name + " is there by place already";
+        last = std::max(last, place);
+    }
+    std::size_t const required = parameters.size() - named.size();
+    if (count < required)
+        return "The first " + std::to_string(required) + " arguments go by place";
+    Names missing;
+    for (auto place = parameters.begin() + static_cast<std::ptrdiff_t>(count); place < last; ++place)
+        if (std::find(given.begin(), given.end(), *place) == given.end())
+            missing.push_back(*place);
+    return missing.empty() ? "" : *last + " by name needs " + join(missing) + " too";
+}
+
+bp::object describeFault(PyObject* function, PyObject* arguments, PyObject* keywords)
+{
+    Names given;
+    bp::list const names(bp::dict(bp::handle<>(bp::borrowed(keywords))).keys());
+    for (int i = 0; i < bp::len(names); ++i)
+        given.push_back(bp::extract<std::string>(names[i]));
+    std::string const fault =
+        findFault(getParameters().at(function), static_cast<std::size_t>(PyTuple_Size(arguments)), given);
+    return fault.empty() ? bp::object() : bp::object(fault);
+}
+
+PyObject* callAndExplain(PyObject* function, PyObject* arguments, PyObject* keywords)
+{
+    PyObject* const result = Py_TYPE(function)->tp_base->tp_call(function, arguments, keywords);
+    if (!result && keywords)
+        addErrorNote([&] { return describeFault(function, arguments, keywords); });
+    return result;
+}
+
+/// The type of Boost.Python's functions, but for what a call does when it has failed.
+PyTypeObject* getExplainedType(PyTypeObject* base)
+{
+    static PyTypeObject type{};
+    if (!type.tp_base)
+    {
+        Py_SET_REFCNT(&type, 1);
+        type.tp_name = base->tp_name;
+        type.tp_base = base;
+        type.tp_flags = Py_TPFLAGS_DEFAULT;
+        type.tp_call = &callAndExplain;
+        // Not inherited: a type has a docstring of its own, which would hide that of the function.
+        type.tp_getset = base->tp_getset;
+        if (PyType_Ready(&type) != 0)
+            bp::throw_error_already_set();
+    }
+    return &type;
+}
+
+} // namespace
+
+void explainArguments(bp::object const& function, Names const& parameters)
+{
+    Py_SET_TYPE(function.ptr(), getExplainedType(Py_TYPE(function.ptr())));
+    getParameters()[function.ptr()] = parameters;
+}
+
+} // namespace Kv::PyextUi
+
+template class Kv::PyextInit::ModError<Kv::PyextUi::Ui>;

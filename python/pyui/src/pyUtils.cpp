@@ -1,3 +1,5 @@
+#include <boost/python.hpp>
+
 #include "pyUtils.h"
 
 #include "files/osFile.h"
@@ -43,6 +45,11 @@ std::string readDescriptionFile(OsFilePath const& path)
     text[count] = 0;
     file.reset();
     return text.data();
+}
+
+int lengthOf(boost::python::object const& sequence)
+{
+    return boost::python::extract<int>(sequence.attr("__len__")());
 }
 
 } // namespace Kv::PyextUi

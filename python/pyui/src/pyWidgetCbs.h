@@ -2,6 +2,8 @@
 
 #include <Python.h>
 
+#include <boost/python/handle.hpp>
+
 #include "cbHandler.h"
 #include "piWidget.h"
 #include "pointers/rcBase.h"
@@ -33,7 +35,38 @@ namespace Kv::PyextUi
 
 class Dialog;
 
-/// What the handlers of a dialog are bound to. Turns events into the close of the dialog and into calls of Python.
+/// The callables of a dialog's script callbacks. They are kept in a Python dictionary, so that Python's garbage
+/// collector can follow a callable that refers to its own dialog. Each Python object that shares the dialog has one
+/// reference to the dictionary and reports it to the collector. Without such an object, the dialog has the only one.
+class PyCallables
+{
+public:
+    PyCallables();
+    PyCallables(PyCallables const&) = delete;
+    PyCallables& operator=(PyCallables const&) = delete;
+    ~PyCallables();
+
+    void add(CallbackSet const& set);
+    void remove(CallbackSet const& set);
+
+    /// The callable of a set; null once it was removed, or taken by the collector.
+    boost::python::handle<> find(CallbackSet const& set) const;
+
+    /// One more Python object shares the dialog, or one less.
+    void addShare();
+    void releaseShare();
+    int getShareCount() const { return _shares; }
+
+    /// Borrowed, for the collector.
+    PyObject* getDictionary() const { return _dictionary; }
+
+private:
+    PyObject* _dictionary;
+    int _shares = 0;
+};
+
+/// The hub that the handlers of a dialog are bound to. It turns events into the close of the dialog and into calls of
+/// Python.
 class WidgetCbs : public RCBase<LkCounter<int>>
 {
 public:
@@ -46,7 +79,7 @@ public:
     /// Wires a set of a script to a widget's events.
     void addPythonHandler(RCShdPtr<PiWidget> const& piWidget, RCStrongPtr<CallbackSet> const& set);
 
-    /// Lets go of what a set and its handler hold of each other. A dispatch under way goes on with both.
+    /// Lets a set and its handler go of each other. A dispatch under way goes on with both.
     static void release(RCStrongPtr<CallbackSet> const& set);
 
     /// Releases each set, first to last, and empties the vector.

@@ -4,8 +4,9 @@
 
 #include "cbHandler.h"
 #include "pyDialog.h"
-#include "pyErrorNote.h"
 #include "pyUiError.h"
+#include "pyUtils.h"
+#include "pyWidgetValue.h"
 #include "text/liString.h"
 #include "text/liStringSubstituter.h"
 #include "uiConstraint.h"
@@ -53,20 +54,7 @@ struct Substituter
     void writeNumber(std::string& text, int number) { text = LiStringUtil::convertNb(number); }
 };
 
-bool isTrue(bp::object const& object)
-{
-    int const truth = PyObject_IsTrue(object.ptr());
-    if (truth < 0)
-        bp::throw_error_already_set();
-    return truth > 0;
-}
-
 } // namespace
-
-int lengthOf(bp::object const& sequence)
-{
-    return bp::extract<int>(sequence.attr("__len__")());
-}
 
 int measureInUnits(std::string const& text)
 {
@@ -87,17 +75,14 @@ std::string WidgetListGenerator::generate()
 {
     std::ostringstream stream;
     _writer = std::make_unique<XmlWriter>(stream, 2);
-    writeContainerHead("MainContainer", {1, "u", "l", ""}, {1, "u", "b", ""}, {-1, "uu", "r", ""}, {-4, "uu", "t", ""});
-    writeContainerHead(closeButtonsContainer, {0, "u", "l", ""}, {0, "u", "b", ""}, {0, "uu", "r", ""},
-                       {closeBarHeight, "u", "h", ""});
+    writeContainerHead("MainContainer", {1, "u", "l"}, {1, "u", "b"}, {-1, "uu", "r"}, {-4, "uu", "t"});
+    writeContainerHead(closeButtonsContainer, {0, "u", "l"}, {0, "u", "b"}, {0, "uu", "r"}, {closeBarHeight, "u", "h"});
     writeCloseButtons();
-    _writer->closeTag();
-    _writer->closeTag();
-    writeContainerHead("UserDefinedWidgetsContainer", {0, "u", "l", ""}, {1, "u", "s", closeButtonsContainer},
-                       {0, "uu", "r", ""}, {0, "uu", "t", ""});
+    closeTags(2);
+    writeContainerHead("UserDefinedWidgetsContainer", {0, "u", "l"}, {1, "u", "s", closeButtonsContainer},
+                       {0, "uu", "r"}, {0, "uu", "t"});
     int const labelColumnWidth = writeRows();
-    for (int i = 0; i < 4; ++i)
-        _writer->closeTag();
+    closeTags(4);
     std::string text = stream.str();
     _writer.reset();
     substitutePlaceholders(text, labelColumnWidth);
@@ -121,12 +106,12 @@ WidgetListGenerator::RowKind const& WidgetListGenerator::findRowKind(std::string
 {
     using Generator = WidgetListGenerator;
     static std::array<RowKind, 6> const kinds{{
-        {textFieldType, rightMargin, "r", &Generator::writeTextValue, textFieldForm},
-        {toggleButtonType, toggleButtonWidth, "w", &Generator::writeStateValue, toggleButtonForm},
-        {menuType, menuWidth, "w", &Generator::writeMenuValue, menuForm},
-        {labelType, 0, "r", &Generator::writeTextValue, labelForm},
-        {pushButtonType, 0, "w", nullptr, nullptr},
-        {"", rightMargin, "r", nullptr, nullptr},
+        {textFieldType, rightMargin, "r", &Generator::writeTextValue},
+        {toggleButtonType, toggleButtonWidth, "w", &Generator::writeStateValue},
+        {menuType, menuWidth, "w", &Generator::writeMenuValue},
+        {labelType, 0, "r", &Generator::writeTextValue},
+        {pushButtonType, 0, "w", nullptr},
+        {"", rightMargin, "r", nullptr},
     }};
     return *std::find_if(kinds.begin(), kinds.end() - 1, [&type](RowKind const& kind) { return kind.name == type; });
 }
@@ -134,28 +119,20 @@ WidgetListGenerator::RowKind const& WidgetListGenerator::findRowKind(std::string
 int WidgetListGenerator::writeRows()
 {
     std::size_t longest = 0;
-    int rowOffset = 0;
-    int const count = lengthOf(_widgets);
-    for (int index = 0; index < count; ++index)
-    {
-        auto const writeEntry = [&]
-        {
-            WidgetEntry const entry = readWidgetEntry(index);
-            longest = std::max(longest, entry.label.size());
-            writeRow(entry.type, entry.name, entry.label, rowOffset, entry.value);
-        };
-        withNote(writeEntry, [&] { return describeEntry("widget list", index, _widgets[index]); });
-        rowOffset += rowPitch;
-    }
+    forEachEntry(_widgets, lengthOf(_widgets), "widget list",
+                 [&](int index)
+                 {
+                     WidgetEntry const entry = readWidgetEntry(index);
+                     longest = std::max(longest, entry.label.size());
+                     writeRow(entry, rowPitch * index);
+                 });
     return longest == 0 ? 0 : static_cast<int>(longest) + captionMargin;
 }
 
 void WidgetListGenerator::writeContainerHead(std::string const& name, Edge const& x1, Edge const& y1, Edge const& x2,
                                              Edge const& y2)
 {
-    _writer->openTag("Container");
-    _writer->openTag("Widget");
-    _writer->writeAttrib("Name", name);
+    openWidget("Container", name);
     writeConstraint(x1, y1, x2, y2);
     _writer->closeTag();
     _writer->openTag("Group");
@@ -165,30 +142,25 @@ void WidgetListGenerator::writeContainerHead(std::string const& name, Edge const
 void WidgetListGenerator::writeCloseButtons()
 {
     int const count = lengthOf(_closeButtons);
-    int x = 0;
-    for (int i = 0; i < count; ++i)
-    {
-        bool const alignRight = i == 1 && count == 2;
-        withNote([&] { writeCloseButton(bp::extract<std::string>(_closeButtons[i]), x, closeButtonWidth, alignRight); },
-                 [&] { return describeEntry("list of close buttons", i, _closeButtons[i]); });
-        x += closeButtonStep;
-    }
+    forEachEntry(_closeButtons, count, "list of close buttons",
+                 [&](int i)
+                 {
+                     bool const alignRight = i == 1 && count == 2;
+                     writeCloseButton(bp::extract<std::string>(_closeButtons[i]), closeButtonStep * i, closeButtonWidth,
+                                      alignRight);
+                 });
 }
 
 void WidgetListGenerator::writeCloseButton(std::string const& label, int x, int width, bool alignRight)
 {
-    _writer->openTag(pushButtonType);
-    _writer->openTag("Widget");
-    _writer->writeAttrib("Name", closeButtonPrefix + label);
+    openWidget(pushButtonType, closeButtonPrefix + label);
     writeLabelString(label);
     if (alignRight)
-        writeConstraint({width, "u", "w", ""}, {0, "u", "b", ""}, {0, "uu", "r", ""},
-                        {closeButtonHeight, "u", "h", ""});
+        writeConstraint({width, "u", "w"}, {0, "u", "b"}, {0, "uu", "r"}, {closeButtonHeight, "u", "h"});
     else
-        writeConstraint({x, "u", "l", ""}, {0, "u", "b", ""}, {width, "u", "w", ""}, {closeButtonHeight, "u", "h", ""});
+        writeConstraint({x, "u", "l"}, {0, "u", "b"}, {width, "u", "w"}, {closeButtonHeight, "u", "h"});
     writeLabelAlign("Center", "Center");
-    _writer->closeTag();
-    _writer->closeTag();
+    closeTags(2);
 }
 
 WidgetListGenerator::WidgetEntry WidgetListGenerator::readWidgetEntry(int index) const
@@ -207,37 +179,31 @@ WidgetListGenerator::WidgetEntry WidgetListGenerator::readWidgetEntry(int index)
     return read;
 }
 
-void WidgetListGenerator::writeRow(std::string const& type, std::string const& name, std::string const& label,
-                                   int rowOffset, bp::object const& value)
+void WidgetListGenerator::writeRow(WidgetEntry const& entry, int rowOffset)
 {
-    if (!label.empty())
+    if (!entry.label.empty())
     {
-        writeRowLabel(label, rowOffset);
-        _writer->closeTag();
-        _writer->closeTag();
+        writeRowLabel(entry.label, rowOffset);
+        closeTags(2);
     }
-    RowKind const& kind = findRowKind(type);
-    int const x2Value = type == pushButtonType ? measureInUnits(name) + pushButtonMargin : kind.x2Value;
-    openRowWidget(type, name, rowOffset, x2Value, kind.x2Target);
+    RowKind const& kind = findRowKind(entry.type);
+    int const x2Value = entry.type == pushButtonType ? measureInUnits(entry.name) + pushButtonMargin : kind.x2Value;
+    openRowWidget(entry.type, entry.name, rowOffset, x2Value, kind.x2Target);
     if (kind.writeValue)
-        withNote(
-            [&]
-            {
-                if (isTrue(value))
-                    (this->*kind.writeValue)(value);
-            },
-            [&] { return describeValue(kind.valueForm, name, value); });
-    _writer->closeTag();
-    _writer->closeTag();
+        withNote([&] { writeValue(kind, entry); }, [&] { return describeValue(kind.name, entry.name, entry.value); });
+    closeTags(2);
+}
+
+void WidgetListGenerator::writeValue(RowKind const& kind, WidgetEntry const& entry)
+{
+    if (entry.value)
+        (this->*kind.writeValue)(entry.value);
 }
 
 void WidgetListGenerator::writeRowLabel(std::string const& label, int rowOffset)
 {
-    _writer->openTag(labelType);
-    _writer->openTag("Widget");
-    _writer->writeAttrib("Name", labelType + "_" + label);
-    writeConstraint({0, "u", "l", ""}, {rowHeight, "u", "h", ""}, {labelColumnPlaceholder, "u", "w", ""},
-                    {-rowOffset, "uu", "t", ""});
+    openWidget(labelType, labelType + "_" + label);
+    writeConstraint({0, "u", "l"}, {rowHeight, "u", "h"}, {labelColumnPlaceholder, "u", "w"}, {-rowOffset, "uu", "t"});
     writeLabelString(label);
     writeLabelAlign("Left", "Center");
 }
@@ -246,37 +212,46 @@ void WidgetListGenerator::openRowWidget(std::string const& type, std::string con
                                         std::string const& x2Target)
 {
     bool const isPushButton = type == pushButtonType;
-    _writer->openTag(type);
-    _writer->openTag("Widget");
-    _writer->writeAttrib("Name", name);
+    openWidget(type, name);
     if (isPushButton)
         writeLabelString(name);
-    writeConstraint({widgetColumnPlaceholder, "u", "l", ""}, {rowHeight, "u", "h", ""}, {x2Value, "uu", x2Target, ""},
-                    {-rowOffset, "uu", "t", ""});
+    writeConstraint({widgetColumnPlaceholder, "u", "l"}, {rowHeight, "u", "h"}, {x2Value, "uu", x2Target},
+                    {-rowOffset, "uu", "t"});
     writeLabelAlign(isPushButton ? "Center" : "Left", "Center");
+}
+
+void WidgetListGenerator::openWidget(std::string const& element, std::string const& name)
+{
+    _writer->openTag(element);
+    _writer->openTag("Widget");
+    _writer->writeAttrib("Name", name);
+}
+
+void WidgetListGenerator::closeTags(int count)
+{
+    for (int i = 0; i < count; ++i)
+        _writer->closeTag();
 }
 
 void WidgetListGenerator::writeConstraint(Edge const& x1, Edge const& y1, Edge const& x2, Edge const& y2)
 {
     _writer->openTag("Layout");
     _writer->openTag("Constraint");
-    writeEdge("X1", x1.value, x1.type, x1.target, x1.sibling);
-    writeEdge("Y1", y1.value, y1.type, y1.target, y1.sibling);
-    writeEdge("X2", x2.value, x2.type, x2.target, x2.sibling);
-    writeEdge("Y2", y2.value, y2.type, y2.target, y2.sibling);
-    _writer->closeTag();
-    _writer->closeTag();
+    writeEdge("X1", x1);
+    writeEdge("Y1", y1);
+    writeEdge("X2", x2);
+    writeEdge("Y2", y2);
+    closeTags(2);
 }
 
-void WidgetListGenerator::writeEdge(std::string const& edge, int value, std::string const& type,
-                                    std::string const& target, std::string const& sibling)
+void WidgetListGenerator::writeEdge(std::string const& edge, Edge const& place)
 {
     _writer->openTag(edge);
-    _writer->writeAttrib("Value", value);
-    _writer->writeAttrib("Type", type);
-    _writer->writeAttrib("Target", target);
-    if (!sibling.empty())
-        _writer->writeAttrib("Sibling", sibling);
+    _writer->writeAttrib("Value", place.value);
+    _writer->writeAttrib("Type", place.type);
+    _writer->writeAttrib("Target", place.target);
+    if (!place.sibling.empty())
+        _writer->writeAttrib("Sibling", place.sibling);
     _writer->closeTag();
 }
 
@@ -293,8 +268,7 @@ void WidgetListGenerator::writeLabelAlign(std::string const& h, std::string cons
     _writer->openTag("Align");
     _writer->writeAttrib("H", h);
     _writer->writeAttrib("V", v);
-    _writer->closeTag();
-    _writer->closeTag();
+    closeTags(2);
 }
 
 void WidgetListGenerator::writeTextValue(bp::object const& value)

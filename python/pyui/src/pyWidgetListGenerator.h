@@ -17,10 +17,7 @@ namespace PyextUi
 /// The label of the close button that a dialog always has.
 inline std::string const okLabel = "OK";
 
-/// How long a Python sequence says it is.
-int lengthOf(boost::python::object const& sequence);
-
-/// Width of a text in the default font, in whole layout units.
+/// The width of a text in the default font, in whole layout units.
 int measureInUnits(std::string const& text);
 
 /// Turns a list of widget entries into the description of a form: a row for each entry, with a caption on the left and
@@ -37,7 +34,7 @@ public:
     /// for one of the wrong form.
     std::string generate();
 
-    /// Says which entry is the first of a kind that no row is of; None where there is none.
+    /// Names the first entry of a kind that no row is of; None where there is none.
     static boost::python::object describeUnknownKind(boost::python::list const& widgetEntries);
 
 private:
@@ -49,27 +46,25 @@ private:
         boost::python::object value;
     };
 
-    /// What the rows of a kind have in common: where their right edge lies, and how their value is written. Null stands
-    /// for no value.
+    /// The right edge and the value of the rows of one kind. Null stands for no value.
     struct RowKind
     {
         std::string name;
         int x2Value;
         std::string x2Target;
         void (WidgetListGenerator::*writeValue)(boost::python::object const&);
-        char const* valueForm;
     };
 
-    /// Where an edge lies, as the description says it.
+    /// The place of an edge, as the description says it.
     struct Edge
     {
         int value;
         std::string type;
         std::string target;
-        std::string sibling;
+        std::string sibling = {};
     };
 
-    /// One without a name for a type that is none of the kinds.
+    /// The kind without a name for a type that is none of the others.
     static RowKind const& findRowKind(std::string const& type);
 
     /// Writes the rows and gives the width of the caption column, in layout units.
@@ -80,16 +75,18 @@ private:
     void writeCloseButtons();
     void writeCloseButton(std::string const& label, int x, int width, bool alignRight);
     WidgetEntry readWidgetEntry(int index) const;
-    void writeRow(std::string const& type, std::string const& name, std::string const& label, int rowOffset,
-                  boost::python::object const& value);
+    void writeRow(WidgetEntry const& entry, int rowOffset);
+    void writeValue(RowKind const& kind, WidgetEntry const& entry);
     /// Leaves the `Label` and its `Widget` open.
     void writeRowLabel(std::string const& label, int rowOffset);
     /// Leaves the widget element and its `Widget` open.
     void openRowWidget(std::string const& type, std::string const& name, int rowOffset, int x2Value,
                        std::string const& x2Target);
+    /// Leaves the element and its `Widget` open.
+    void openWidget(std::string const& element, std::string const& name);
+    void closeTags(int count);
     void writeConstraint(Edge const& x1, Edge const& y1, Edge const& x2, Edge const& y2);
-    void writeEdge(std::string const& edge, int value, std::string const& type, std::string const& target,
-                   std::string const& sibling);
+    void writeEdge(std::string const& edge, Edge const& place);
     void writeLabelString(std::string const& text);
     void writeLabelAlign(std::string const& h, std::string const& v);
     void writeTextValue(boost::python::object const& value);

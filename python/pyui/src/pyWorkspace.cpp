@@ -8,13 +8,10 @@
 #include "piGraph.h"
 #include "pointers/plainPtr.h"
 #include "pointers/rcWeakPtr.h"
-#include "pyCompat.h"
 #include "pyUiError.h"
 #include "snSelection.h"
 #include "uiCompositionWorkspace.h"
 #include "uiWorkspace.h"
-
-#include <cstring>
 
 namespace bp = boost::python;
 
@@ -90,14 +87,6 @@ RCShdPtr<UiView> findView(UiWidget const& widget)
     return nullptr;
 }
 
-/// In the bytes of the file system, as all paths cross.
-bp::object toPythonPath(LiString const& path)
-{
-    char const* const text = path.getChars();
-    return bp::object(
-        bp::handle<>(PyextUi::PyCompat::pathFromStringAndSize(text, static_cast<Py_ssize_t>(std::strlen(text)))));
-}
-
 } // namespace
 
 RCShdPtr<ManagedGraph> Workspace::getCurrentComposition()
@@ -149,7 +138,6 @@ bp::list Workspace::getBrowserSelection()
     if (focus.isNull())
         return paths;
     RCShdPtr<UiView> const view = findView(*focus);
-    // Scripts are told that the list is empty where no browser has the keyboard.
     if (view.isNull())
         return paths;
     RCShdPtr<SnSelection> const selection = view->getSelection();
@@ -158,7 +146,7 @@ bp::list Workspace::getBrowserSelection()
     using Convert = SnItemConvert<RCShdPtr<BrBrowsable>>;
     RCShdPtr<const SnSelection> const browsables = selection->filter(Convert::getPredicate());
     for (RCShdPtr<const SnItem> const& item : *browsables)
-        paths.append(toPythonPath(Convert::get(item)->getPath()));
+        paths.append(OsFilePath(Convert::get(item)->getPath().toString()));
     return paths;
 }
 

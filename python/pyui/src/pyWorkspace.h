@@ -4,12 +4,12 @@
 
 #include "files/osFilePath.h"
 #include "pointers/rcShdPtr.h"
-#include "pyManagedGraph.h"
+#include "pyGraph.h"
 
 namespace Kv
 {
 
-/// What a script sees of the running application. Nothing is stored: every call asks the current workspace anew. Where
+/// The running application as a script sees it. Nothing is stored: every call asks the current workspace anew. Where
 /// there is no application, each throws `UiError`.
 class Workspace
 {

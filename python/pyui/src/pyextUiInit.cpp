@@ -3,11 +3,9 @@
 #include "packages/inBuildInfo.h"
 #include "packages/inInit.h"
 #include "piBrowserSchemes.h"
-#include "pyArgumentNote.h"
-#include "pyCompat.h"
 #include "pyConvenienceFunctions.h"
 #include "pyManagedDialog.h"
-#include "pySharedClass.h"
+#include "pyModule.h"
 #include "pyUiError.h"
 #include "pyWorkspace.h"
 #include "pyextUiDocs.h"
@@ -60,9 +58,9 @@ namespace Kv::PyextUi
 namespace
 {
 
-/// Boost.Python binds a keyword list to the last parameters of an overload and takes its last name away for each
-/// overload that has a parameter less. The list names every parameter, the positional ones with nothing: one that is
-/// shorter ends the process when a script passes another parameter by name.
+/// The place of a parameter without a name in a keyword list, which must have one for every parameter. Boost.Python
+/// binds the list to the last parameters of an overload and takes its last name away for each overload that has a
+/// parameter less. A shorter list ends the process when a script passes another parameter by name.
 bp::arg positional()
 {
     return bp::arg("");
@@ -80,22 +78,18 @@ void instantiateAppMgr()
     UiAppMgr::getInstance();
 }
 
-/// Without it the converters for what the graph module hands out do not exist.
+/// Imports the module that has the converters for graphs.
 bp::handle<> importGraphModule()
 {
     std::string const name = "libKVpyextGraph";
     std::string const fullName = "quorvane_velmora.libs." + name;
     auto const import = [](std::string const& moduleName)
-    { return PyImport_ImportModuleLevel(moduleName.c_str(), nullptr, nullptr, nullptr, PyCompat::importLevel); };
-    PyObject* module = import(fullName);
-    if (!module)
-    {
-        PyErr_Clear();
-        module = import(name);
-    }
-    if (!module)
-        bp::throw_error_already_set();
-    return bp::handle<>(module);
+    { return PyImport_ImportModuleLevel(moduleName.c_str(), nullptr, nullptr, nullptr, 0); };
+    bp::handle<> const module(bp::allow_null(import(fullName)));
+    if (module)
+        return module;
+    PyErr_Clear();
+    return bp::handle<>(import(name));
 }
 
 template <typename Overloads, typename Function, std::size_t count>
@@ -168,7 +162,7 @@ void registerDialog()
         .def("enableWidget", &Dialog::enableWidget, Docs::enableWidget)
         .def("isEnabled", &Dialog::isEnabled, Docs::isEnabled)
         .def("disableNextClose", &Dialog::disableNextClose, Docs::disableNextClose);
-    // What can be left out of these is what one would name.
+    // The parameters that can be left out are those that one would name.
     for (char const* const name : {"setValue", "setValues"})
         explainArguments(dialog.attr(name), {});
 }
@@ -238,20 +232,7 @@ void moduleBody()
 
 } // namespace Kv::PyextUi
 
-#if PY_MAJOR_VERSION >= 3
-
 extern "C" KV_API PyObject* PyInit_libKVpyextUi()
 {
-    static PyModuleDef definition{
-        PyModuleDef_HEAD_INIT, "libKVpyextUi", nullptr, -1, nullptr, nullptr, nullptr, nullptr, nullptr};
-    return Kv::PyextUi::PyCompat::initModule(definition, &Kv::PyextUi::moduleBody);
+    return Kv::PyextInit::initModule<&Kv::PyextUi::moduleBody>("libKVpyextUi");
 }
-
-#else
-
-BOOST_PYTHON_MODULE(libKVpyextUi)
-{
-    Kv::PyextUi::moduleBody();
-}
-
-#endif

@@ -1,13 +1,23 @@
 #include <boost/python.hpp>
 
-#include "pyInitError.h"
+#include "pyManagedObject.h"
+#include "pyModError.h"
 
 #include <map>
 
-namespace Kv::PyextInit
+namespace bp = boost::python;
+
+namespace Kv
 {
 
-namespace bp = boost::python;
+PyManagedObjectBase::PyManagedObjectBase(Uuid const& interpreterId) : _interpreterId(interpreterId) {}
+
+PyManagedObjectBase::~PyManagedObjectBase() = default;
+
+} // namespace Kv
+
+namespace Kv::PyextInit
+{
 
 Error::Error(char const* sourcePath, int line, char const* modName, char const* reason)
     : ExBase(sourcePath, line, reason), _modName(modName)
@@ -33,17 +43,14 @@ void Error::raise() const
 void* Error::newException(std::string const& modName, std::string const& className)
 {
     static std::map<std::string, PyObject*> types;
-    std::string const fullName = modName + "." + className;
-    auto type = types.find(fullName);
-    if (type == types.end())
-    {
-        bp::handle<> created(PyErr_NewException(fullName.c_str(), PyExc_Exception, nullptr));
-        type = types.emplace(fullName, created.release()).first;
-    }
+    PyObject*& type = types[modName + "." + className];
+    if (!type)
+        type =
+            bp::handle<>(PyErr_NewException((modName + "." + className).c_str(), PyExc_Exception, nullptr)).release();
     bp::scope current;
     if (current.ptr() != Py_None)
-        current.attr(className.c_str()) = bp::object(bp::handle<>(bp::borrowed(type->second)));
-    return type->second;
+        current.attr(className.c_str()) = bp::object(bp::handle<>(bp::borrowed(type)));
+    return type;
 }
 
 } // namespace Kv::PyextInit

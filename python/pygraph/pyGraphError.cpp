@@ -1,8 +1,0 @@
-#include "pyGraphError.h"
-
-namespace Kv::PyextInit
-{
-
-template class ModError<PyextGraph::GraphModule>;
-
-} // namespace Kv::PyextInit
