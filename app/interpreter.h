@@ -3,6 +3,7 @@
 #include "commandLine.h"
 
 #include <functional>
+#include <memory>
 #include <string>
 
 #include <pthread.h>
@@ -48,6 +49,8 @@ public:
     int finish(int status);
 
 private:
+    struct Runner;
+
     void loadModules();
 
     /// Takes the error that is set, prints it, and gives the exit status that it stands for.
@@ -56,6 +59,7 @@ private:
     std::function<void()> _atEnd;
     std::string _failure;
     pthread_t _thread;
+    std::unique_ptr<Runner> _runner;
     void* _threadState = nullptr;
 };
 

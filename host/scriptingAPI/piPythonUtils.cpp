@@ -2,6 +2,8 @@
 
 #include "piPythonUtils.h"
 
+#include "pythonParts.h"
+
 #include <boost/uuid/random_generator.hpp>
 
 #include <cstdint>
@@ -17,6 +19,19 @@ Uuid const& PiPythonUtils::getCurrentPythonInterpreterId()
     auto const known = ids.find(interpreter);
     return known != ids.end() ? known->second
                               : ids.emplace(interpreter, boost::uuids::random_generator()()).first->second;
+}
+
+void PiPythonUtils::takePart()
+{
+    static bool const isDone = []
+    {
+        installHook();
+        installConverters();
+        installScriptFolder();
+        installWrapperKeeper();
+        return true;
+    }();
+    static_cast<void>(isDone);
 }
 
 } // namespace Kv

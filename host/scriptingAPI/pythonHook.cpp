@@ -1,4 +1,5 @@
 #include "pythonError.h"
+#include "pythonParts.h"
 #include "wsNative.h"
 
 #include <boost/python/errors.hpp>
@@ -16,8 +17,6 @@ namespace
 class PythonHook : public NtScriptHook
 {
 public:
-    PythonHook() { WsNative::setScriptHook(this); }
-
     void enter() override { _states.push_back(PyGILState_Ensure()); }
 
     void leave() noexcept override
@@ -127,8 +126,12 @@ private:
     std::vector<PyGILState_STATE> _states;
 };
 
-PythonHook const installedHook;
-
 } // namespace
+
+void installHook()
+{
+    static PythonHook hook;
+    WsNative::setScriptHook(&hook);
+}
 
 } // namespace Kv

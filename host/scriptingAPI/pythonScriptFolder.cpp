@@ -1,5 +1,7 @@
 #include <boost/python.hpp>
 
+#include "pythonLock.h"
+#include "pythonParts.h"
 #include "uiResTable.h"
 
 #include <filesystem>
@@ -29,22 +31,18 @@ std::string getScriptFolder()
 {
     if (!Py_IsInitialized())
         return "";
-    PyGILState_STATE const state = PyGILState_Ensure();
+    PythonLock const lock;
     std::string const file = getScriptFile();
-    PyGILState_Release(state);
     std::error_code isNone;
     std::filesystem::path const real = std::filesystem::canonical(file, isNone);
     return isNone ? "" : real.parent_path().string();
 }
 
-class ScriptFolder
-{
-public:
-    ScriptFolder() { UiResTable::setScriptFolder(&getScriptFolder); }
-};
-
-ScriptFolder const installedScriptFolder;
-
 } // namespace
+
+void installScriptFolder()
+{
+    UiResTable::setScriptFolder(&getScriptFolder);
+}
 
 } // namespace Kv

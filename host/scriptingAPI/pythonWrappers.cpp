@@ -1,11 +1,14 @@
 #include <boost/python.hpp>
 
 #include "ntPlatform.h"
+#include "pythonLock.h"
+#include "pythonParts.h"
 #include "wsNative.h"
 #include "wsThread.h"
 
 #include <string>
 #include <unordered_map>
+#include <unordered_set>
 #include <utility>
 #include <vector>
 
@@ -33,6 +36,8 @@ public:
 
     void install()
     {
+        // The import of a module can fail wherever a collection begins: the code that runs there may have no builtins.
+        _getObjects = bp::import("gc").attr("get_objects");
         bp::import("gc").attr("callbacks").attr("append")(bp::make_function(&WrapperKeeper::onCollection));
         bp::import("atexit").attr("register")(bp::make_function(&WrapperKeeper::onExit));
     }
@@ -80,7 +85,7 @@ private:
         bp::handle<> const type = find("PyQt6.QtCore", "QObject");
         if (!type || !PyType_Check(type.get()))
             return;
-        bp::object const young = bp::import("gc").attr("get_objects")(0);
+        bp::object const young = _getObjects(0);
         for (Py_ssize_t i = 0; i < PyList_GET_SIZE(young.ptr()); ++i)
         {
             PyObject* const object = PyList_GET_ITEM(young.ptr(), i);
@@ -91,52 +96,42 @@ private:
         NtPlatform* const platform = WsNative::getLoadedPlatform();
         if (!platform || !WsThread::isCurrent())
             return;
+        std::unordered_multimap<void const*, bp::handle<>> wrappers;
         for (bp::handle<> const& wrapper : std::exchange(_found, {}))
-            if (void* const object = findObject(wrapper.get()))
-                if (platform->observe(object, [object] { getInstance().release(object); }))
-                    _kept.emplace(object, wrapper);
+            if (void const* const object = findObject(wrapper.get()))
+                wrappers.emplace(object, wrapper);
+        std::unordered_set<void const*> objects;
+        for (auto const& [object, wrapper] : wrappers)
+            objects.insert(object);
+        platform->observe(objects, [](void const* object) { getInstance().release(object); });
+        for (auto const& [object, wrapper] : wrappers)
+            if (objects.count(object) > 0)
+                _kept.emplace(object, wrapper);
     }
 
     void release(void const* object)
     {
         if (!Py_IsInitialized())
             return;
-        PyGILState_STATE const state = PyGILState_Ensure();
-        {
-            std::vector<bp::handle<>> released;
-            auto const [first, last] = _kept.equal_range(object);
-            for (auto place = first; place != last; ++place)
-                released.push_back(place->second);
-            _kept.erase(first, last);
-        }
-        PyGILState_Release(state);
+        PythonLock const lock;
+        // What goes with them can come back here.
+        std::vector<bp::handle<>> released;
+        auto const [first, last] = _kept.equal_range(object);
+        for (auto place = first; place != last; ++place)
+            released.push_back(place->second);
+        _kept.erase(first, last);
     }
 
+    bp::object _getObjects;
     std::vector<bp::handle<>> _found;
     std::unordered_multimap<void const*, bp::handle<>> _kept;
 };
 
-/// The interpreter that loads this library gets one.
-class Installer
-{
-public:
-    Installer()
-    {
-        if (!Py_IsInitialized())
-            return;
-        try
-        {
-            WrapperKeeper::getInstance().install();
-        }
-        catch (bp::error_already_set const&)
-        {
-            PyErr_WriteUnraisable(nullptr);
-        }
-    }
-};
-
-Installer const installer;
-
 } // namespace
+
+void installWrapperKeeper()
+{
+    WrapperKeeper::getInstance().install();
+}
 
 } // namespace Kv

@@ -1,9 +1,18 @@
 #pragma once
 
+#include "piPythonUtils.h"
+
 #include <boost/python.hpp>
 
 namespace Kv::PyextInit
 {
+
+/// The body of a module, behind the interpreter's part in the host.
+template <void (*body)()> void initBody()
+{
+    PiPythonUtils::takePart();
+    body();
+}
 
 /// Makes the extension module of that name by running its body; for the module's entry function. Where the body has
 /// failed, Boost.Python would give the module all the same, and the interpreter would hide the failure behind its own.
@@ -11,7 +20,7 @@ template <void (*body)()> PyObject* initModule(char const* name)
 {
     static PyModuleDef definition{
         PyModuleDef_HEAD_INIT, name, nullptr, -1, nullptr, nullptr, nullptr, nullptr, nullptr};
-    PyObject* const module = boost::python::detail::init_module(definition, body);
+    PyObject* const module = boost::python::detail::init_module(definition, &initBody<body>);
     if (!PyErr_Occurred())
         return module;
     Py_XDECREF(module);

@@ -276,3 +276,10 @@ user.stop()
 print(len(kept))
 ''').split()
     assert int(printed[0]) > 6 and printed[1:] == ['heard'] * int(printed[0])
+
+
+def test_a_collection_that_begins_in_code_without_builtins_fails_nowhere(monkeypatch):
+    unraisable = []
+    monkeypatch.setattr('sys.unraisablehook', unraisable.append)
+    eval('collect()', {'__builtins__': {}, 'collect': gc.collect})
+    assert unraisable == []

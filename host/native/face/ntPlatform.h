@@ -9,6 +9,7 @@
 #include <memory>
 #include <string>
 #include <typeindex>
+#include <unordered_set>
 
 namespace Kv
 {
@@ -121,9 +122,9 @@ public:
     /// Destroys the windows that are left, while scripts can still hear of it. They cannot be shown again.
     virtual void destroyWindows() = 0;
 
-    /// True if the address is that of a living object of Qt that the application made, not a script. Then `onGone` is
-    /// called when it goes.
-    virtual bool observe(void const* object, std::function<void()> onGone) = 0;
+    /// Leaves of the addresses those of living objects of Qt that the application made, not a script. `onGone` is
+    /// called with the address of each when it goes.
+    virtual void observe(std::unordered_set<void const*>& objects, std::function<void(void const*)> const& onGone) = 0;
 
 private:
     /// Makes a peer with that face; `listener` is a `Listener` of the face.

@@ -30,15 +30,16 @@ namespace
 /// What layouts reckon with where there is no screen to ask.
 constexpr GeVector2<int> assumedScreen{1920, 1080};
 
-/// Looks for an object by its address, under one that lives.
-QObject* findObject(QObject* root, void const* address)
+/// Watches those objects in a tree whose addresses are among `wanted`, and adds them to `found`.
+void findObjects(QObject* root, std::unordered_set<void const*> const& wanted,
+                 std::function<void(void const*)> const& onGone, std::unordered_set<void const*>& found)
 {
-    if (!root || root == address)
-        return root;
+    if (!root)
+        return;
+    if (wanted.count(root) > 0 && found.insert(root).second)
+        QObject::connect(root, &QObject::destroyed, [onGone, root] { onGone(root); });
     for (QObject* const child : root->children())
-        if (QObject* const found = findObject(child, address))
-            return found;
-    return nullptr;
+        findObjects(child, wanted, onGone, found);
 }
 
 /// The widest line as it is drawn, with what its first and last glyph let stick out.
@@ -204,21 +205,20 @@ void QtPlatform::destroyWindows()
     QtWindow::destroyLeft();
 }
 
-bool QtPlatform::observe(void const* object, std::function<void()> onGone)
+void QtPlatform::observe(std::unordered_set<void const*>& objects, std::function<void(void const*)> const& onGone)
 {
+    if (objects.empty())
+        return;
     std::vector<QObject*> roots{_adopted.data()};
     for (QPointer<QtWindowWidget> const& window : QtWindowWidget::findAll())
         roots.push_back(window);
     if (_application.isOwn())
         roots.insert(roots.end(), {QCoreApplication::instance(), QGuiApplication::clipboard(),
                                    QGuiApplication::styleHints(), QGuiApplication::primaryScreen()});
+    std::unordered_set<void const*> found;
     for (QObject* const root : roots)
-        if (QObject* const found = findObject(root, object))
-        {
-            QObject::connect(found, &QObject::destroyed, std::move(onGone));
-            return true;
-        }
-    return false;
+        findObjects(root, objects, onGone, found);
+    objects = std::move(found);
 }
 
 } // namespace Kv

@@ -33,7 +33,7 @@ public:
     void interruptLoop() override;
     void closeLoops() override;
     void destroyWindows() override;
-    bool observe(void const* object, std::function<void()> onGone) override;
+    void observe(std::unordered_set<void const*>& objects, std::function<void(void const*)> const& onGone) override;
 
 private:
     std::unique_ptr<NtPeer> createPeer(std::type_index face, NtContainer& parent, std::string const& name,

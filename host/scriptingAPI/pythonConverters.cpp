@@ -1,6 +1,7 @@
 #include <boost/python.hpp>
 
 #include "files/osFilePath.h"
+#include "pythonParts.h"
 
 #include <cstddef>
 #include <cstring>
@@ -38,14 +39,14 @@ struct FilePathToPython
     static PyObject* convert(OsFilePath const& path) { return bp::incref(toPython(path.toString()).get()); }
 };
 
-void* isConvertible(PyObject* object)
+void* isPath(PyObject* object)
 {
-    bool const isPath = PyUnicode_Check(object) || PyBytes_Check(object) ||
-                        PyObject_HasAttrString(reinterpret_cast<PyObject*>(Py_TYPE(object)), "__fspath__");
-    return isPath ? object : nullptr;
+    bool const isConvertible = PyUnicode_Check(object) || PyBytes_Check(object) ||
+                               PyObject_HasAttrString(reinterpret_cast<PyObject*>(Py_TYPE(object)), "__fspath__");
+    return isConvertible ? object : nullptr;
 }
 
-void construct(PyObject* object, rvalue_from_python_stage1_data* data)
+void constructPath(PyObject* object, rvalue_from_python_stage1_data* data)
 {
     bp::handle<> const bytes = toBytes(object);
     if (!bytes)
@@ -60,19 +61,30 @@ void construct(PyObject* object, rvalue_from_python_stage1_data* data)
     data->convertible = new (storage) OsFilePath(path);
 }
 
-/// Scripts see paths as `str`, wherever a function of any module takes or gives one.
-class FilePathConverters
+/// The same objects that Boost.Python itself takes.
+void* isTruth(PyObject* object)
 {
-public:
-    FilePathConverters()
-    {
-        bp::to_python_converter<OsFilePath, FilePathToPython>();
-        bp::converter::registry::push_back(&isConvertible, &construct, bp::type_id<OsFilePath>());
-    }
-};
+    return object == Py_None || PyLong_Check(object) ? object : nullptr;
+}
 
-FilePathConverters const installedConverters;
+void constructTruth(PyObject* object, rvalue_from_python_stage1_data* data)
+{
+    int const truth = PyObject_IsTrue(object);
+    if (truth < 0)
+        bp::throw_error_already_set();
+    void* const storage = reinterpret_cast<rvalue_from_python_storage<bool>*>(data)->storage.bytes;
+    data->convertible = new (storage) bool(truth > 0);
+}
 
 } // namespace
+
+void installConverters()
+{
+    // Scripts see paths as `str`, wherever a function of any module takes or gives one.
+    bp::to_python_converter<OsFilePath, FilePathToPython>();
+    bp::converter::registry::push_back(&isPath, &constructPath, bp::type_id<OsFilePath>());
+    // Before the converter of Boost.Python, which takes a truth that raises for true and leaves the error set.
+    bp::converter::registry::insert(&isTruth, &constructTruth, bp::type_id<bool>());
+}
 
 } // namespace Kv
