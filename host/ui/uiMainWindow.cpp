@@ -12,14 +12,14 @@ namespace Kv
 namespace
 {
 
-UiWidget* findHolderIn(UiContainer const& container)
+UiWidget* findWidgetWithKeyboardIn(UiContainer const& container)
 {
     for (RCShdPtr<UiWidget> const& child : container.getChildren())
     {
         if (!child->hasKeyboard())
             continue;
         auto const* const inner = dynamic_cast<UiContainer const*>(child.get());
-        UiWidget* const innermost = inner ? findHolderIn(*inner) : nullptr;
+        UiWidget* const innermost = inner ? findWidgetWithKeyboardIn(*inner) : nullptr;
         return innermost ? innermost : child.get();
     }
     return nullptr;
@@ -60,7 +60,7 @@ void UiMainWindow::admitInput()
 
 UiWidget* UiMainWindow::findWidgetWithKeyboard() const
 {
-    return findHolderIn(*getRootContainer());
+    return findWidgetWithKeyboardIn(*getRootContainer());
 }
 
 std::unique_ptr<NtWindow> UiMainWindow::createNative(NtPlatform& platform)

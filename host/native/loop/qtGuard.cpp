@@ -1,13 +1,10 @@
 #include "loop/qtGuard.h"
 
 #include "loop/qtLoop.h"
-#include "windows/qtStage.h"
 
-#include <QCoreApplication>
 #include <QThread>
 
 #include <cstdio>
-#include <memory>
 #include <utility>
 
 namespace Kv
@@ -16,52 +13,57 @@ namespace Kv
 namespace
 {
 
+/// Stands in where no interpreter is: passes exceptions on as they are, and prints those that nobody takes.
+class NoScriptHook : public NtScriptHook
+{
+public:
+    void enter() override {}
+    void leave() noexcept override {}
+    std::exception_ptr capture() noexcept override { return std::current_exception(); }
+    [[noreturn]] void rethrow(std::exception_ptr const& error) override { std::rethrow_exception(error); }
+    std::exception_ptr takeError() noexcept override { return nullptr; }
+    void putErrorBack(std::exception_ptr const&) noexcept override {}
+    void addContext(std::exception_ptr const&, std::exception_ptr const& later) noexcept override { report(later); }
+    void checkSignals() override {}
+    void interrupt() noexcept override {}
+
+    void report(std::exception_ptr const& error) noexcept override
+    {
+        try
+        {
+            std::rethrow_exception(error);
+        }
+        catch (std::exception const& exception)
+        {
+            (void)std::fprintf(stderr, "%s\n", exception.what());
+        }
+        catch (...)
+        {
+            (void)std::fputs("A handler threw what is no exception\n", stderr);
+        }
+    }
+};
+
+NtScriptHook* getNoScriptHook()
+{
+    static auto* const hook = new NoScriptHook;
+    return hook;
+}
+
 /// Holds the interpreter, also where the hook is taken away meanwhile.
 class InterpreterHold
 {
 public:
-    explicit InterpreterHold(NtScriptHook* hook) : _hook(hook)
-    {
-        if (_hook)
-            _hook->enter();
-    }
+    explicit InterpreterHold(NtScriptHook& hook) : _hook(hook) { _hook.enter(); }
     InterpreterHold(InterpreterHold const&) = delete;
     InterpreterHold& operator=(InterpreterHold const&) = delete;
-    ~InterpreterHold()
-    {
-        if (_hook)
-            _hook->leave();
-    }
+    ~InterpreterHold() { _hook.leave(); }
 
 private:
-    NtScriptHook* _hook;
+    NtScriptHook& _hook;
 };
 
-void print(std::exception_ptr const& error) noexcept
-{
-    try
-    {
-        std::rethrow_exception(error);
-    }
-    catch (std::exception const& exception)
-    {
-        (void)std::fprintf(stderr, "%s\n", exception.what());
-    }
-    catch (...)
-    {
-        (void)std::fputs("A handler threw what is no exception\n", stderr);
-    }
-}
-
 } // namespace
-
-QtErrorAside::QtErrorAside() : _error(QtGuard::getInstance().takeError()) {}
-
-QtErrorAside::~QtErrorAside()
-{
-    if (_error)
-        QtGuard::getInstance().putErrorBack(_error);
-}
 
 QtGuard& QtGuard::getInstance()
 {
@@ -70,10 +72,17 @@ QtGuard& QtGuard::getInstance()
     return *guard;
 }
 
+QtGuard::QtGuard() : _hook(getNoScriptHook()) {}
+
+void QtGuard::setScriptHook(NtScriptHook* hook)
+{
+    _hook = hook ? hook : getNoScriptHook();
+}
+
 void QtGuard::run(std::function<void()> const& call) noexcept
 {
     {
-        InterpreterHold const hold(_hook);
+        InterpreterHold const hold(*_hook);
         ++_depth;
         quint64 const outerCall = std::exchange(_currentCall, ++_calls);
         try
@@ -93,97 +102,21 @@ void QtGuard::run(std::function<void()> const& call) noexcept
 
 void QtGuard::checkSignals() noexcept
 {
-    if (_hook)
-        run([hook = _hook] { hook->checkSignals(); });
+    run([hook = _hook] { hook->checkSignals(); });
 }
 
-void QtGuard::interrupt() const noexcept
-{
-    if (_hook)
-        _hook->interrupt();
-}
-
-void QtGuard::rethrow(std::exception_ptr const& error) const
-{
-    if (_hook)
-        _hook->rethrow(error);
-    std::rethrow_exception(error);
-}
-
-std::exception_ptr QtGuard::takeError() const noexcept
-{
-    return _hook ? _hook->takeError() : nullptr;
-}
-
-void QtGuard::putErrorBack(std::exception_ptr const& error) const noexcept
-{
-    if (_hook)
-        _hook->putErrorBack(error);
-}
-
-void QtGuard::addContext(std::exception_ptr const& first, std::exception_ptr const& later) const noexcept
-{
-    if (_hook)
-        _hook->addContext(first, later);
-    else
-        print(later);
-}
-
-QtGuard::Moment QtGuard::getMoment() const
+QtMoment QtGuard::getMoment() const
 {
     return {_currentCall, QThread::currentThread()->loopLevel()};
 }
 
-void QtGuard::destroy(QWidget* widget)
-{
-    QtErrorAside const aside;
-    // Without its application a widget can no longer be touched.
-    if (!widget || !QCoreApplication::instance())
-        return;
-    if (widget->thread() != QThread::currentThread())
-    {
-        widget->deleteLater();
-        return;
-    }
-    if (getMoment() == QtStage::findBirth(*widget))
-    {
-        std::unique_ptr<QWidget> const done(widget);
-        return;
-    }
-    widget->hide();
-    widget->deleteLater();
-    _waiting.emplace_back(widget);
-}
-
-void QtGuard::destroyWaiting()
-{
-    if (_depth > 0 || _innermostLoop || !QCoreApplication::instance())
-        return;
-    for (QPointer<QWidget> const& widget : std::exchange(_waiting, {}))
-        if (widget)
-            QCoreApplication::sendPostedEvents(widget, QEvent::DeferredDelete);
-}
-
 void QtGuard::take() noexcept
 {
-    std::exception_ptr const error = capture();
+    std::exception_ptr const error = _hook->capture();
     if (_innermostLoop)
         _innermostLoop->fail(error);
     else
-        report(error);
-}
-
-std::exception_ptr QtGuard::capture() const noexcept
-{
-    return _hook ? _hook->capture() : std::current_exception();
-}
-
-void QtGuard::report(std::exception_ptr const& error) const noexcept
-{
-    if (_hook)
         _hook->report(error);
-    else
-        print(error);
 }
 
 } // namespace Kv

@@ -2,42 +2,40 @@
 
 #include "ntPlatform.h"
 
-#include <QPointer>
-#include <QWidget>
+#include <QtGlobal>
 
 #include <exception>
 #include <functional>
-#include <vector>
 
 namespace Kv
 {
 
 class QtLoop;
 
-/// Keeps the interpreter's error, which is on its way out, off the interpreter for as long as this lives. To be held
-/// where windows go or come back: Qt tells others of it, and those may run Python code.
-class QtErrorAside
+/// A moment of the user interface's thread: the call from Qt that was under way, and how many loops were.
+struct QtMoment
 {
-public:
-    QtErrorAside();
-    QtErrorAside(QtErrorAside const&) = delete;
-    QtErrorAside& operator=(QtErrorAside const&) = delete;
-    ~QtErrorAside();
+    quint64 call = 0;
+    int loopLevel = 0;
 
-private:
-    std::exception_ptr _error;
+    friend bool operator==(QtMoment const& a, QtMoment const& b)
+    {
+        return a.call == b.call && a.loopLevel == b.loopLevel;
+    }
 };
 
-/// The one place where the toolkit calls into the host. Takes the interpreter for the call, and keeps what a handler
-/// throws from the toolkit's frames: the innermost local loop ends and carries it out. Owns nothing but the
-/// widgets that cannot go yet since the toolkit may be in the middle of one of their events.
+/// The one place where Qt calls into the host. Takes the interpreter for the call, and keeps what a handler throws from
+/// Qt's frames: the innermost local loop ends and carries it out.
 class QtGuard
 {
 public:
     static QtGuard& getInstance();
 
     /// Borrowed; null takes the hook away.
-    void setScriptHook(NtScriptHook* hook) { _hook = hook; }
+    void setScriptHook(NtScriptHook* hook);
+
+    /// Without an interpreter a hook that does as much as it can.
+    NtScriptHook& getScriptHook() const { return *_hook; }
 
     /// Calls into the host; nothing that is thrown comes out.
     void run(std::function<void()> const& call) noexcept;
@@ -45,55 +43,43 @@ public:
     /// Runs what is pending for the interpreter, guarded.
     void checkSignals() noexcept;
 
-    /// Interrupts the script that runs, as Ctrl-C would.
-    void interrupt() const noexcept;
-
-    /// Throws on what a loop has carried out.
-    [[noreturn]] void rethrow(std::exception_ptr const& error) const;
-
-    /// Takes the interpreter's error off it, and puts it back. Null where there is none.
-    std::exception_ptr takeError() const noexcept;
-    void putErrorBack(std::exception_ptr const& error) const noexcept;
-
-    /// `later` came while `first` was on its way out.
-    void addContext(std::exception_ptr const& first, std::exception_ptr const& later) const noexcept;
-
     QtLoop* getInnermostLoop() const { return _innermostLoop; }
     void setInnermostLoop(QtLoop* loop) { _innermostLoop = loop; }
 
-    /// The call from the toolkit and the loop that are under way. What was made and goes at the same moment of these
-    /// cannot be in the middle of one of its events.
-    struct Moment
-    {
-        quint64 call = 0;
-        int loopLevel = 0;
+    QtMoment getMoment() const;
 
-        friend bool operator==(Moment const& a, Moment const& b)
-        {
-            return a.call == b.call && a.loopLevel == b.loopLevel;
-        }
-    };
-
-    Moment getMoment() const;
-
-    /// Destroys a widget that its owner has done with, as soon as that can be: at once, or when the call from the
-    /// toolkit that is under way has returned, or on the widget's own thread.
-    void destroy(QWidget* widget);
-
-    /// Destroys the widgets that had to wait, where no call from the toolkit is under way any more.
-    void destroyWaiting();
+    /// True where neither a call from Qt nor a local loop is under way.
+    bool isIdle() const { return _depth == 0 && !_innermostLoop; }
 
 private:
-    void take() noexcept;
-    std::exception_ptr capture() const noexcept;
-    void report(std::exception_ptr const& error) const noexcept;
+    QtGuard();
 
-    NtScriptHook* _hook = nullptr;
+    /// Takes the exception that is being handled.
+    void take() noexcept;
+
+    NtScriptHook* _hook;
     QtLoop* _innermostLoop = nullptr;
     int _depth = 0;
     quint64 _calls = 0;
     quint64 _currentCall = 0;
-    std::vector<QPointer<QWidget>> _waiting;
+};
+
+/// Keeps the interpreter's error, which is on its way out, off the interpreter for as long as this lives. Held where
+/// windows go or come back: Qt tells others of it, and those may run Python code.
+class QtErrorAside
+{
+public:
+    QtErrorAside() : _error(QtGuard::getInstance().getScriptHook().takeError()) {}
+    QtErrorAside(QtErrorAside const&) = delete;
+    QtErrorAside& operator=(QtErrorAside const&) = delete;
+    ~QtErrorAside()
+    {
+        if (_error)
+            QtGuard::getInstance().getScriptHook().putErrorBack(_error);
+    }
+
+private:
+    std::exception_ptr _error;
 };
 
 } // namespace Kv

@@ -77,7 +77,7 @@ void QtLoop::endIfDone()
 void QtLoop::fail(std::exception_ptr const& error) noexcept
 {
     if (_error)
-        QtGuard::getInstance().addContext(_error, error);
+        QtGuard::getInstance().getScriptHook().addContext(_error, error);
     else
         _error = error;
     _loop.quit();

@@ -1,6 +1,6 @@
 #include "peers/qtPeer.h"
 
-#include "loop/qtGuard.h"
+#include "loop/qtDisposal.h"
 #include "peers/qtLongText.h"
 #include "peers/qtPointerWatch.h"
 #include "peers/qtText.h"
@@ -82,7 +82,7 @@ QtPeer::QtPeer(NtForeignWidget widget) : _widget(static_cast<QWidget*>(widget.wi
 QtPeer::~QtPeer()
 {
     if (!_foreign)
-        QtGuard::getInstance().destroy(_widget);
+        QtDisposal::destroy(_widget);
 }
 
 QWidget* QtPeer::getNative() const
@@ -150,7 +150,7 @@ void QtPeer::setLineBelow(bool drawn)
     if (drawn && !_line)
         _line = new BottomLine(widget);
     else if (!drawn)
-        QtGuard::getInstance().destroy(std::exchange(_line, nullptr));
+        QtDisposal::destroy(std::exchange(_line, nullptr));
 }
 
 void QtPeer::setPointerListener(NtPointerListener& listener)
@@ -175,8 +175,8 @@ bool QtPeer::hasKeyboard() const
     QWidget const* const widget = getNative();
     if (!widget)
         return false;
-    QWidget const* const holder = widget->window()->focusWidget();
-    return holder && (holder == widget || widget->isAncestorOf(holder));
+    QWidget const* const focused = widget->window()->focusWidget();
+    return focused && (focused == widget || widget->isAncestorOf(focused));
 }
 
 bool QtPeer::holdsValue() const

@@ -1,6 +1,6 @@
 #include "start/qtPlatform.h"
 
-#include "loop/qtGuard.h"
+#include "loop/qtDisposal.h"
 #include "loop/qtLoop.h"
 #include "peers/qtPeer.h"
 #include "peers/qtText.h"
@@ -164,12 +164,12 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
         refuseLoop();
     QPointer<QWidget> const window = QApplication::activeModalWidget();
     std::exception_ptr const error = QtLoop(until, end).run();
-    QtGuard::getInstance().destroyWaiting();
+    QtDisposal::destroyWaiting();
     if (!error)
         return;
     if (auto* const left = dynamic_cast<QtWindowWidget*>(window.data()))
         left->stopWaiting();
-    QtGuard::getInstance().rethrow(error);
+    QtGuard::getInstance().getScriptHook().rethrow(error);
 }
 
 void QtPlatform::refuseLoop()
@@ -177,7 +177,7 @@ void QtPlatform::refuseLoop()
     // A script that asks until it gets an answer would go on for ever, with no window to end it by.
     constexpr int patience = 10;
     if (++_refusedLoops > patience)
-        QtGuard::getInstance().interrupt();
+        QtGuard::getInstance().getScriptHook().interrupt();
     throw ExBase(__FILE__, __LINE__, "The application is closing: no dialog can be run any more");
 }
 

@@ -2,7 +2,7 @@
 
 #include "peers/qtLabel.h"
 #include "peers/qtPeer.h"
-#include "windows/qtFloatStack.h"
+#include "windows/qtFrontOrder.h"
 #include "windows/qtFocusOrder.h"
 
 #include <QApplication>
@@ -49,7 +49,7 @@ public:
     void raise() override
     {
         if (QtFloat* const native = getNative())
-            QtFloatStack::getInstance().bringToFront(*native);
+            QtFrontOrder::getInstance().bringToFront(*native);
     }
 
     void focusFirst() override { focusFirstInContent(); }
@@ -97,17 +97,17 @@ QtFloat::QtFloat(QWidget* parent, QtListenerHandle<NtFloatListener> const& handl
             [this](QWidget* from, QWidget* to)
             {
                 if (to && isAncestorOf(to) && !(from && isAncestorOf(from)))
-                    QtFloatStack::getInstance().bringToFront(*this);
+                    QtFrontOrder::getInstance().bringToFront(*this);
             });
     // A timer would stay until it fires, also when this is gone.
     QMetaObject::invokeMethod(
         this, [handle] { handle.tell(&NtFloatListener::onFirstTurn); }, Qt::QueuedConnection);
-    QtFloatStack::getInstance().bringToFront(*this);
+    QtFrontOrder::getInstance().bringToFront(*this);
 }
 
 QtFloat::~QtFloat()
 {
-    QtFloatStack::getInstance().remove(*this);
+    QtFrontOrder::getInstance().remove(*this);
 }
 
 QtFloat* QtFloat::findAround(QWidget& widget)
@@ -162,7 +162,7 @@ void QtFloat::resumeKeyboard()
 void QtFloat::showEvent(QShowEvent* event)
 {
     QWidget::showEvent(event);
-    QtFloatStack::getInstance().cutHoles();
+    QtFrontOrder::getInstance().cutHoles();
     if (!event->spontaneous() && _area)
         _area->tellRoom();
 }
@@ -170,24 +170,24 @@ void QtFloat::showEvent(QShowEvent* event)
 void QtFloat::hideEvent(QHideEvent* event)
 {
     QWidget::hideEvent(event);
-    QtFloatStack::getInstance().cutHoles();
+    QtFrontOrder::getInstance().cutHoles();
     if (event->spontaneous())
         return;
     if (_area)
         _area->forgetRoom();
-    QtFloatStack::getInstance().settleKeyboard(*window());
+    QtFrontOrder::getInstance().settleKeyboard(*window());
 }
 
 void QtFloat::moveEvent(QMoveEvent* event)
 {
     QWidget::moveEvent(event);
-    QtFloatStack::getInstance().cutHoles();
+    QtFrontOrder::getInstance().cutHoles();
 }
 
 void QtFloat::resizeEvent(QResizeEvent* event)
 {
     QWidget::resizeEvent(event);
-    QtFloatStack::getInstance().cutHoles();
+    QtFrontOrder::getInstance().cutHoles();
     if (_area)
         _area->setGeometry(rect());
     if (_edge)

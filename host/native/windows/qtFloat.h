@@ -1,9 +1,9 @@
 #pragma once
 
+#include "loop/qtDisposal.h"
 #include "ntContainer.h"
 #include "peers/qtListenerHandle.h"
 #include "windows/qtContentArea.h"
-#include "windows/qtStage.h"
 
 #include <QPointer>
 #include <QWidget>
@@ -13,7 +13,7 @@ namespace Kv
 
 /// A floating container on the screen: has a ground and an edge of its own, walks the keyboard through the widgets in
 /// it, remembers which of them had it, and passes on Escape.
-class QtFloat final : public QWidget, public QtStage
+class QtFloat final : public QWidget, public QtWindowLike
 {
 public:
     QtFloat(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle);

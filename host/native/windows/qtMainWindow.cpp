@@ -3,7 +3,7 @@
 #include "loop/qtGuard.h"
 #include "loop/qtInputDrop.h"
 #include "windows/qtFloat.h"
-#include "windows/qtFloatStack.h"
+#include "windows/qtFrontOrder.h"
 
 #include <QApplication>
 #include <QEvent>
@@ -60,27 +60,27 @@ void QtMainWindow::flushInput()
 void QtMainWindow::refuseInput()
 {
     QWidget* const native = _content.getNative();
-    _holders.emplace_back(findHolder());
+    _placesWithKeyboard.emplace_back(findPlaceWithKeyboard());
     if (!native)
         return;
-    // Qt would look for another holder, and the float would forget this one.
+    // Else Qt gives the keyboard to another widget, and the float forgets this one.
     native->setFocus(Qt::OtherFocusReason);
-    if (_holders.size() == 1)
+    if (_placesWithKeyboard.size() == 1)
         _enableOwn(false);
 }
 
 void QtMainWindow::admitInput()
 {
     QtErrorAside const aside;
-    QPointer<QWidget> const holder = _holders.back();
-    _holders.pop_back();
+    QPointer<QWidget> const place = _placesWithKeyboard.back();
+    _placesWithKeyboard.pop_back();
     QWidget* const native = _content.getNative();
     if (!native)
         return;
-    if (_holders.empty())
+    if (_placesWithKeyboard.empty())
         _enableOwn(true);
-    if (!QtFloatStack::giveKeyboard(holder))
-        QtFloatStack::getInstance().settleKeyboard(*native);
+    if (!QtFrontOrder::giveKeyboard(place))
+        QtFrontOrder::getInstance().settleKeyboard(*native);
 }
 
 bool QtMainWindow::eventFilter(QObject* watched, QEvent* event)
@@ -96,26 +96,26 @@ void QtMainWindow::onFocusChanged(QWidget* to)
     if (!to)
         // Later: Qt is in the middle of taking it from what is disabled.
         QMetaObject::invokeMethod(
-            this, [this] { replaceLostHolder(); }, Qt::QueuedConnection);
+            this, [this] { restoreLostKeyboard(); }, Qt::QueuedConnection);
     else if (to != native && to->window() == native && !QtFloat::findAround(*to))
-        QtFloatStack::getInstance().rememberOwn(*to);
+        QtFrontOrder::getInstance().rememberKeyboard(*to);
 }
 
-void QtMainWindow::replaceLostHolder() const
+void QtMainWindow::restoreLostKeyboard() const
 {
     QWidget* const native = _content.getNative();
     if (native && native->isActiveWindow() && !native->focusWidget())
-        QtFloatStack::getInstance().settleKeyboard(*native);
+        QtFrontOrder::getInstance().settleKeyboard(*native);
 }
 
-QWidget* QtMainWindow::findHolder() const
+QWidget* QtMainWindow::findPlaceWithKeyboard() const
 {
     QWidget const* const native = _content.getNative();
-    QWidget* const holder = native ? native->focusWidget() : nullptr;
-    if (!holder || holder == native)
+    QWidget* const focused = native ? native->focusWidget() : nullptr;
+    if (!focused || focused == native)
         return nullptr;
-    QtFloat* const floating = QtFloat::findAround(*holder);
-    return floating ? floating : holder;
+    QtFloat* const floating = QtFloat::findAround(*focused);
+    return floating ? floating : focused;
 }
 
 void QtMainWindow::tellSize() const

@@ -36,17 +36,17 @@ public:
 private:
     void tellSize() const;
     void onFocusChanged(QWidget* to);
-    /// Gives the keyboard to another where Qt has taken it from its holder and given it to nobody.
-    void replaceLostHolder() const;
+    /// Gives the keyboard to the front-most place where Qt has taken it from a widget and given it to nobody.
+    void restoreLostKeyboard() const;
     /// The float, or the widget of the application's own, that has the keyboard whenever the window has it.
-    QWidget* findHolder() const;
+    QWidget* findPlaceWithKeyboard() const;
 
     QtListenerHandle<NtWindowListener> _handle;
     QtAdoptedContainer _content;
     std::function<void(bool)> _enableOwn;
 
-    /// Who had the keyboard each time that input was refused.
-    std::vector<QPointer<QWidget>> _holders;
+    /// The places that had the keyboard, one for each time that input was refused and not yet admitted again.
+    std::vector<QPointer<QWidget>> _placesWithKeyboard;
 };
 
 } // namespace Kv

@@ -1,6 +1,6 @@
 #include "windows/qtWindow.h"
 
-#include "loop/qtGuard.h"
+#include "loop/qtDisposal.h"
 #include "loop/qtInputDrop.h"
 #include "peers/qtText.h"
 #include "windows/qtFocusOrder.h"
@@ -206,7 +206,7 @@ QtWindow::~QtWindow()
     if (QWidget const* const native = getNative(); native && native->thread() == QThread::currentThread())
         hide();
     _content.reset();
-    QtGuard::getInstance().destroy(_widget);
+    QtDisposal::destroy(_widget);
 }
 
 void QtWindow::destroyLeft()

@@ -1,10 +1,10 @@
 #pragma once
 
+#include "loop/qtDisposal.h"
 #include "loop/qtInputDrop.h"
 #include "ntWindow.h"
 #include "peers/qtContainer.h"
 #include "windows/qtContentArea.h"
-#include "windows/qtStage.h"
 
 #include <QPointer>
 #include <QRect>
@@ -19,7 +19,7 @@ namespace Kv
 
 /// A window on the screen: says how much room the content has, walks the keyboard through the widgets, and
 /// passes on Escape and what the window manager asks for.
-class QtWindowWidget final : public QWidget, public QtStage
+class QtWindowWidget final : public QWidget, public QtWindowLike
 {
 public:
     explicit QtWindowWidget(QtListenerHandle<NtWindowListener> const& handle);

@@ -14,16 +14,16 @@ class QtFloat;
 ///
 /// Qt stacks only what has one parent: a float in a pane lies beneath each float of the window. One that lies beneath
 /// another though it came to the front later is seen through a hole in that.
-class QtFloatStack
+class QtFrontOrder
 {
 public:
-    static QtFloatStack& getInstance();
+    static QtFrontOrder& getInstance();
 
     void bringToFront(QtFloat& floating);
     void remove(QtFloat& floating);
 
     /// A widget of the window's own, in no float, has got the keyboard: it stands before all floats for now.
-    void rememberOwn(QWidget& holder);
+    void rememberKeyboard(QWidget& widget);
 
     /// A float has been moved, shown or hidden.
     void cutHoles() const;

@@ -1,4 +1,4 @@
-#include "windows/qtFloatStack.h"
+#include "windows/qtFrontOrder.h"
 
 #include "windows/qtFloat.h"
 #include "windows/qtFocusOrder.h"
@@ -29,14 +29,14 @@ QtFloat* toFloat(QWidget* widget)
 
 } // namespace
 
-QtFloatStack& QtFloatStack::getInstance()
+QtFrontOrder& QtFrontOrder::getInstance()
 {
     // Never destroyed: floats go as late as the last objects of the interpreter do.
-    static auto* const stack = new QtFloatStack;
-    return *stack;
+    static auto* const order = new QtFrontOrder;
+    return *order;
 }
 
-void QtFloatStack::bringToFront(QtFloat& floating)
+void QtFrontOrder::bringToFront(QtFloat& floating)
 {
     floating.raise();
     forget(floating);
@@ -44,24 +44,24 @@ void QtFloatStack::bringToFront(QtFloat& floating)
     cutHoles();
 }
 
-void QtFloatStack::remove(QtFloat& floating)
+void QtFrontOrder::remove(QtFloat& floating)
 {
     forget(floating);
     cutHoles();
 }
 
-void QtFloatStack::rememberOwn(QWidget& holder)
+void QtFrontOrder::rememberKeyboard(QWidget& widget)
 {
     for (QPointer<QWidget> const& place : _places)
-        if (place && !toFloat(place) && place->window() == holder.window())
+        if (place && !toFloat(place) && place->window() == widget.window())
         {
             forget(*place);
             break;
         }
-    _places.emplace_back(&holder);
+    _places.emplace_back(&widget);
 }
 
-void QtFloatStack::cutHoles() const
+void QtFrontOrder::cutHoles() const
 {
     for (auto lower = _places.begin(); lower != _places.end(); ++lower)
     {
@@ -78,7 +78,7 @@ void QtFloatStack::cutHoles() const
     }
 }
 
-bool QtFloatStack::giveKeyboard(QWidget* place)
+bool QtFrontOrder::giveKeyboard(QWidget* place)
 {
     if (!place || !QtFocusOrder::canHold(*place))
         return false;
@@ -89,10 +89,10 @@ bool QtFloatStack::giveKeyboard(QWidget* place)
     return true;
 }
 
-void QtFloatStack::settleKeyboard(QWidget& window) const
+void QtFrontOrder::settleKeyboard(QWidget& window) const
 {
-    QWidget const* const holder = window.focusWidget();
-    if (holder && holder != &window && QtFocusOrder::canHold(*holder))
+    QWidget const* const withKeyboard = window.focusWidget();
+    if (withKeyboard && withKeyboard != &window && QtFocusOrder::canHold(*withKeyboard))
         return;
     // A copy: who gets the keyboard comes to the front.
     std::vector<QPointer<QWidget>> const places = _places;
@@ -102,14 +102,14 @@ void QtFloatStack::settleKeyboard(QWidget& window) const
         window.setFocus(Qt::OtherFocusReason);
 }
 
-void QtFloatStack::forget(QWidget const& widget)
+void QtFrontOrder::forget(QWidget const& widget)
 {
     _places.erase(std::remove_if(_places.begin(), _places.end(),
                                  [&widget](QPointer<QWidget> const& place) { return !place || place == &widget; }),
                   _places.end());
 }
 
-void QtFloatStack::cutHole(QWidget& floating, QRegion const& hole)
+void QtFrontOrder::cutHole(QWidget& floating, QRegion const& hole)
 {
     QRegion const whole = floating.rect();
     if (whole.isEmpty() || hole.isEmpty())
