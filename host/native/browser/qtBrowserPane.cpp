@@ -11,11 +11,9 @@
 #include <QApplication>
 #include <QHBoxLayout>
 #include <QKeyEvent>
-#include <QScrollBar>
 #include <QStyle>
 #include <QVBoxLayout>
 
-#include <algorithm>
 #include <chrono>
 #include <filesystem>
 #include <initializer_list>
@@ -82,6 +80,7 @@ QtBrowserPane::QtBrowserPane(QWidget* parent, QtListenerHandle<NtBrowserListener
     _up->setToolTip(QStringLiteral("Up (Alt+Up)"));
     _list->setModel(_model);
     _list->setSortingEnabled(true);
+    _selection = new QtBrowserSelection(*_list, *_model, [this] { onChosen(); });
     _message->setTextFormat(Qt::PlainText);
     _message->setWordWrap(true);
     _message->hide();
@@ -92,9 +91,6 @@ QtBrowserPane::QtBrowserPane(QWidget* parent, QtListenerHandle<NtBrowserListener
     _list->setAccessibleName(QStringLiteral("Files"));
     layOut();
     connect(_up, &QToolButton::clicked, this, [this] { goUp(); });
-    connect(_list->selectionModel(), &QItemSelectionModel::selectionChanged, this, [this] { onChosen(); });
-    connect(_list->selectionModel(), &QItemSelectionModel::currentChanged, this, [this] { onChosen(); });
-    connect(_model, &QAbstractItemModel::modelAboutToBeReset, this, [this] { keepView(); });
     connect(&_looking, &QTimer::timeout, this, [this] { look(); });
     _patience.setSingleShot(true);
     connect(&_patience, &QTimer::timeout, this, [this] { showState(); });
@@ -124,14 +120,12 @@ void QtBrowserPane::layOut()
     _message->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
 }
 
-void QtBrowserPane::goTo(std::string const& directory, Choice const& choice)
+void QtBrowserPane::goTo(std::string const& directory, QtBrowserChoice const& choice)
 {
     _directory = directory;
     _notice.clear();
-    _wanted = choice;
-    _wantedView = {};
+    _selection->await(choice);
     _told = choice;
-    _arriving = true;
     _path->setDirectory(directory);
     _up->setEnabled(directory != "/");
     _patience.start(patience);
@@ -232,10 +226,10 @@ void QtBrowserPane::goUp()
     if (!path.has_relative_path() || !isVisible())
         return;
     walkTo(OsPlace::findNearest(path.parent_path().native()), {});
-    _wantedView.current = path.filename().native();
+    _selection->awaitCurrent(path.filename().native());
 }
 
-void QtBrowserPane::walkTo(std::string const& directory, Choice const& choice)
+void QtBrowserPane::walkTo(std::string const& directory, QtBrowserChoice const& choice)
 {
     goTo(directory, choice);
     _handle.tell(&NtBrowserListener::onDirectoryChanged, directory);
@@ -277,92 +271,18 @@ void QtBrowserPane::leave(std::string const& reason)
     say(reason + ". This is " + OsPlace::quote(nearest));
 }
 
-void QtBrowserPane::keepView()
-{
-    _replaced = true;
-    if (_arriving)
-        return;
-    _wanted = getChoice();
-    QModelIndex const current = _list->currentIndex();
-    QModelIndex const top = _list->indexAt(QPoint(0, 0));
-    _wantedView.current = current.isValid() ? _model->getEntry(current.row()).name : "";
-    _wantedView.top = top.isValid() ? _model->getEntry(top.row()).name : "";
-    _wantedView.offset = _list->visualRect(top).y();
-    _wantedView.scroll = _list->verticalScrollBar()->value();
-}
-
 void QtBrowserPane::onRead()
 {
     _patience.stop();
-    bool const isNew = std::exchange(_arriving, false);
-    if (std::exchange(_replaced, false) || isNew)
-        choose();
     // A file of a sequence stays in focus as it was asked for, though the sequence goes by its first.
-    if (isNew && _wanted.selected.size() <= 1 && !_model->findRows({_wanted.focus}).empty())
-        _told = getChoice();
+    if (_selection->settle())
+        _told = _selection->get();
     tellChoice();
     showState();
 }
 
-void QtBrowserPane::choose()
-{
-    std::vector<std::string> names = _wanted.selected;
-    names.push_back(_wanted.focus);
-    int const columns = _model->columnCount() - 1;
-    QItemSelection selection;
-    for (int const row : _model->findRows(names))
-        selection.select(_model->index(row, 0), _model->index(row, columns));
-    _choosing = true;
-    _list->selectionModel()->select(selection, QItemSelectionModel::ClearAndSelect);
-    restoreView();
-    _choosing = false;
-}
-
-void QtBrowserPane::restoreView()
-{
-    auto const indexOf = [this](std::string const& name)
-    {
-        std::vector<int> const rows = _model->findRows({name});
-        return rows.empty() ? QModelIndex() : _model->index(rows.front(), 0);
-    };
-    QModelIndex const focus = indexOf(_wanted.focus.empty() ? _wantedView.current : _wanted.focus);
-    // The keyboard is always on some row: from none, the list would take every key for a step to the first.
-    _list->selectionModel()->setCurrentIndex(focus.isValid() ? focus : _model->index(0, 0),
-                                             QItemSelectionModel::NoUpdate);
-    _list->doItemsLayout();
-    QModelIndex const top = indexOf(_wantedView.top);
-    if (_wantedView.top.empty())
-        _list->scrollTo(focus);
-    else if (_wantedView.scroll > 0 && top.isValid())
-    {
-        _list->scrollTo(top, QAbstractItemView::PositionAtTop);
-        _list->verticalScrollBar()->setValue(_list->verticalScrollBar()->value() - _wantedView.offset);
-    }
-    else
-        _list->verticalScrollBar()->setValue(_wantedView.scroll);
-}
-
-QtBrowserPane::Choice QtBrowserPane::getChoice() const
-{
-    std::vector<int> rows;
-    for (QModelIndex const& index : _list->selectionModel()->selectedRows())
-        rows.push_back(index.row());
-    std::sort(rows.begin(), rows.end());
-    Choice choice;
-    for (int const row : rows)
-        choice.selected.push_back(_model->getEntry(row).name);
-    QModelIndex const current = _list->currentIndex();
-    if (current.isValid() && std::binary_search(rows.begin(), rows.end(), current.row()))
-        choice.focus = _model->getEntry(current.row()).name;
-    else if (!rows.empty())
-        choice.focus = choice.selected.front();
-    return choice;
-}
-
 void QtBrowserPane::onChosen()
 {
-    if (_choosing)
-        return;
     forgetTyped();
     tellChoice();
 }
@@ -377,9 +297,9 @@ void QtBrowserPane::forgetTyped()
 
 void QtBrowserPane::tellChoice()
 {
-    if (_choosing || _arriving || !isVisible())
+    if (_selection->isAwaiting() || !isVisible())
         return;
-    Choice const choice = getChoice();
+    QtBrowserChoice const choice = _selection->get();
     if (choice == _told)
         return;
     _told = choice;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "browser/qtBrowserSelection.h"
 #include "ntBrowser.h"
 #include "peers/qtListenerHandle.h"
 
@@ -19,31 +20,18 @@ class QtBrowserList;
 class QtDirModel;
 class QtPathField;
 
-/// The toolkit's side of a browser: a field with the path, the list of the entries, and a line that says what went
-/// wrong. While it is visible it follows what becomes of the directory.
+/// A browser's widget: a field with the path, the list of the entries, and a line that says what went wrong. While it
+/// is visible it follows what becomes of the directory.
 class QtBrowserPane final : public QWidget
 {
 public:
-    /// Entries by their names: the one that has the keyboard, empty for none, and all that are selected, from top to
-    /// bottom.
-    struct Choice
-    {
-        std::string focus;
-        std::vector<std::string> selected;
-
-        friend bool operator==(Choice const& a, Choice const& b)
-        {
-            return a.focus == b.focus && a.selected == b.selected;
-        }
-    };
-
     QtBrowserPane(QWidget* parent, QtListenerHandle<NtBrowserListener> const& handle);
 
     /// Names the widgets in it after it.
     void nameParts();
 
     /// Shows a directory, an absolute path, and selects what is in it of a choice. The listener hears nothing.
-    void goTo(std::string const& directory, Choice const& choice);
+    void goTo(std::string const& directory, QtBrowserChoice const& choice);
 
     void setCollapsing(std::function<bool(std::string const&)> collapses);
     void setMultiple(bool multiple);
@@ -58,31 +46,16 @@ protected:
     void keyPressEvent(QKeyEvent* event) override;
 
 private:
-    /// Where the list was before its rows were replaced.
-    struct View
-    {
-        /// The row that the keyboard was on, selected or not.
-        std::string current;
-        /// The uppermost row in sight, and how far it was out of sight.
-        std::string top;
-        int offset = 0;
-        int scroll = 0;
-    };
-
     void layOut();
 
     void activate();
     void goUp();
-    void walkTo(std::string const& directory, Choice const& choice);
+    void walkTo(std::string const& directory, QtBrowserChoice const& choice);
     void toggleHidden();
     void look();
     void leave(std::string const& reason);
 
-    void keepView();
     void onRead();
-    void choose();
-    void restoreView();
-    Choice getChoice() const;
     void onChosen();
     /// The user has turned to the list: what stands in the field counts no more.
     void forgetTyped();
@@ -93,17 +66,10 @@ private:
     QtListenerHandle<NtBrowserListener> _handle;
     std::string _directory;
 
-    /// What is to be selected once the rows are there, and where the list is to stand then.
-    Choice _wanted;
-    View _wantedView;
-    bool _arriving = false;
-    bool _replaced = false;
+    /// The choice that the listener knows.
+    QtBrowserChoice _told;
 
-    /// What the listener knows.
-    Choice _told;
-    bool _choosing = false;
-
-    /// What the user did in vain, or what happened to the directory.
+    /// Words about what the user did in vain, or about what happened to the directory.
     std::string _notice;
 
     // Owned by this one natively.
@@ -111,6 +77,7 @@ private:
     QtPathField* _path;
     QtDirModel* _model;
     QtBrowserList* _list;
+    QtBrowserSelection* _selection = nullptr;
     QLabel* _message;
     QTimer _looking;
     QTimer _patience;
