@@ -10,7 +10,7 @@ from quorvane_velmora import ui
 from PyQt6.QtCore import QPoint, QRect, Qt
 from PyQt6.QtGui import QCursor, QTextDocument
 from PyQt6.QtTest import QTest
-from PyQt6.QtWidgets import QApplication, QToolTip
+from PyQt6.QtWidgets import QApplication, QProxyStyle, QStyle, QToolTip
 
 pytestmark = [pytest.mark.screen, pytest.mark.usefixtures('no_wait_is_endless')]
 
@@ -184,22 +184,32 @@ def as_read(tip):
     return page.toPlainText().replace('\xa0', ' ')
 
 
+class EagerTooltips(QProxyStyle):
+    """Shows a tooltip after 20 ms in place of 700."""
+
+    def styleHint(self, hint, *rest):
+        return 20 if hint == QStyle.StyleHint.SH_ToolTip_WakeUpDelay else super().styleHint(hint, *rest)
+
+
 def hover(name):
     """Lets the pointer rest on a widget until its tooltip stands on the screen, or long enough for one to come."""
     def step(user):
         user.tips = getattr(user, 'tips', [])
         widget = user.find(name)
+        style = EagerTooltips()
+        widget.setStyle(style)
         QCursor.setPos(user.window().mapToGlobal(QPoint(1, 1)))
         for _ in range(100):
             QTest.qWait(20)
             if not QToolTip.isVisible():
                 break
         QTest.mouseMove(widget, widget.rect().center())
-        for _ in range(100 if widget.toolTip() else 30):
-            QTest.qWait(50)
+        for _ in range(250 if widget.toolTip() else 15):
+            QTest.qWait(20)
             if QToolTip.isVisible():
                 break
         user.tips.append(as_read(QToolTip.text()) if QToolTip.isVisible() else None)
+        widget.setStyle(None)
     return step
 
 
