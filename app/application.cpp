@@ -23,7 +23,7 @@ namespace Velmora
 namespace
 {
 
-/// How often Ctrl-C is looked for while no script runs.
+/// The time between two looks for Ctrl-C while no script runs, in milliseconds.
 constexpr int signalInterval = 100;
 constexpr int interruptedStatus = 130;
 
@@ -32,7 +32,7 @@ QString toText(std::string const& bytes)
     return QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()));
 }
 
-/// Whether somebody looks at the windows.
+/// True if somebody can look at the windows.
 bool hasScreen()
 {
     QString const name = QGuiApplication::platformName();
@@ -96,7 +96,7 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
     _watch.reset();
     _signalTimer.stop();
     _window.saveLook(_settings);
-    // What scripts have left for their end can open no dialog any more: nobody would see it.
+    // The scripts' own acts at the end can open no dialog any more: nobody would see it.
     Kv::WsNative::getPlatform().closeLoops();
     return status;
 }
@@ -205,7 +205,7 @@ void Application::checkSignals()
 bool Application::isInterrupted()
 {
     std::lock_guard<std::mutex> const lock(_stopping);
-    // What was to stop a script that has come to its end meanwhile stops nothing else.
+    // A stop that comes after the script's end stops nothing else.
     bool const isLate = std::exchange(_stopAsked, false);
     return _interpreter.isInterrupted() && !isLate;
 }
@@ -230,7 +230,7 @@ std::string Application::askPath(QString const& title, std::string const& place)
 
 void Application::interrupt()
 {
-    // Who presses it again while asked about changes means it.
+    // A second Ctrl-C, while the user is asked about changes, is meant.
     if (QApplication::activeModalWidget() || confirmLoss(getCompositions()))
         QApplication::exit(interruptedStatus);
 }

@@ -24,10 +24,10 @@ namespace
 
 using std::chrono::milliseconds;
 
-/// How long the loop may stand still before the user is offered to stop what runs.
+/// The time that the loop may stand still before the user is offered to stop what runs.
 constexpr milliseconds patience(2000);
 
-/// How long the user who has declined is left alone.
+/// The time for which a user who has declined is left alone.
 constexpr milliseconds respite(30000);
 
 constexpr milliseconds glance(50);
@@ -35,7 +35,7 @@ constexpr milliseconds glance(50);
 /// A loop that stood still for longer does not come around as it should.
 constexpr milliseconds longestTurn(1000);
 
-/// How often the loop has to come around for the window to answer again.
+/// The number of turns of the loop after which the window answers again.
 constexpr int calmTurns = 8;
 
 /// As the system takes them; null comes last.

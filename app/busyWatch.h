@@ -19,8 +19,8 @@ namespace Velmora
 class BusyWatch
 {
 public:
-    /// What that window says, and where it stands: in the middle, above the window of that number, if the platform
-    /// numbers windows.
+    /// The words of that window, and its place: in the middle, above the window of that number, if the platform numbers
+    /// windows.
     struct Offer
     {
         std::string script;
@@ -57,7 +57,7 @@ private:
     std::function<void()> _stop;
     std::vector<std::string> _environment;
     std::atomic<Clock::rep> _turned;
-    /// How often the loop has come around since it did not for a while.
+    /// The number of turns of the loop since it stood still.
     std::atomic<int> _turns{0};
     std::mutex _mutex;
     std::condition_variable _changed;

@@ -28,12 +28,12 @@ struct ScriptCall
     std::vector<std::string> arguments;
 };
 
-/// What the application was asked to do.
+/// The task of the application, as its command line gives it.
 struct CommandLine
 {
     /// Paths of composition files, in order.
     std::vector<std::string> compositions;
-    /// Whether to end with the script.
+    /// True to end with the script.
     bool exit = false;
     bool help = false;
     bool buildInfo = false;

@@ -12,7 +12,7 @@
 namespace Velmora
 {
 
-/// What the pane shows of a composition.
+/// A composition as the pane shows it.
 struct CompositionEntry
 {
     QString name;

@@ -92,7 +92,7 @@ Interpreter::Interpreter(std::function<void()> atEnd) : _atEnd(std::move(atEnd))
 {
     start();
     lastAct = &_atEnd;
-    // What is registered first is called last.
+    // The function that is registered first is called last.
     bp::import("atexit").attr("register")(bp::make_function(&runLastAct));
     _runner = std::make_unique<Runner>();
     _runner->get("start")(toBytes(getModuleFolder()), getStopSignal());

@@ -24,17 +24,17 @@ namespace Velmora
 namespace
 {
 
-/// What of a script's time its output may take to be seen at once, and how much of that can be saved up, in
+/// The share of a script's time that its output may take to be seen at once, and how much of it can be saved up, in
 /// nanoseconds.
 constexpr qint64 shareOfTime = 5;
 constexpr qint64 maxCredit = 60'000'000;
 
-/// How many places are marked that a search has found.
+/// The greatest number of finds of a search that are marked.
 constexpr int maxMarks = 1000;
 
 constexpr int timeAir = 8;
 
-/// What is kept of a line beside its text.
+/// The data of a line beside its text.
 class LineData final : public QTextBlockUserData
 {
 public:

@@ -17,7 +17,7 @@ namespace Velmora
 
 class LogView;
 
-/// What scripts print and what is said of them, each line with the time at which it came. It follows the end, unless
+/// The output of scripts and the words about them, each line with the time at which it came. It follows the end, unless
 /// the user looks at something above it. What scripts print is seen too while they keep the window's thread busy.
 class LogPane final : public QWidget
 {
@@ -40,7 +40,7 @@ private:
     void layOut();
     QAbstractButton* makeButton(QString const& text, QString const& tip, void (LogPane::*run)());
     void onPrinted();
-    /// Whether what is printed can be shown before the loop comes around.
+    /// True if output can be shown before the loop comes around.
     bool hasCredit();
     void showNew();
     void copy();

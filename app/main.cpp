@@ -45,7 +45,7 @@ int run(CommandLine const& line)
     if (line.script)
         requireScript(*line.script);
     Kv::InBuildInfoUtil::setApplicationMode(Kv::ApplicationModes::Interactive);
-    // The toolkit starts here.
+    // Qt starts here.
     Kv::WsNative::getPlatform();
     applyTheme();
     // The streams of Python copy what they write to it to the end.
@@ -61,7 +61,7 @@ int run(CommandLine const& line)
     return interpreter.finish(status);
 }
 
-/// What is closed of the standard streams must not become the number of another file, which is then written to.
+/// Opens the standard streams that are closed: else another file would get their number, and would be written to.
 void openStandardStreams()
 {
     for (int stream = 0; stream <= 2; ++stream)

@@ -33,10 +33,10 @@ constexpr QSize windowSize(1180, 760);
 /// Of the window's height, in percent.
 constexpr int logShare = 24;
 
-/// What a window manager adds, which is known only when it is too late.
+/// The frame that a window manager adds, which is known only when it is too late.
 constexpr QSize windowFrame(8, 40);
 
-/// How wide the folder of a script can be in a menu.
+/// The greatest width of a script's folder in a menu.
 constexpr int menuWidth = 360;
 
 QString const windowKey = QStringLiteral("window");

@@ -17,7 +17,7 @@ namespace Velmora
 class NodeView;
 class Settings;
 
-/// What the user can ask the application for.
+/// The commands that the user can give to the application.
 struct Commands
 {
     std::function<void()> openComposition;
@@ -54,7 +54,7 @@ public:
     /// Enables and disables all that the window has of its own, but that a script can be stopped and the log scrolled.
     void setOwnEnabled(bool enabled);
 
-    /// How large the window is, and how that is shared out, from one run to the next.
+    /// Takes the size of the window and of its parts from one run to the next.
     void restoreLook(Settings const& settings);
     void saveLook(Settings& settings) const;
 
@@ -63,7 +63,7 @@ public:
     /// The nodes of the current composition; null for none.
     void showGraph(Kv::RCShdPtr<const Kv::PiGraph> const& graph);
 
-    /// Whether a script runs, which then can be stopped, and afterwards be run again.
+    /// Says if a script runs, which then can be stopped, and afterwards be run again.
     void setRunning(bool running);
 
     /// Says something of a script in the log.

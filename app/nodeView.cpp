@@ -27,7 +27,7 @@ constexpr double leastTextScale = 0.1;
 
 using Inputs = std::vector<std::vector<std::size_t>>;
 
-/// How many steps each node is away from one without inputs. Each is visited once, after its inputs; of a ring of nodes
+/// The number of steps from each node to one without inputs. Each is visited once, after its inputs; of a ring of nodes
 /// the step that closes it counts for nothing.
 std::vector<std::size_t> findDepths(Inputs const& inputs)
 {

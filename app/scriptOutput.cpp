@@ -15,7 +15,7 @@ namespace
 
 using Kind = LogLine::Kind;
 
-/// How long lines may wait before they are told of again.
+/// The time that lines may wait before they are told of again.
 constexpr std::chrono::milliseconds patience(50);
 
 /// In bytes. A longer line is cut into several.
@@ -71,7 +71,7 @@ template <Kind kind> bp::object makeFeed(bp::object const& output)
     return bp::object(bp::handle<>(PyCFunction_New(&definition, output.ptr())));
 }
 
-/// How much of a text fits into a line without a character being cut in two.
+/// The length of the part of a text that fits into a line without cutting a character in two.
 std::size_t findCut(std::string_view text, std::size_t room)
 {
     if (text.size() <= room)

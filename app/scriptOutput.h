@@ -26,14 +26,14 @@ struct LogLine
     std::chrono::system_clock::time_point time;
     /// UTF-8, without the end of the line.
     std::string text;
-    /// Whether more can come.
+    /// True if more can come.
     bool isOpen = false;
 };
 
-/// How many lines the log holds.
+/// The number of lines that the log holds.
 constexpr int logLength = 10000;
 
-/// What scripts print, cut into lines for the log. No more than the log holds wait there to be taken; the oldest go
+/// The output of scripts, cut into lines for the log. No more than the log holds wait there to be taken; the oldest go
 /// first. All of it but the listener is for any thread.
 class ScriptOutput
 {

@@ -9,12 +9,12 @@
 namespace Velmora
 {
 
-/// What the application remembers from one run to the next, in the user's configuration folder. What cannot be read is
+/// The memory of the application from one run to the next, in the user's configuration folder. What cannot be read is
 /// as if it had never been set, and what cannot be written holds for this run.
 class Settings
 {
 public:
-    /// Where nothing is to be remembered there is nothing to be read either.
+    /// An application that is to remember nothing reads nothing either.
     explicit Settings(bool remembers);
 
     /// Absolute paths in the bytes of the file system, the one that ran last first.
@@ -23,7 +23,7 @@ public:
     void removeScript(std::string const& path);
     void clearScripts();
 
-    /// What the window knows of its own look; empty if there is nothing.
+    /// The window's own record of its look; empty if there is none.
     QByteArray getLook(QString const& part) const;
     void setLook(QString const& part, QByteArray const& look);
 

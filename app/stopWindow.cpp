@@ -28,7 +28,7 @@ constexpr char const* option = "--stop-window";
 /// The option and what comes behind it.
 constexpr int argumentCount = 6;
 
-/// How long a script may take to stop before it can be asked again, in milliseconds.
+/// The time that a script may take to stop before it can be asked again, in milliseconds.
 constexpr int stopTime = 3000;
 
 /// Asks the application to stop the script.
@@ -97,7 +97,7 @@ int run(char** argv)
     QSize const size = window.sizeHint();
     window.setGeometry(
         QRect(QPoint(std::stoi(argv[3]), std::stoi(argv[4])) - QPoint(size.width(), size.height()) / 2, size));
-    // What is typed for another window must not stop anything.
+    // Keys that are typed for another window must not stop anything.
     window.setAttribute(Qt::WA_ShowWithoutActivating);
     window.winId();
     if (WId const owner = std::stoull(argv[5]))

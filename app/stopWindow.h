@@ -13,7 +13,7 @@ namespace Velmora::StopWindow
 /// The command line of the process. Its standard input is the connection to the application.
 std::vector<std::string> makeCommand(BusyWatch::Offer const& offer);
 
-/// Whether that is what the process was started for.
+/// True if the process was started for that.
 bool isWanted(int argc, char** argv);
 
 /// Runs the window, and gives the exit status.

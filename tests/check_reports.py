@@ -1,5 +1,5 @@
 """Reads what the sanitizers wrote during a test run, and fails for every error and for each leak that was allocated by
-one of the project's own libraries. The interpreter and the toolkit keep much until the end of the process; that is
+one of the project's own libraries. The interpreter and Qt keep much until the end of the process; that is
 theirs."""
 
 import pathlib

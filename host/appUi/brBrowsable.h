@@ -10,14 +10,14 @@
 namespace Kv
 {
 
-/// What a browser shows an entry for: a file or a directory. It need not exist any more.
+/// A file or a directory for which a browser has an entry. It need not exist any more.
 class KV_API BrBrowsable : public RCBase<LkCounter<int>>
 {
 public:
     explicit BrBrowsable(LiString path);
     ~BrBrowsable() override;
 
-    /// What the browser's scheme calls its place; of a file the absolute path, in the bytes of the file system.
+    /// The path of its place in the browser's scheme; of a file the absolute path, in the bytes of the file system.
     virtual LiString getPath() const;
 
 private:

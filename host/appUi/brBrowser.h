@@ -35,27 +35,27 @@ public:
 
     ~BrBrowser() override;
 
-    /// Where folders are shown.
+    /// Sets where folders are shown.
     void setFolderOption(PaneEnum);
 
-    /// How entries are shown.
+    /// Sets how entries are shown.
     void setViewType(BrTypes::ViewType);
 
-    /// Whether numbered files, as "frame.0001.exr" and those after it, are one entry; at first they are. Scripts never
-    /// are: each is one to be run.
+    /// Makes numbered files, as "frame.0001.exr" and those after it, one entry, as at first, or an entry each. Scripts
+    /// always have one each: each is one to be run.
     void setSequencesCollapsed(bool collapsed);
 
     /// The same for numbered compositions, which are never part of another sequence; at first each is an entry.
     void setCompositionsCollapsed(bool collapsed);
 
-    /// Whether a composition that the user activates is a file like any other. Where it is not, as at first, the
-    /// handler of `setLoadCb` runs for it, if there is one, and `Activate` is not raised.
+    /// Makes a composition that the user activates a file like any other. Where it is not, as at first, the handler of
+    /// `setLoadCb` runs for it, if there is one, and `Activate` is not raised.
     void setDontLoadCompositions(bool dontLoad);
 
     /// `handler`, borrowed, loads the composition in focus. Null takes it away.
     void setLoadCb(CbHandler<EvEvent>* handler);
 
-    /// Whether more than one entry can be selected; at first only one can.
+    /// Lets the user select more than one entry; at first only one can be.
     void setMultiple(bool multiple);
 
     /// Goes to a directory, or to that of a file, which then is in focus. `url` is a path; one that is relative begins
@@ -73,10 +73,10 @@ public:
     /// The current directory.
     LiString getPath() const;
 
-    /// What others know of what is selected in it, the one among its client data. Never null.
+    /// The view of its entries, the one among its client data. Never null.
     RCShdPtr<UiView> getView() const;
 
-    /// Whether the user can type the path of an entry that is not there yet; at first that is so.
+    /// Lets the user type the path of an entry that is not there yet, as at first, or keeps the user from it.
     void setTakesNew(bool takesNew);
 
     /// Goes where the user has typed in its field without pressing Enter. What is not there yet, in a directory that

@@ -3,7 +3,7 @@
 namespace Kv
 {
 
-/// How browsers look.
+/// The looks of browsers.
 struct BrTypes
 {
     enum ViewType
@@ -13,26 +13,26 @@ struct BrTypes
     };
 };
 
-/// Where a browser shows the folders.
+/// The place where a browser shows the folders.
 enum class PaneEnum
 {
     /// In the list, ahead of the files; there is no pane for them alone.
     List = 0,
 };
 
-/// Whether a browser remembers where it has been, for going back.
+/// The memory of a browser for where it has been, for going back.
 enum class HistoryEnum
 {
     None = 0,
 };
 
-/// When a browser shows the place that it is sent to.
+/// The time at which a browser shows the place that it is sent to.
 enum class UpdateEnum
 {
     AtOnce = 0,
 };
 
-/// Whether places of a browser can be kept as bookmarks.
+/// The use of a browser's places as bookmarks.
 enum class Bookmarkable
 {
     No = 1,

@@ -27,7 +27,7 @@ public:
     /// The panel of the application's window in which dialogs float; null in a standalone interpreter.
     RCShdPtr<UiPanel> getMainPanel() const;
 
-    /// What is selected in the application; null where nothing is, and in a standalone interpreter.
+    /// The selection in the application; null where there is none, and in a standalone interpreter.
     RCShdPtr<SnSelection> getSelection() const;
 
     /// For the application: from here on it is there, with this window, this panel in it, and what is selected in this

@@ -37,10 +37,10 @@ public:
     /// The composition that the graph belongs to, open here or read by a script; expired if it has been closed.
     virtual RCWeakPtr<const PiCompositionGraphInterface> getComposition(RCShdPtr<const PiGraph> const& graph) const = 0;
 
-    /// Whether the composition is open and can be changed now, which the disk decides.
+    /// True if the composition is open and can be changed now, which the disk decides.
     virtual bool isCompositionEditable(RCWeakPtr<const PiCompositionGraphInterface> const& composition) const = 0;
 
-    /// Whether the file is that of an open composition, by whatever path it is named, and also if it was deleted since.
+    /// True if the file is that of an open composition, by whatever path it is named, and also if it was deleted since.
     virtual bool isCompositionOpened(OsFilePath const& path) const = 0;
 
     virtual unsigned int getNbCompositions() const = 0;

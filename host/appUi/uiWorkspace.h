@@ -10,17 +10,18 @@
 namespace Kv
 {
 
-/// What a widget that shows a collection lets others know of it. It is found among the widget's client data.
+/// The view of a widget that shows a collection: others learn from it what is selected. It is found among the widget's
+/// client data.
 class KV_API UiView : public RCBase<LkCounter<int>>
 {
 public:
     ~UiView() override;
 
-    /// What is selected in it now; null where it has no selection at all, as when its widget is gone.
+    /// The selection in it now; null where it has none at all, as when its widget is gone.
     virtual RCShdPtr<SnSelection> getSelection() = 0;
 };
 
-/// Where the user of the interactive application works.
+/// The place where the user of the interactive application works.
 class KV_API UiWorkspace : public RCBase<LkCounter<int>>
 {
 public:

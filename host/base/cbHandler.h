@@ -5,7 +5,7 @@
 namespace Kv
 {
 
-/// What the host calls for an event. The host keeps plain pointers to handlers; who makes one owns it.
+/// A handler that the host calls for an event. The host keeps plain pointers to handlers; who makes one owns it.
 template <typename Event> class CbHandler
 {
 public:

@@ -22,7 +22,7 @@ public:
     /// The reason, as `getReason` gives it.
     char const* what() const noexcept override;
 
-    /// What is wrong, in words.
+    /// The fault, in words.
     virtual char const* getReason() const;
 
     /// The reason with the place in the source behind it.

@@ -149,7 +149,7 @@ public:
     virtual void next() { _engine.makeOwn().next(); }
     virtual void previous() { _engine.makeOwn().previous(); }
 
-    /// How many items the whole walk has.
+    /// The number of items in the whole walk.
     virtual int getCardinality() const { return _engine->getCardinality(); }
 
     virtual Iterator operator++(int) // NOLINT(cert-dcl21-cpp)

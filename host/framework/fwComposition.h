@@ -34,7 +34,7 @@ public:
 
     ~FwComposition() override;
 
-    /// Whether it is owned by a keeper.
+    /// True while a keeper owns it.
     bool isApart() const;
 
     /// Takes it from its keeper. Null where none owns it.

@@ -55,7 +55,7 @@ constexpr char const* text = "text";
     fail(element.getLine(), words);
 }
 
-/// What nobody would read is an error: it may be a word that is misspelt.
+/// Refuses what nobody would read: it may be a misspelt word.
 void requireNothingElse(XmlElement const& element, std::initializer_list<char const*> attributeNames)
 {
     for (std::string const& name : element.getAttributeNames())

@@ -14,7 +14,7 @@ class FwComposition;
 class FwNode : public PiNode
 {
 public:
-    /// What a file tells of a node.
+    /// The name, type, inputs and values of a node, as its file gives them.
     struct Description
     {
         std::string name;

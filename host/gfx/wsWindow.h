@@ -11,7 +11,7 @@
 namespace Kv
 {
 
-/// What the window manager puts around and beside a window. One style of each is all that windows have here.
+/// The edges and buttons that the window manager puts around a window. One style of each is all that windows have here.
 enum class BorderStyle
 {
     Resizable = 0,
@@ -37,13 +37,13 @@ enum class CloseButtonStyle
     None = 1,
 };
 
-/// How a window looks on the screen, and where it stands.
+/// The look of a window on the screen, and its place.
 class KV_API WsWindowStyle : public RCBase<LkCounter<int>>
 {
 public:
     explicit WsWindowStyle(GeRectangle<int> const& frame) : _frame(frame) {}
 
-    /// Where the content of the window goes, in pixels of the screen, y growing upward.
+    /// The place of the window's content, in pixels of the screen, y growing upward.
     GeRectangle<int> const& getFrame() const { return _frame; }
 
 private:

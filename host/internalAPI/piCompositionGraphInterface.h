@@ -19,13 +19,13 @@ public:
     /// The composition's file: absolute, with symbolic links followed. It may have been deleted.
     virtual OsFilePath const& getPath() const = 0;
 
-    /// Whether the file can be written now, which is asked of the disk at each call.
+    /// True if the file can be written now, which is asked of the disk at each call.
     virtual bool isEditable() const = 0;
 
-    /// Whether there are changes that have not been saved.
+    /// True if there are changes that have not been saved.
     virtual bool isModified() const = 0;
 
-    /// Whether somebody else has written the file since it was opened or saved.
+    /// True if somebody else has written the file since it was opened or saved.
     virtual bool isChangedOnDisk() const = 0;
 
     /// Writes the file as a whole or not at all. Throws `ExBase`, naming the path, where it cannot be written, and

@@ -17,13 +17,13 @@ public:
     ~SnItem() override;
 };
 
-/// How items of a selection become what `T` points to. Each library that has a kind of item specializes it, with two
-/// static operations: `getPredicate`, which holds for the items of that kind, and `get`, which gives what such an item
-/// stands for, and null for any other.
+/// The way from items of a selection to what `T` points to. Each library that has a kind of item specializes it, with
+/// two static operations: `getPredicate`, which holds for the items of that kind, and `get`, which gives what such an
+/// item stands for, and null for any other.
 template <typename T> class SnItemConvert;
 
-/// What was selected at one moment, in the order in which it is shown. Keeps its items; it does not follow later
-/// changes.
+/// The items that were selected at one moment, in the order in which they are shown. Keeps them; it does not follow
+/// later changes.
 class KV_API SnSelection : public RCBase<LkCounter<int>>
 {
 public:

@@ -13,7 +13,7 @@ namespace Kv
 
 class PiNode;
 
-/// What stands behind a node and decides about it. It is held by strong pointers alone, and reached by weak ones.
+/// The object behind a node, which decides about it. It is held by strong pointers alone, and reached by weak ones.
 class KV_API PiNodeController
 {
 public:
@@ -64,11 +64,11 @@ class KV_API PiGraph : public RCBase<LkCounter<int>>
 public:
     ~PiGraph() override;
 
-    /// What controls the graph as a whole; expired once the graph is closed.
+    /// The controller of the graph as a whole; expired once the graph is closed.
     virtual RCWeakPtr<const PiNodeController> getController() const = 0;
     virtual RCWeakPtr<PiNodeController> getController() = 0;
 
-    /// What users know the graph by: bytes, if it comes from a file's name.
+    /// The name by which users know the graph: bytes, if it comes from a file's name.
     virtual std::string const& getName() const = 0;
 
     /// All nodes, in their order.

@@ -10,7 +10,7 @@ namespace Kv
 /// Identity that is unique without a registry.
 using Uuid = boost::uuids::uuid;
 
-/// What native code asks of the running Python.
+/// The questions of native code to the running Python.
 class KV_API PiPythonUtils
 {
 public:

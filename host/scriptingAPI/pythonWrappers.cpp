@@ -92,7 +92,7 @@ private:
             if (PyObject_TypeCheck(object, reinterpret_cast<PyTypeObject*>(type.get())))
                 _found.emplace_back(bp::borrowed(object));
         }
-        // What another thread has found waits until its objects can be looked at.
+        // The finds of another thread wait until their objects can be looked at.
         NtPlatform* const platform = WsNative::getLoadedPlatform();
         if (!platform || !WsThread::isCurrent())
             return;
@@ -114,7 +114,7 @@ private:
         if (!Py_IsInitialized())
             return;
         PythonLock const lock;
-        // What goes with them can come back here.
+        // Objects that go with them can come back here.
         std::vector<bp::handle<>> released;
         auto const [first, last] = _kept.equal_range(object);
         for (auto place = first; place != last; ++place)

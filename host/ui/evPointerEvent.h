@@ -10,7 +10,7 @@ namespace Kv
 class EvPointerEvent : public EvEvent
 {
 public:
-    /// Where the pointer is in the window, in pixels, y growing upward.
+    /// The place of the pointer in the window, in pixels, y growing upward.
     GeVector2<int> const& getPosition() const { return _position; }
 
 protected:
@@ -29,7 +29,7 @@ public:
     {
     }
 
-    /// Whether the left button is down.
+    /// True while the left button is down.
     bool isButtonDown() const { return _buttonDown; }
 
 private:

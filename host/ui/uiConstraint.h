@@ -23,7 +23,7 @@ public:
         Units = 3,
     };
 
-    /// What a value is measured from.
+    /// The edge or line that a value is measured from.
     enum Target
     {
         /// The parent's left or bottom edge.

@@ -22,7 +22,7 @@ public:
 
     UiWindow* getWindow() const override;
 
-    /// What the widgets in it are laid out in, in pixels of the window.
+    /// The rectangle that the widgets in it are laid out in, in pixels of the window.
     virtual GeRectangle<int> getFrame() const { return getRect(); }
 
     void setRect(GeRectangle<int> const& rect, bool layOut) override;

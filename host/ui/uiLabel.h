@@ -20,7 +20,7 @@ public:
     /// The text on its face.
     UiString& getLabel();
 
-    /// How the text sits in the widget from left to right.
+    /// Places the text in the widget from left to right.
     void setAlign(NtAlign align);
 
 protected:

@@ -8,7 +8,7 @@
 namespace Kv
 {
 
-/// What is drawn around a widget.
+/// The edge that is drawn around a widget.
 class KV_API UiFrame : public RCBase<LkCounter<int>>
 {
 public:

@@ -8,8 +8,8 @@
 namespace Kv
 {
 
-/// The window of the application, which has made it with the toolkit itself. The host's containers float in it, and
-/// stand in the panels that the application gives it.
+/// The window of the application, which has made it with Qt itself. The host's containers float in it, and stand in the
+/// panels that the application gives it.
 class KV_API UiMainWindow : public UiTopLevel
 {
 public:

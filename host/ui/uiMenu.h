@@ -29,7 +29,7 @@ public:
     /// the handlers of `ValueChanged` run, also when the selection stays the same.
     void setSelection(int index, bool notify);
 
-    /// How the text sits in the widget from left to right.
+    /// Places the text in the widget from left to right.
     void setAlign(NtAlign align);
 
 protected:

@@ -14,7 +14,7 @@ namespace Kv
 namespace
 {
 
-// What of a container always stays within reach, in pixels: so much of its width, and so much of it below its top edge.
+// The part of a container that always stays within reach, in pixels of its width, and of its height from its top edge.
 constexpr int gripWidth = 48;
 constexpr int gripHeight = 24;
 

@@ -63,7 +63,7 @@ private:
         GeRectangle<int> rect;
     };
 
-    /// What the screen has of it when it stands at `rect`: where it is larger than the parent, all of that.
+    /// The part of it that is in sight when it stands at `rect`: where it is larger than the parent, all of that.
     GeRectangle<int> getShown(GeRectangle<int> const& rect) const;
 
     /// The rectangle moved by so many pixels, y growing upward, as far as it stays within reach. One that fills its
@@ -86,10 +86,10 @@ private:
     UiEventCallback<UiMoveContainer> _downCb;
     UiEventCallback<UiMoveContainer> _upCb;
     std::optional<Drag> _drag;
-    /// How many refusals of input were in force when it came to the front last, as far as they still are.
+    /// The number of refusals of input that were in force when it came to the front last, and still are.
     int _inputLevel = 0;
 
-    /// What the screen leaves for the content, beside scroll bars, in pixels; unknown while it is on none.
+    /// The room on the screen for the content, beside scroll bars, in pixels; unknown while it is on none.
     std::optional<GeVector2<int>> _room;
     GeVector2<int> _contentSize;
     NtFloat* _float = nullptr;

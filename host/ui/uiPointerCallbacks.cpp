@@ -32,7 +32,7 @@ void UiPointerCallbacks::run(CbHandler<EvEvent>* handler, int x, int y, Args con
 {
     if (!handler || !_widget->takesInput())
         return;
-    // What the handler does may end the widget, and with it these.
+    // The handler may end the widget, and with it these.
     RCShdPtr<UiWidget> const keeper(_widget);
     Event event(_widget->flipY(x, y), args...);
     handler->call(event);

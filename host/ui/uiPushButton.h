@@ -17,7 +17,7 @@ public:
     /// The text on its face.
     UiString& getLabel() { return _label; }
 
-    /// How the text sits in the widget from left to right.
+    /// Places the text in the widget from left to right.
     void setAlign(NtAlign align);
 
     /// Does what a click of the user does: nothing where a user could not click.

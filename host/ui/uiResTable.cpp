@@ -33,7 +33,7 @@ std::function<std::string()>& scriptFolder()
     return find;
 }
 
-/// Where a resource can lie, the extension left open.
+/// The places where a resource can lie, without the extension.
 std::vector<fs::path> placesOf(fs::path const& name)
 {
     if (name.has_parent_path())

@@ -11,7 +11,7 @@ namespace Kv
 class KV_API UiTextField : public UiPeeredWidget<NtTextField>
 {
 public:
-    /// Where a new text leaves the text cursor.
+    /// The place of the text cursor after a new text.
     enum CursorPosition
     {
         Start = 0,
@@ -29,7 +29,7 @@ public:
     /// also when the text stays the same. Throws an `ExBase` for a text that is no UTF-8.
     void setString(char const* text, CursorPosition position, bool append, bool notify);
 
-    /// How the text sits in the widget from left to right.
+    /// Places the text in the widget from left to right.
     void setAlign(NtAlign align);
 
 protected:

@@ -51,10 +51,10 @@ public:
     /// The face for event handlers. Never null.
     RCShdPtr<PiWidget> getPiWidget();
 
-    /// How narrow the widget may become where its width follows that of its container, in pixels.
+    /// The least width that the widget may get where it follows that of its container, in pixels.
     virtual int getLeastWidth() const;
 
-    /// Where the widget lies in its window, in pixels, y growing upward. The layout says so for a widget with a
+    /// The place of the widget in its window, in pixels, y growing upward. The layout gives it to a widget with a
     /// constraint, once its window is shown.
     GeRectangle<int> const& getRect() const;
 
@@ -64,7 +64,7 @@ public:
     std::optional<UiConstraint> const& getConstraint() const { return _constraint; }
     void setConstraint(UiConstraint const& constraint);
 
-    /// Whether the widget itself is to be seen; it is on the screen if all that hold it are so too.
+    /// True if the widget itself is to be seen; it is on the screen if all that hold it are so too.
     bool isDisplayed() const;
     virtual void display(bool displayed);
 
@@ -73,16 +73,16 @@ public:
     /// May come from any thread: the end of a widget does not choose its own.
     virtual void hide();
 
-    /// Whether the widget itself takes input; it does if all that hold it do so too.
+    /// True if the widget itself is enabled; it takes input if all that hold it are so too.
     bool isEnabled() const;
 
     /// A change runs the handlers of `Enable` or `Disable`.
     void setEnabled(bool enabled);
 
-    /// Whether something above the widget keeps input from it for a while; its own enabled state stays as it is.
+    /// Keeps input from the widget for a while, or lets it in again; its own enabled state stays as it is.
     void setBlocked(bool blocked);
 
-    /// Whether the widget itself can be given the keyboard.
+    /// True if the widget itself can be given the keyboard.
     bool isKeyboardFocusable() const { return _keyboardFocusable; }
     void setKeyboardFocusable(bool focusable);
 
@@ -122,8 +122,8 @@ public:
     /// that is not there, or does not name the widget, is no error and changes nothing.
     static void setWidgetResTable(RCShdPtr<UiWidget> const& widget, std::string const& resourceName);
 
-    /// What others have attached to the widget, in the order in which it came. An array, borrowed, valid until more is
-    /// attached.
+    /// The objects that others have attached to the widget, in the order in which they came. An array, borrowed, valid
+    /// until more is attached.
     RCShdPtr<RCBase<LkCounter<int>>> const* getClientDataListPtr() const;
     int getClientDataListSize() const;
 
@@ -149,7 +149,7 @@ protected:
     /// Lets the native peer go. A widget that points to it forgets it first.
     virtual void dropPeer();
 
-    /// Where the native peer stands in the window, in pixels, y growing upward.
+    /// The place of the native peer in the window, in pixels, y growing upward.
     virtual GeRectangle<int> getCell() const { return _rect; }
 
     /// The widget has been put above its siblings.

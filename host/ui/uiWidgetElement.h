@@ -54,7 +54,7 @@ private:
     int _depth;
     std::string _name;
     std::optional<UiConstraint> _constraint;
-    /// What is left of the element itself, and of its `Widget`.
+    /// The parts of the element, and of its `Widget`, that nobody has taken yet.
     std::vector<XmlElement> _parts;
     std::vector<XmlElement> _properties;
 };

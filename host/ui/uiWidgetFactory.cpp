@@ -32,7 +32,7 @@ std::string toLetters(std::string const& text)
     return letters;
 }
 
-/// Whether who wrote `name` may have meant `kind`: as "text_field" or "Text" may be a "TextField".
+/// True if `name` may be meant for `kind`: "text_field" and "Text" may be meant for a "TextField".
 bool isNear(std::string const& name, std::string const& kind)
 {
     std::string const letters = toLetters(name);

@@ -25,7 +25,7 @@ public:
 class KV_API UiWidgetFactory
 {
 public:
-    /// How deep containers may stand in each other.
+    /// The greatest depth of containers in containers.
     static constexpr int maxDepth = 256;
 
     /// Builds the widget of `element`, with all that it holds, as the last in `parent`, and gives it.

@@ -9,7 +9,7 @@ namespace Kv
 
 class UiContainer;
 
-/// What holds a tree of widgets and shows it on the screen.
+/// A tree of widgets on the screen.
 class KV_API UiWindow
 {
 public:
@@ -23,7 +23,7 @@ public:
 
     virtual bool isShown() const = 0;
 
-    /// How many times input is refused in the window just now.
+    /// The number of refusals of input in the window that are in force.
     virtual int getInputLevel() const { return 0; }
 
     /// Paints the window anew. True if it stands on the screen.

@@ -1,4 +1,4 @@
-"""Shows dialogs and prints what stands where in them, as the toolkit drew it: run as a script, with the colours."""
+"""Shows dialogs and prints what stands where in them, as Qt drew it: run as a script, with the colours."""
 
 import json
 import sys

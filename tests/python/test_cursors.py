@@ -65,7 +65,7 @@ def test_an_unknown_cursor_is_refused_with_the_names_and_changes_nothing():
 
 
 @pytest.mark.standalone
-def test_without_a_display_a_guard_is_harmless_and_loads_no_toolkit():
+def test_without_a_display_a_guard_is_harmless_and_loads_no_qt():
     assert scripts.run_script('''
 from quorvane_velmora import ui
 guard = ui.CursorGuard('busy')

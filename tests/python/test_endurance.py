@@ -24,7 +24,7 @@ def show(times):
 
 def take_stock():
     gc.collect()
-    # What the toolkit lets go when the loop comes around that the application itself runs in.
+    # What Qt lets go when the loop comes around that the application itself runs in.
     QApplication.sendPostedEvents(None, QEvent.Type.DeferredDelete.value)
     windows = 0
     if QApplication.platformName() == 'xcb':

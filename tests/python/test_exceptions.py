@@ -167,7 +167,7 @@ DRIVERS = {
 
 
 @pytest.mark.parametrize('drive', DRIVERS.values(), ids=DRIVERS.keys())
-def test_an_exception_passes_a_callback_that_itself_drives_the_toolkit(user, drive):
+def test_an_exception_passes_a_callback_that_itself_drives_qt(user, drive):
     dialog = make_dialog()
     after = []
     exception = ValueError('of the script')
@@ -279,7 +279,7 @@ def test_the_last_reference_to_a_dialog_with_a_left_window_goes_while_its_other_
 
 
 class Intruder(QObject):
-    """Runs Python code, which fails, for whatever the toolkit does to anybody."""
+    """Runs Python code, which fails, for whatever Qt does to anybody."""
 
     def __init__(self):
         super().__init__()

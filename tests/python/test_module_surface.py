@@ -86,18 +86,18 @@ assert try_depths('libKVpyextUi')
 ''', PYTHONPATH=LIBS)
 
 
-def test_the_toolkit_is_loaded_only_where_a_text_must_be_measured():
+def test_qt_is_loaded_only_where_a_text_must_be_measured():
     run_script('''
-def toolkit():
+def qt():
     with open('/proc/self/maps') as maps:
         return 'libQt' in maps.read()
 from quorvane_velmora import ui
 ui.instantiateAppMgr()
-assert not toolkit()
+assert not qt()
 xml = ui.makeXmlFromWidgetList([(kind, kind, kind) for kind in ('TextField', 'ToggleButton', 'Menu', 'Label')])
-assert not toolkit()
+assert not qt()
 ui.makeXmlFromWidgetList([('PushButton', 'measured')])
-assert toolkit()
+assert qt()
 ''', QT_QPA_PLATFORM='offscreen')
 
 

@@ -1,4 +1,4 @@
-"""A user who types and clicks, through real events of the toolkit."""
+"""A user who types and clicks, through real events of Qt."""
 
 import traceback
 from contextlib import contextmanager

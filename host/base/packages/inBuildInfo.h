@@ -9,7 +9,7 @@
 namespace Kv
 {
 
-/// What a package says of the build that it comes from. The texts last as long as this.
+/// The facts that a package gives about its build. The texts last as long as this.
 class KV_API InBuildInfo
 {
 public:
@@ -28,7 +28,7 @@ public:
     virtual int getMajorVersion() const = 0;
     virtual int getMinorVersion() const = 0;
 
-    /// How far the release has come; 3 is under development.
+    /// The stage of the release; 3 is under development.
     virtual int getReleaseStage() const = 0;
     virtual char const* getBuildNumber() const = 0;
 
@@ -63,7 +63,7 @@ private:
     std::string _buildDate;
 };
 
-/// What a process is.
+/// The kinds of processes.
 enum class ApplicationModes
 {
     Interactive = 0,
@@ -79,7 +79,7 @@ struct InPackageInfo
     InBuildInfo const* buildInfo;
 };
 
-/// What is known of the process and of the packages that it is made of.
+/// The facts about the process and about the packages that it is made of.
 class KV_API InBuildInfoUtil
 {
 public:

@@ -10,7 +10,7 @@
 namespace Kv
 {
 
-/// What has to be set up in an order: knows what must be ready before it. Borrows what it depends on.
+/// A thing that is set up in an order: knows what must be ready before it. Borrows what it depends on.
 class KV_API InVariableBase
 {
 public:

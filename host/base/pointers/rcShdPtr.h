@@ -12,7 +12,7 @@
 namespace Kv
 {
 
-/// What pointers to objects that derive from `RCBase` share: one word, which can be null. Going through a null one
+/// The base of pointers to objects that derive from `RCBase`: one word, which can be null. Going through a null one
 /// throws `ExNullPtr`. Counting is left to the class derived from it.
 template <typename T> class RCBasePtr
 {

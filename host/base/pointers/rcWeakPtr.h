@@ -65,7 +65,7 @@ public:
     /// Holds the object; null for an expired pointer.
     std::shared_ptr<T> lock() const { return _object.lock(); }
 
-    /// Whether both point to one object, or did so before it went.
+    /// True if both point to one object, or did so before it went.
     friend bool operator==(RCWeakPtr const& a, RCWeakPtr const& b)
     {
         return !a._object.owner_before(b._object) && !b._object.owner_before(a._object);

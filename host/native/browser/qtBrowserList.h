@@ -34,7 +34,7 @@ protected:
     void changeEvent(QEvent* event) override;
 
 private:
-    /// Where nothing is selected, selects the row that the keyboard is on: what a key does next is seen before. True if
+    /// Selects the row that the keyboard is on, where nothing is selected: what a key does next is seen before. True if
     /// it has.
     bool selectFirst();
     void fitColumns();

@@ -25,13 +25,13 @@ namespace Kv
 namespace
 {
 
-/// How often the directory is looked at.
+/// The time between two looks at the directory.
 constexpr std::chrono::seconds lookInterval(1);
 
-/// How long a reading may take before the list says so.
+/// The time that a reading may take before the list says so.
 constexpr std::chrono::milliseconds patience(250);
 
-/// Why a directory cannot be shown any more, in words; empty if it can.
+/// The reason why a directory cannot be shown any more, in words; empty if it can.
 std::string findFault(std::string const& directory)
 {
     try

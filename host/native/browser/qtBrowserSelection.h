@@ -48,7 +48,7 @@ public:
     bool settle();
 
 private:
-    /// Where the list was before its rows were replaced.
+    /// The place of the list before its rows were replaced.
     struct View
     {
         /// The row that the keyboard was on, selected or not.
@@ -68,7 +68,7 @@ private:
     QtDirModel& _model;
     std::function<void()> _onChosen;
 
-    /// What is to be selected once the rows are there, and where the list is to stand then.
+    /// The choice and the place of the list that are to be restored once the rows are there.
     QtBrowserChoice _wanted;
     View _view;
     bool _awaiting = false;

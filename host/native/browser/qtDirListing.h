@@ -15,7 +15,7 @@ struct QtDirEntry
 {
     /// Of a sequence, the name of its first file.
     std::string name;
-    /// What a reader sees: the name, or as "frame.####.exr  1-100" the sequence.
+    /// The text that a reader sees: the name, or as "frame.####.exr  1-100" the sequence.
     std::string title;
     /// In the order of these bytes names come as people count, "a2" before "a10", whatever the case.
     std::string sortKey;

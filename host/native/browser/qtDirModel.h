@@ -46,7 +46,7 @@ public:
 
     bool isReading() const { return _worker.isBusy(); }
 
-    /// Why the directory could not be read, in words; else empty.
+    /// The reason why the directory could not be read, in words; else empty.
     std::string const& getError() const { return _error; }
 
     QtDirEntry const& getEntry(int row) const;

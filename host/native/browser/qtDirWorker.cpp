@@ -9,7 +9,7 @@
 namespace Kv
 {
 
-/// What the two threads share.
+/// The data that the two threads share.
 struct QtDirWorker::Job
 {
     std::atomic<bool> cancelled = false;

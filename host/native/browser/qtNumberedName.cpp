@@ -20,7 +20,7 @@ bool isDigit(char c)
     return c >= '0' && c <= '9';
 }
 
-/// Where the extension begins, unless it is a number itself; else the end of the name.
+/// The place of the extension, unless it is a number itself; else the end of the name.
 std::size_t findExtension(std::string const& name)
 {
     std::size_t const dot = name.rfind('.');

@@ -90,7 +90,7 @@ void QtPathCompleter::filter()
          name != _names.cend() && name->startsWith(_typedName) && proposals.size() < maxProposals; ++name)
         if (!name->startsWith(QLatin1Char('.')) || _typedName.startsWith(QLatin1Char('.')))
             proposals.append(*name);
-    // What is typed in full needs no proposal.
+    // A name that is typed in full needs no proposal.
     if (proposals.size() == 1 && proposals.front() == _typedName)
         proposals.clear();
     _model.setStringList(proposals);

@@ -22,7 +22,7 @@ public:
     /// True if the user has typed something else since.
     bool isEdited() const;
 
-    /// What the user has typed, in bytes of the file system; it can be relative to the current directory.
+    /// The path that the user has typed, in bytes of the file system; it can be relative to the current directory.
     std::string getTypedPath() const;
 
 protected:

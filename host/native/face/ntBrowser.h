@@ -34,10 +34,11 @@ public:
     virtual void goTo(std::string const& directory, std::string const& focus,
                       std::vector<std::string> const& selected) = 0;
 
-    /// Which files may become part of a numbered sequence, by their names. Called for each file.
+    /// Sets the function that says, of a file's name, if it may become part of a numbered sequence. Called for each
+    /// file.
     virtual void setCollapsing(std::function<bool(std::string const&)> collapses) = 0;
 
-    /// Whether more than one entry can be selected.
+    /// Lets the user select more than one entry.
     virtual void setMultiple(bool multiple) = 0;
 
     /// Goes where the user has typed without pressing Enter, as Enter would, and the listener hears of it; gives an

@@ -46,7 +46,7 @@ public:
     /// Size of the content in pixels.
     virtual void setContentSize(int width, int height) = 0;
 
-    /// How much room a scroll bar takes beside the content, in pixels.
+    /// The room that a scroll bar takes beside the content, in pixels.
     virtual int getBarThickness() const = 0;
 };
 

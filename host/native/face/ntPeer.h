@@ -5,7 +5,7 @@
 namespace Kv
 {
 
-/// How a text sits in its widget from left to right; from bottom to top it is always centred.
+/// The place of a text in its widget from left to right; from bottom to top it is always centred.
 enum class NtAlign
 {
     Left,

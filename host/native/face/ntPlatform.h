@@ -21,8 +21,8 @@ enum class NtCursor
     Busy,
 };
 
-/// How the interpreter of the scripts takes part in the native loop. Installed by the library that knows it; without
-/// one the loop runs native handlers alone.
+/// The part of the scripts' interpreter in the native loop. Installed by the library that knows it; without one the
+/// loop runs native handlers alone.
 class NtScriptHook
 {
 public:

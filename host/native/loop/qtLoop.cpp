@@ -13,7 +13,7 @@ namespace Kv
 namespace
 {
 
-/// How long the flag, set by nobody that the loop hears of, and Ctrl-C can stay unseen.
+/// The time that Ctrl-C, and a flag that is set without an event, can stay unseen.
 constexpr std::chrono::milliseconds tickInterval(50);
 
 /// An exit that was asked for while no loop of the application itself ran is remembered for ever, and ends each later
@@ -53,7 +53,7 @@ std::exception_ptr QtLoop::run()
         forgetExit();
         _loop.exec();
     }
-    // What ended the loop then is the end of the application.
+    // The loop was then ended by the end of the application.
     if (!_error && !*_until && _end)
         *_end = true;
     return _error;

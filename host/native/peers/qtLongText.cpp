@@ -30,7 +30,7 @@ QString cut(QFontMetrics const& metrics, QString line, int width)
     return metrics.elidedText(line.append(ellipsis), Qt::ElideRight, width);
 }
 
-/// Where the lines of a paragraph begin, `most` at most.
+/// The places where the lines of a paragraph begin, `most` at most.
 std::vector<int> findBreaks(QString const& paragraph, QFont const& font, int width, int most)
 {
     if (most == 1 || fits(QFontMetrics(font), paragraph, width))

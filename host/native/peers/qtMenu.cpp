@@ -19,7 +19,7 @@ namespace Kv
 namespace
 {
 
-/// How many entries a popup shows at once before it scrolls.
+/// The number of entries that a popup shows at once; with more it scrolls.
 constexpr int maxShown = 20;
 
 class ComboBox final : public QComboBox

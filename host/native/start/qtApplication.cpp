@@ -17,8 +17,8 @@ namespace Kv
 namespace
 {
 
-/// The toolkit sets every category of the C library's locale. Numbers stay as they were: interpreters and parsers of
-/// this process count on them.
+/// Qt sets every category of the C library's locale. Numbers stay as they were: interpreters and parsers of this
+/// process count on them.
 class NumberLocaleKeeper
 {
 public:

@@ -7,8 +7,8 @@ class QCoreApplication;
 namespace Kv
 {
 
-/// The application object of the toolkit, which there is once in the process. One that somebody else made is used as it
-/// is and stays theirs, whenever it comes; else one of our own is made, which lives as long as the process.
+/// Qt's application object, which there is once in the process. One that somebody else made is used as it is and stays
+/// theirs, whenever it comes; else one of our own is made, which lives as long as the process.
 class QtApplication
 {
 public:
@@ -32,7 +32,7 @@ private:
     /// Ours, or null; never destroyed.
     QCoreApplication* _own = nullptr;
 
-    /// Why our own application cannot show windows, or was not even made.
+    /// The reason why our own application cannot show windows, or was not even made.
     std::string _refusal;
     bool _tried = false;
 };

@@ -38,7 +38,7 @@ QString nameOf(QString const& platform)
     return platform.section(QLatin1Char(':'), 0, 0).toLower();
 }
 
-/// Folders in which the toolkit will look for platform plugins.
+/// The folders in which Qt will look for platform plugins.
 QStringList pluginFolders()
 {
     QStringList folders;

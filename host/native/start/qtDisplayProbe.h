@@ -14,15 +14,15 @@ namespace Kv
 /// Platform that a QApplication can be started on without ending the process, or the words why there is none.
 struct DisplayChoice
 {
-    /// Name with its parameters, as the toolkit's "-platform" argument takes it; empty where there is none.
+    /// Name with its parameters, as Qt's "-platform" argument takes it; empty where there is none.
     QString platform;
 
-    /// Why windows cannot be shown, and what to set; empty where they can.
+    /// The reason why windows cannot be shown, and what to set; empty where they can.
     std::string refusal;
 };
 
-/// Looks for a window system before the toolkit does: the toolkit ends the process where it finds none. Has to live
-/// until the toolkit has started: a server whose only client leaves can reset itself and refuse the next one meanwhile.
+/// Looks for a window system before Qt does: Qt ends the process where it finds none. Has to live until Qt has started:
+/// a server whose only client leaves can reset itself and refuse the next one meanwhile.
 class QtDisplayProbe
 {
 public:

@@ -27,7 +27,7 @@ namespace Kv
 namespace
 {
 
-/// What layouts reckon with where there is no screen to ask.
+/// The size that layouts reckon with where there is no screen to ask.
 constexpr GeVector2<int> assumedScreen{1920, 1080};
 
 /// Watches those objects in a tree whose addresses are among `wanted`, and adds them to `found`.
@@ -64,7 +64,7 @@ double measure(QString const& text)
     return buttonFont == labelFont ? width : std::max(width, measureIn(buttonFont, text));
 }
 
-/// What is left free of the screen's height for the window manager's frame, which is known only when it is too late.
+/// The height that is left free for the window manager's frame, which is known only when it is too late.
 constexpr int titleBarRoom = 40;
 
 /// Turns a frame over, makes it fit the free part of the screen and moves it there.

@@ -29,7 +29,7 @@ private:
 
 QtPlaceWatch::QtPlaceWatch(QWidget& widget, NtPlaceListener& listener) : _handle(listener), _widget(&widget)
 {
-    // What holds the widget moves it too.
+    // The widgets that hold this one move it too.
     for (QWidget* around = &widget; around; around = around->parentWidget())
         around->installEventFilter(this);
     tell();

@@ -20,7 +20,7 @@ QtLabel* toLabel(QWidget& widget)
     return dynamic_cast<QtLabel*>(&widget);
 }
 
-/// Where a label of the row is displayed, those that are not say nothing.
+/// Leaves out the labels that are not displayed, in a row where another one is.
 void dropHiddenLabels(Row& row)
 {
     auto const isHidden = [](QWidget* widget) { return toLabel(*widget) && widget->isHidden(); };

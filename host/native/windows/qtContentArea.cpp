@@ -14,7 +14,7 @@ namespace Kv
 namespace
 {
 
-/// How often a layout may make scroll bars come and go before it is left as it is.
+/// The number of times that scroll bars may come and go before a layout is left as it is.
 constexpr int maxRounds = 4;
 
 /// Height of a row of a form, in pixels.

@@ -2,8 +2,8 @@
 
 #include "peers/qtLabel.h"
 #include "peers/qtPeer.h"
-#include "windows/qtFrontOrder.h"
 #include "windows/qtFocusOrder.h"
+#include "windows/qtFrontOrder.h"
 
 #include <QApplication>
 #include <QKeyEvent>
@@ -92,7 +92,7 @@ QtFloat::QtFloat(QWidget* parent, QtListenerHandle<NtFloatListener> const& handl
     setAutoFillBackground(true);
     // Of no size of its own: that comes with the content.
     _area->setWidget(new QWidget);
-    // Who is given the keyboard wants to be seen.
+    // A widget that is given the keyboard is to be seen.
     connect(qApp, &QApplication::focusChanged, this,
             [this](QWidget* from, QWidget* to)
             {
@@ -139,7 +139,7 @@ void QtFloat::pin(QWidget& widget)
 void QtFloat::askIntoView(QWidget const& widget) const
 {
     QWidget const* const room = parentWidget();
-    // What is scrolled out of sight comes by no move.
+    // A move does not bring into sight what is scrolled away.
     QRect const seen = rect().intersected({widget.mapTo(this, QPoint(0, 0)), widget.size()}).translated(pos());
     int const right = getShift(seen.x(), seen.width(), room->width());
     int const down = getShift(seen.y(), seen.height(), room->height());

@@ -22,7 +22,7 @@ public:
     /// The innermost one that holds the widget, or is it; null if there is none.
     static QtFloat* findAround(QWidget& widget);
 
-    /// Where the widgets in it stand; scrolled where it is larger.
+    /// The native parent of the widgets in it; scrolled where it is larger.
     QWidget* getContent() const { return _area ? _area->widget() : nullptr; }
     void setContentSize(int width, int height);
 

@@ -31,7 +31,7 @@ bool takesFocus(QWidget const& widget)
 std::vector<QWidget*> findStops(QWidget const& root)
 {
     QWidget const* const window = root.window();
-    // Where the keyboard is now counts also if it cannot stay there: the step goes from there.
+    // The widget that has the keyboard counts also if it cannot keep it: the step goes from there.
     QWidget const* const current = window->focusWidget();
     std::vector<QWidget*> stops;
     for (QWidget* const widget : root.findChildren<QWidget*>())

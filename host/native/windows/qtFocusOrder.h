@@ -7,7 +7,7 @@
 namespace Kv
 {
 
-/// How the keyboard goes through the widgets: as the eye does, row by row from the top, each from left to right.
+/// The way of the keyboard through the widgets: as the eye goes, row by row from the top, each from left to right.
 class QtFocusOrder
 {
 public:

@@ -13,7 +13,7 @@ namespace Kv
 namespace
 {
 
-/// What of a float is in sight unless something lies above it, in the coordinates of its window.
+/// The part of a float that is in sight unless something lies above it, in the coordinates of its window.
 QRect getVisibleRect(QWidget const& floating)
 {
     QWidget const& parent = *floating.parentWidget();

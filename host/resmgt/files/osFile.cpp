@@ -58,7 +58,7 @@ char const* getNoFileWords(struct stat const& status)
     return S_ISDIR(status.st_mode) ? "it is a folder" : "it is no regular file";
 }
 
-/// What is in the way of writing a file, in words; nothing where nothing is. `status` is that of the file, if there is
+/// The obstacle to writing a file, in words; nothing where there is none. `status` is that of the file, if there is
 /// one.
 std::optional<std::string> findObstacle(OsFilePath const& path, std::optional<struct stat> const& status)
 {

@@ -45,7 +45,7 @@ public:
     /// A text that is another one once the file has been written or replaced; empty where there is no regular file.
     std::string getVersion() const;
 
-    /// Whether `replace` would find what it needs: a regular file that can be written, or none, in a folder that can be
+    /// True if `replace` would find what it needs: a regular file that can be written, or none, in a folder that can be
     /// written. A file that nobody may write, by its permissions, cannot be written by the superuser either.
     bool isWritable() const;
 

@@ -7,7 +7,7 @@
 namespace Kv
 {
 
-/// Where a path leads: to a directory, or to an entry in one. All are bytes of the file system.
+/// The place that a path leads to: a directory, or an entry in one. All are bytes of the file system.
 struct KV_API OsPlace
 {
     /// Absolute, without a slash at the end but for the root.

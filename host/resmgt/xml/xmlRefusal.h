@@ -8,14 +8,14 @@
 namespace Kv
 {
 
-/// What the parser does not take of a text.
+/// A place in a text that the parser refuses, and why.
 struct XmlRefusal
 {
     XML_Error error;
     /// The line of `place`.
     int line;
     std::string_view text;
-    /// Where the tag or whatever it is begins, and where it goes wrong.
+    /// The start of the tag, or whatever it is, and the place of the fault in it.
     std::size_t begin;
     std::size_t place;
     /// The innermost element that is open, with its line; empty where none is.

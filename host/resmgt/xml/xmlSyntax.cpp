@@ -44,7 +44,7 @@ bool isName(std::string const& text)
         return false;
     if (std::all_of(text.begin(), text.end(), isAscii))
         return true;
-    // Which other characters are those of a name, the reader knows.
+    // The parser knows which other characters are those of a name.
     std::string const element = "<" + text + "/>";
     std::unique_ptr<XML_ParserStruct, decltype(&XML_ParserFree)> const parser(XML_ParserCreate("UTF-8"),
                                                                               &XML_ParserFree);

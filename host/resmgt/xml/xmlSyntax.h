@@ -9,10 +9,10 @@
 namespace Kv::XmlSyntax
 {
 
-/// How deep elements may stand in each other; the root alone is one deep.
+/// The deepest nesting of elements; the root alone is one deep.
 constexpr int maximumDepth = 1024;
 
-/// What XML counts as white space.
+/// The white space of XML.
 constexpr char const* blanks = " \t\r\n";
 
 /// The first thing in a text that no XML document can hold.

@@ -152,7 +152,7 @@ void XmlWriter::requireAttribute(std::string const& name) const
         fail("Attribute '" + name + "' of element '" + _openNames.back() + "' is written twice");
 }
 
-/// What stands in front of a new element: the end of the parent's start tag, and a new line.
+/// The text in front of a new element: the end of the parent's start tag, and a new line.
 std::string XmlWriter::getLead() const
 {
     if (_openNames.empty())
@@ -165,7 +165,7 @@ std::string XmlWriter::getLineLead(std::size_t depth) const
     return "\n" + std::string(depth * _indent, ' ');
 }
 
-/// What stands behind a whole element with `depth` elements open around it.
+/// The text behind a whole element with `depth` elements open around it.
 char const* XmlWriter::getTrail(std::size_t depth) const
 {
     return depth == 0 ? "\n" : "";
