@@ -45,6 +45,12 @@ QString const rowsKey = QStringLiteral("rows");
 QString const logKey = QStringLiteral("log");
 QByteArray const hiddenLook = QByteArrayLiteral("hidden");
 
+/// A text for a menu, in which each ampersand stands for itself.
+QString withoutShortcuts(QString text)
+{
+    return text.replace(QLatin1Char('&'), QLatin1String("&&"));
+}
+
 QAction* addCommand(QMenu& menu, QString const& text, QKeySequence const& keys, std::function<void()> const& run)
 {
     QAction* const action = menu.addAction(text, keys, &menu, run);
@@ -298,8 +304,7 @@ void MainWindow::showRecentScripts(QMenu& menu)
         QFileInfo const file(QString::fromStdString(path));
         QString const folder =
             fontMetrics().elidedText(QDir::toNativeSeparators(file.path()), Qt::ElideMiddle, menuWidth);
-        QString text = file.fileName() + QStringLiteral("    ") + folder;
-        text.replace(QLatin1Char('&'), QLatin1String("&&"));
+        QString const text = withoutShortcuts(file.fileName() + QStringLiteral("    ") + folder);
         addCommand(menu, QStringLiteral("&%1  %2").arg(++place % 10).arg(text), {},
                    [this, path] { _commands.runRecentScript(path); });
     }
@@ -320,7 +325,7 @@ void MainWindow::showInMenu(std::vector<CompositionEntry> const& entries)
     int place = 0;
     for (CompositionEntry const& entry : entries)
     {
-        auto* const action = new QAction(QString(entry.name).replace(QLatin1Char('&'), QLatin1String("&&")), _openOnes);
+        auto* const action = new QAction(withoutShortcuts(entry.name), _openOnes);
         action->setCheckable(true);
         action->setChecked(entry.isCurrent);
         constexpr int lastDigit = 9;
