@@ -56,12 +56,11 @@ constexpr char const* text = "text";
 }
 
 /// Refuses what nobody would read: it may be a misspelt word.
-void requireNothingElse(XmlElement const& element, std::initializer_list<char const*> attributeNames)
+void requireNothingElse(XmlElement const& element, std::initializer_list<std::string_view> attributeNames)
 {
-    for (std::string const& name : element.getAttributeNames())
-        if (std::find(attributeNames.begin(), attributeNames.end(), name) == attributeNames.end())
-            fail(element,
-                 "element '" + element.getName() + "' has an unknown attribute " + LiStringUtil::getPrintable(name));
+    if (std::optional<std::string> const name = element.findOtherAttribute(attributeNames))
+        fail(element,
+             "element '" + element.getName() + "' has an unknown attribute " + LiStringUtil::getPrintable(*name));
     if (element.hasText())
         fail(element, "element '" + element.getName() + "' holds a text");
 }

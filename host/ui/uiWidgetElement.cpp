@@ -3,9 +3,10 @@
 #include "xml/xmlError.h"
 
 #include <algorithm>
+#include <array>
 #include <charconv>
 #include <initializer_list>
-#include <map>
+#include <string_view>
 
 namespace Kv
 {
@@ -18,14 +19,18 @@ namespace
     throw XmlError(__FILE__, __LINE__, element.getLine(), words);
 }
 
+void requireNoOtherAttribute(XmlElement const& element, std::initializer_list<std::string_view> known)
+{
+    if (std::optional<std::string> const name = element.findOtherAttribute(known))
+        fail(element, "unknown attribute \"" + *name + "\" of \"" + element.getName() + "\"");
+}
+
 /// Refuses text and attributes that an element of this name has no use for.
-void requirePlain(XmlElement const& element, std::initializer_list<char const*> attributes = {})
+void requirePlain(XmlElement const& element, std::initializer_list<std::string_view> attributes = {})
 {
     if (element.hasText())
         fail(element, "text in the element \"" + element.getName() + "\", which holds none");
-    for (std::string const& name : element.getAttributeNames())
-        if (std::find(attributes.begin(), attributes.end(), name) == attributes.end())
-            fail(element, "unknown attribute \"" + name + "\" of \"" + element.getName() + "\"");
+    requireNoOtherAttribute(element, attributes);
 }
 
 void requireNoChildren(XmlElement const& element)
@@ -41,7 +46,7 @@ XmlElement requireOnly(XmlElement const& parent, std::string const& name)
     requirePlain(parent);
     std::vector<XmlElement> const children = parent.getChildren();
     for (XmlElement const& child : children)
-        if (child.getName() != name)
+        if (!child.isNamed(name))
             fail(child, "unknown element \"" + child.getName() + "\" in \"" + parent.getName() + "\"");
     if (children.size() != 1)
         fail(parent, "\"" + parent.getName() + "\" holds " + std::to_string(children.size()) + " elements \"" + name +
@@ -66,25 +71,24 @@ int toInt(XmlElement const& element, std::string const& text)
 
 std::string readText(XmlElement const& element)
 {
-    for (std::string const& name : element.getAttributeNames())
-        fail(element, "unknown attribute \"" + name + "\" of \"" + element.getName() + "\"");
+    requireNoOtherAttribute(element, {});
     requireNoChildren(element);
     return element.getText();
 }
 
-using Codes = std::map<std::string, UiConstraint::Target>;
-
-Codes const& getTargetCodes(UiConstraint::EdgeName edge)
+/// Nothing for a word that is no target of that edge.
+std::optional<UiConstraint::Target> findTarget(std::string_view word, UiConstraint::EdgeName edge)
 {
-    static Codes const horizontal{{"l", UiConstraint::ParentLow},
-                                  {"r", UiConstraint::ParentHigh},
-                                  {"w", UiConstraint::OwnOpposite},
-                                  {"s", UiConstraint::SiblingEdge}};
-    static Codes const vertical{{"b", UiConstraint::ParentLow},
-                                {"t", UiConstraint::ParentHigh},
-                                {"h", UiConstraint::OwnOpposite},
-                                {"s", UiConstraint::SiblingEdge}};
-    return edge == UiConstraint::X1 || edge == UiConstraint::X2 ? horizontal : vertical;
+    bool const isHorizontal = edge == UiConstraint::X1 || edge == UiConstraint::X2;
+    if (word == (isHorizontal ? "l" : "b"))
+        return UiConstraint::ParentLow;
+    if (word == (isHorizontal ? "r" : "t"))
+        return UiConstraint::ParentHigh;
+    if (word == (isHorizontal ? "w" : "h"))
+        return UiConstraint::OwnOpposite;
+    if (word == "s")
+        return UiConstraint::SiblingEdge;
+    return std::nullopt;
 }
 
 UiConstraint::Type readType(XmlElement const& element)
@@ -105,11 +109,10 @@ UiConstraint::Edge readEdge(XmlElement const& element, UiConstraint::EdgeName na
     edge.value = static_cast<float>(toInt(element, element.getAttribute("Value")));
     edge.type = readType(element);
     std::string const target = element.getAttribute("Target");
-    Codes const& codes = getTargetCodes(name);
-    auto const code = codes.find(target);
-    if (code == codes.end())
+    std::optional<UiConstraint::Target> const known = findTarget(target, name);
+    if (!known)
         fail(element, "unknown Target \"" + target + "\" of \"" + element.getName() + "\"");
-    edge.target = code->second;
+    edge.target = *known;
     if (edge.target == UiConstraint::SiblingEdge)
         edge.sibling = element.getAttribute("Sibling");
     else if (element.findAttribute("Sibling"))
@@ -121,19 +124,20 @@ UiConstraint readConstraint(XmlElement const& layout)
 {
     XmlElement const constraint = requireOnly(layout, "Constraint");
     requirePlain(constraint);
-    static std::map<std::string, UiConstraint::EdgeName> const names{
-        {"X1", UiConstraint::X1}, {"Y1", UiConstraint::Y1}, {"X2", UiConstraint::X2}, {"Y2", UiConstraint::Y2}};
+    constexpr std::array<char const*, UiConstraint::EdgeCount> names{"X1", "Y1", "X2", "Y2"};
     std::array<std::optional<UiConstraint::Edge>, UiConstraint::EdgeCount> edges;
     for (XmlElement const& element : constraint.getChildren())
     {
-        auto const name = names.find(element.getName());
-        if (name == names.end() || edges.at(name->second))
+        auto const name = std::find_if(names.begin(), names.end(),
+                                       [&element](char const* candidate) { return element.isNamed(candidate); });
+        auto const index = static_cast<std::size_t>(name - names.begin());
+        if (name == names.end() || edges.at(index))
             fail(element, "unknown or repeated element \"" + element.getName() + "\" in \"Constraint\"");
-        edges.at(name->second) = readEdge(element, name->second);
+        edges.at(index) = readEdge(element, static_cast<UiConstraint::EdgeName>(index));
     }
-    for (auto const& [name, edge] : names)
+    for (std::size_t edge = 0; edge < edges.size(); ++edge)
         if (!edges.at(edge))
-            fail(constraint, "\"Constraint\" has no \"" + name + "\"");
+            fail(constraint, std::string("\"Constraint\" has no \"") + names.at(edge) + "\"");
     return UiConstraint(
         {*edges[UiConstraint::X1], *edges[UiConstraint::Y1], *edges[UiConstraint::X2], *edges[UiConstraint::Y2]});
 }
@@ -173,7 +177,7 @@ std::vector<std::string> UiWidgetElement::takeTexts(std::string const& name)
     requirePlain(*list);
     for (XmlElement const& text : list->getChildren())
     {
-        if (text.getName() != "Text")
+        if (!text.isNamed("Text"))
             fail(text, "unknown element \"" + text.getName() + "\" in \"" + name + "\"");
         texts.push_back(readText(text));
     }
@@ -228,8 +232,8 @@ void UiWidgetElement::finish() const
 
 std::optional<XmlElement> UiWidgetElement::take(std::vector<XmlElement>& from, std::string const& name)
 {
-    auto const found = std::find_if(from.begin(), from.end(),
-                                    [&name](XmlElement const& element) { return element.getName() == name; });
+    auto const found =
+        std::find_if(from.begin(), from.end(), [&name](XmlElement const& element) { return element.isNamed(name); });
     if (found == from.end())
         return std::nullopt;
     XmlElement element = *found;

@@ -33,6 +33,8 @@ private:
         CbHandler<std::string>* handler;
     };
 
+    /// The next place at which a pattern can begin.
+    std::size_t findFirstByte(std::string const& text, std::size_t from) const;
     Rule const* findRule(std::string const& text, std::size_t position) const;
 
     std::vector<Rule> _rules;

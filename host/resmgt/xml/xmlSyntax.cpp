@@ -1,6 +1,8 @@
 #include "xml/xmlSyntax.h"
 
 #include <algorithm>
+#include <array>
+#include <cstddef>
 #include <cstdint>
 #include <expat.h>
 #include <memory>
@@ -20,27 +22,46 @@ bool isAllowed(std::uint32_t codePoint)
     return codePoint != 0xfffe && codePoint != 0xffff;
 }
 
+/// The part that a byte can have in a text or a name.
+struct Byte
+{
+    bool isPlain = false;
+    bool startsName = false;
+    bool continuesName = false;
+};
+
+constexpr std::array<Byte, 256> classifyBytes()
+{
+    std::array<Byte, 256> bytes{};
+    for (std::size_t i = 0; i < bytes.size(); ++i)
+    {
+        bool const isLetter = (i >= 'a' && i <= 'z') || (i >= 'A' && i <= 'Z');
+        bool const isDigit = i >= '0' && i <= '9';
+        bytes[i].isPlain = i < 0x80 && (i >= ' ' || i == '\t' || i == '\n' || i == '\r');
+        bytes[i].startsName = isLetter || i == '_' || i == ':' || i >= 0x80;
+        bytes[i].continuesName = bytes[i].startsName || isDigit || i == '-' || i == '.';
+    }
+    return bytes;
+}
+
+constexpr std::array<Byte, 256> bytes = classifyBytes();
+
+Byte const& classify(char character)
+{
+    return bytes[static_cast<unsigned char>(character)];
+}
+
 bool isAscii(char character)
 {
     return static_cast<unsigned char>(character) < 0x80;
-}
-
-bool startsName(char character)
-{
-    return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z') || character == '_' ||
-           character == ':' || !isAscii(character);
-}
-
-bool continuesName(char character)
-{
-    return startsName(character) || (character >= '0' && character <= '9') || character == '-' || character == '.';
 }
 
 } // namespace
 
 bool isName(std::string const& text)
 {
-    if (text.empty() || !startsName(text.front()) || !std::all_of(text.begin(), text.end(), continuesName))
+    auto const continuesName = [](char character) { return classify(character).continuesName; };
+    if (text.empty() || !classify(text.front()).startsName || !std::all_of(text.begin(), text.end(), continuesName))
         return false;
     if (std::all_of(text.begin(), text.end(), isAscii))
         return true;
@@ -53,6 +74,9 @@ bool isName(std::string const& text)
 
 std::optional<Offence> findOffence(std::string_view text)
 {
+    // Most texts are plain to the end.
+    if (std::all_of(text.begin(), text.end(), [](char character) { return classify(character).isPlain; }))
+        return std::nullopt;
     auto const* const begin = text.data();
     auto const* const end = begin + text.size();
     auto const* const validEnd = utf8::find_invalid(begin, end);

@@ -12,8 +12,11 @@ namespace Kv::XmlSyntax
 /// The deepest nesting of elements; the root alone is one deep.
 constexpr int maximumDepth = 1024;
 
-/// The white space of XML.
-constexpr char const* blanks = " \t\r\n";
+/// True for the white space of XML.
+constexpr bool isBlank(char character)
+{
+    return character == ' ' || character == '\t' || character == '\r' || character == '\n';
+}
 
 /// The first thing in a text that no XML document can hold.
 struct Offence

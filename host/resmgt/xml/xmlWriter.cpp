@@ -4,17 +4,17 @@
 #include "xml/xmlError.h"
 #include "xml/xmlSyntax.h"
 
+#include <algorithm>
+#include <array>
+#include <charconv>
 #include <ostream>
+#include <string_view>
 
 namespace Kv
 {
 
 namespace
 {
-
-constexpr char const* escapedInText = "<>&\"\r";
-// A reader turns these, when they stand in an attribute as they are, into blanks.
-constexpr char const* escapedInAttribute = "<>&\"\r\n\t";
 
 [[noreturn]] void fail(std::string const& words)
 {
@@ -42,17 +42,31 @@ char const* getReference(char character)
     }
 }
 
-std::string escape(std::string const& text, char const* escaped)
+/// True for the bytes that stand as references.
+using Escaped = std::array<bool, 256>;
+
+constexpr Escaped makeEscaped(std::string_view characters)
 {
-    std::string result;
+    Escaped escaped{};
+    for (char const character : characters)
+        escaped[static_cast<unsigned char>(character)] = true;
+    return escaped;
+}
+
+constexpr Escaped escapedInText = makeEscaped("<>&\"\r");
+// A reader turns these, when they stand in an attribute as they are, into blanks.
+constexpr Escaped escapedInAttribute = makeEscaped("<>&\"\r\n\t");
+
+void appendEscaped(std::string& to, std::string const& text, Escaped const& escaped)
+{
     std::size_t copied = 0;
-    for (std::size_t place = text.find_first_of(escaped); place != std::string::npos;
-         place = text.find_first_of(escaped, copied))
-    {
-        result.append(text, copied, place - copied) += getReference(text[place]);
-        copied = place + 1;
-    }
-    return result.append(text, copied);
+    for (std::size_t place = 0; place < text.size(); ++place)
+        if (escaped[static_cast<unsigned char>(text[place])])
+        {
+            to.append(text, copied, place - copied) += getReference(text[place]);
+            copied = place + 1;
+        }
+    to.append(text, copied);
 }
 
 std::size_t requireIndent(int indent)
@@ -71,19 +85,23 @@ XmlWriter::~XmlWriter() = default;
 void XmlWriter::openTag(std::string const& name)
 {
     requireElement(name);
-    write(getLead() + "<" + name);
+    beginTag(name);
     _openNames.push_back(name);
-    _attributeNames.clear();
+    _attributeCount = 0;
     _isStartTagOpen = true;
     _hasRoot = true;
+    flush();
 }
 
 void XmlWriter::writeAttrib(std::string const& name, std::string const& value)
 {
     requireAttribute(name);
-    requireText(value, "attribute '" + name + "' of element '" + _openNames.back() + "'");
-    write(" " + name + "=\"" + escape(value, escapedInAttribute) + "\"");
-    _attributeNames.insert(name);
+    if (XmlSyntax::findOffence(value))
+        requireText(value, "attribute '" + name + "' of element '" + _openNames.back() + "'");
+    beginAttribute(name);
+    appendEscaped(_text, value, escapedInAttribute);
+    _text += '"';
+    rememberAttribute(name);
 }
 
 void XmlWriter::writeAttrib(std::string const& name, char const* value)
@@ -93,17 +111,30 @@ void XmlWriter::writeAttrib(std::string const& name, char const* value)
 
 void XmlWriter::writeAttrib(std::string const& name, int value)
 {
-    writeAttrib(name, LiStringUtil::convertNb(value));
+    requireAttribute(name);
+    beginAttribute(name);
+    addNumber(value);
+    _text += '"';
+    rememberAttribute(name);
 }
 
 void XmlWriter::writeTag(std::string const& name, std::string const& text)
 {
     requireElement(name);
-    requireText(text, "text of element '" + name + "'");
-    std::string const tail = text.empty() ? "/>" : ">" + escape(text, escapedInText) + "</" + name + ">";
-    write(getLead() + "<" + name + tail + getTrail(_openNames.size()));
+    if (XmlSyntax::findOffence(text))
+        requireText(text, "text of element '" + name + "'");
+    beginTag(name);
+    if (text.empty())
+        _text += "/>";
+    else
+    {
+        _text += '>';
+        appendEscaped(_text, text, escapedInText);
+        _text.append("</").append(name) += '>';
+    }
     _isStartTagOpen = false;
     _hasRoot = true;
+    flush();
 }
 
 void XmlWriter::writeTag(std::string const& name, char const* text)
@@ -121,9 +152,16 @@ void XmlWriter::closeTag()
     if (_openNames.empty())
         fail("There is no open element to close");
     std::size_t const depth = _openNames.size() - 1;
-    write((_isStartTagOpen ? "/>" : getLineLead(depth) + "</" + _openNames.back() + ">") + getTrail(depth));
+    if (_isStartTagOpen)
+        _text += "/>";
+    else
+    {
+        addLine(depth);
+        _text.append("</").append(_openNames.back()) += '>';
+    }
     _openNames.pop_back();
     _isStartTagOpen = false;
+    flush();
 }
 
 void XmlWriter::requireText(std::string const& text, std::string const& what)
@@ -148,33 +186,60 @@ void XmlWriter::requireAttribute(std::string const& name) const
         fail("No name for an XML attribute: " + LiStringUtil::getPrintable(name));
     if (!_isStartTagOpen)
         fail("Attribute '" + name + "' does not follow the opening of an element");
-    if (_attributeNames.count(name) != 0)
+    auto const end = _attributeNames.begin() + static_cast<std::ptrdiff_t>(_attributeCount);
+    if (std::find(_attributeNames.begin(), end, name) != end)
         fail("Attribute '" + name + "' of element '" + _openNames.back() + "' is written twice");
 }
 
-/// The text in front of a new element: the end of the parent's start tag, and a new line.
-std::string XmlWriter::getLead() const
+/// Ends the parent's start tag, begins a line and opens the tag.
+void XmlWriter::beginTag(std::string const& name)
 {
-    if (_openNames.empty())
-        return {};
-    return (_isStartTagOpen ? ">" : "") + getLineLead(_openNames.size());
+    if (_isStartTagOpen)
+        _text += '>';
+    if (!_openNames.empty())
+        addLine(_openNames.size());
+    (_text += '<') += name;
 }
 
-std::string XmlWriter::getLineLead(std::size_t depth) const
+void XmlWriter::beginAttribute(std::string const& name)
 {
-    return "\n" + std::string(depth * _indent, ' ');
+    ((_text += ' ') += name) += "=\"";
 }
 
-/// The text behind a whole element with `depth` elements open around it.
-char const* XmlWriter::getTrail(std::size_t depth) const
+void XmlWriter::addLine(std::size_t depth)
 {
-    return depth == 0 ? "\n" : "";
+    (_text += '\n').append(depth * _indent, ' ');
 }
 
-void XmlWriter::write(std::string const& text)
+void XmlWriter::addNumber(int number)
 {
-    if (!_stream.write(text.data(), static_cast<std::streamsize>(text.size())))
+    std::array<char, 16> digits;
+    std::to_chars_result const end = std::to_chars(digits.data(), digits.data() + digits.size(), number);
+    _text.append(digits.data(), end.ptr);
+}
+
+void XmlWriter::flush()
+{
+    constexpr std::size_t much = 1 << 16;
+    bool const isWhole = _openNames.empty();
+    if (isWhole)
+        _text += '\n';
+    if (isWhole || _text.size() > much)
+    {
+        _stream.write(_text.data(), static_cast<std::streamsize>(_text.size()));
+        _text.clear();
+    }
+    if (!_stream)
         fail("The stream of an XML document takes no more text");
+}
+
+void XmlWriter::rememberAttribute(std::string const& name)
+{
+    if (_attributeCount == _attributeNames.size())
+        _attributeNames.push_back(name);
+    else
+        _attributeNames[_attributeCount] = name;
+    ++_attributeCount;
 }
 
 } // namespace Kv

@@ -2,16 +2,16 @@
 
 #include "kvExport.h"
 
+#include <cstddef>
 #include <iosfwd>
-#include <set>
 #include <string>
 #include <vector>
 
 namespace Kv
 {
 
-/// Writes one XML document, in UTF-8, onto a stream as the calls come; behind the last `closeTag` the stream holds all
-/// of it. What XML cannot hold, and calls that would give no document, throw `XmlError` and leave stream and writer as
+/// Writes one XML document, in UTF-8, onto a stream, piece by piece; behind the last `closeTag` the stream holds all of
+/// it. What XML cannot hold, and calls that would give no document, throw `XmlError` and leave stream and writer as
 /// they were. A stream that fails throws `XmlError` too, and is of no more use.
 class KV_API XmlWriter
 {
@@ -44,15 +44,24 @@ public:
 private:
     void requireElement(std::string const& name) const;
     void requireAttribute(std::string const& name) const;
-    std::string getLead() const;
-    std::string getLineLead(std::size_t depth) const;
-    char const* getTrail(std::size_t depth) const;
-    void write(std::string const& text);
+
+    void beginTag(std::string const& name);
+    void beginAttribute(std::string const& name);
+    void addLine(std::size_t depth);
+    void addNumber(int number);
+
+    /// Hands the text that waits to the stream, where that is all of the document or much.
+    void flush();
+    void rememberAttribute(std::string const& name);
 
     std::ostream& _stream;
     std::size_t _indent;
     std::vector<std::string> _openNames;
-    std::set<std::string> _attributeNames;
+    /// Those of the element just opened are the first ones; the others wait to be used again.
+    std::vector<std::string> _attributeNames;
+    std::size_t _attributeCount = 0;
+    /// The text that the stream has not got yet.
+    std::string _text;
     bool _isStartTagOpen = false;
     bool _hasRoot = false;
 };

@@ -15,7 +15,9 @@
 
 #include <algorithm>
 #include <array>
-#include <sstream>
+#include <ostream>
+#include <streambuf>
+#include <utility>
 
 namespace bp = boost::python;
 
@@ -30,7 +32,7 @@ std::string const toggleButtonType = "ToggleButton";
 std::string const pushButtonType = "PushButton";
 std::string const menuType = "Menu";
 std::string const labelType = "Label";
-std::string const closeButtonsContainer = "CloseButtonsContainer";
+constexpr char const* closeButtonsContainer = "CloseButtonsContainer";
 
 // All in layout units.
 constexpr int rowPitch = 4;
@@ -48,6 +50,37 @@ constexpr int closeBarHeight = 5;
 // The width of the caption column is known only when all rows are written. Until then these stand in for it.
 constexpr int labelColumnPlaceholder = -999;
 constexpr int widgetColumnPlaceholder = -888;
+
+/// A string stream, whose text can be taken without a copy of it.
+class TextBuffer final : public std::streambuf
+{
+public:
+    /// As much memory as a form of so many rows needs, as a rule.
+    explicit TextBuffer(Py_ssize_t rowCount)
+    {
+        constexpr std::size_t rowSize = 1500;
+        constexpr Py_ssize_t maxRows = 1 << 16;
+        _text.reserve(rowSize * static_cast<std::size_t>(std::min(rowCount, maxRows) + 1));
+    }
+
+    std::string take() { return std::move(_text); }
+
+protected:
+    std::streamsize xsputn(char const* text, std::streamsize size) override
+    {
+        _text.append(text, static_cast<std::size_t>(size));
+        return size;
+    }
+
+    int_type overflow(int_type character) override
+    {
+        _text += traits_type::to_char_type(character);
+        return character;
+    }
+
+private:
+    std::string _text;
+};
 
 struct Substituter
 {
@@ -73,7 +106,8 @@ WidgetListGenerator::~WidgetListGenerator() = default;
 
 std::string WidgetListGenerator::generate()
 {
-    std::ostringstream stream;
+    TextBuffer buffer(PyList_GET_SIZE(_widgets.ptr()));
+    std::ostream stream(&buffer);
     _writer = std::make_unique<XmlWriter>(stream, 2);
     writeContainerHead("MainContainer", {1, "u", "l"}, {1, "u", "b"}, {-1, "uu", "r"}, {-4, "uu", "t"});
     writeContainerHead(closeButtonsContainer, {0, "u", "l"}, {0, "u", "b"}, {0, "uu", "r"}, {closeBarHeight, "u", "h"});
@@ -83,7 +117,7 @@ std::string WidgetListGenerator::generate()
                        {0, "uu", "r"}, {0, "uu", "t"});
     int const labelColumnWidth = writeRows();
     closeTags(4);
-    std::string text = stream.str();
+    std::string text = buffer.take();
     _writer.reset();
     substitutePlaceholders(text, labelColumnWidth);
     return text;
@@ -209,7 +243,7 @@ void WidgetListGenerator::writeRowLabel(std::string const& label, int rowOffset)
 }
 
 void WidgetListGenerator::openRowWidget(std::string const& type, std::string const& name, int rowOffset, int x2Value,
-                                        std::string const& x2Target)
+                                        char const* x2Target)
 {
     bool const isPushButton = type == pushButtonType;
     openWidget(type, name);
@@ -244,13 +278,13 @@ void WidgetListGenerator::writeConstraint(Edge const& x1, Edge const& y1, Edge c
     closeTags(2);
 }
 
-void WidgetListGenerator::writeEdge(std::string const& edge, Edge const& place)
+void WidgetListGenerator::writeEdge(char const* edge, Edge const& place)
 {
     _writer->openTag(edge);
     _writer->writeAttrib("Value", place.value);
     _writer->writeAttrib("Type", place.type);
     _writer->writeAttrib("Target", place.target);
-    if (!place.sibling.empty())
+    if (*place.sibling)
         _writer->writeAttrib("Sibling", place.sibling);
     _writer->closeTag();
 }
@@ -262,7 +296,7 @@ void WidgetListGenerator::writeLabelString(std::string const& text)
     _writer->closeTag();
 }
 
-void WidgetListGenerator::writeLabelAlign(std::string const& h, std::string const& v)
+void WidgetListGenerator::writeLabelAlign(char const* h, char const* v)
 {
     _writer->openTag("LabelAlign");
     _writer->openTag("Align");

@@ -51,7 +51,7 @@ private:
     {
         std::string name;
         int x2Value;
-        std::string x2Target;
+        char const* x2Target;
         void (WidgetListGenerator::*writeValue)(boost::python::object const&);
     };
 
@@ -59,9 +59,9 @@ private:
     struct Edge
     {
         int value;
-        std::string type;
-        std::string target;
-        std::string sibling = {};
+        char const* type;
+        char const* target;
+        char const* sibling = "";
     };
 
     /// The kind without a name for a type that is none of the others.
@@ -81,14 +81,14 @@ private:
     void writeRowLabel(std::string const& label, int rowOffset);
     /// Leaves the widget element and its `Widget` open.
     void openRowWidget(std::string const& type, std::string const& name, int rowOffset, int x2Value,
-                       std::string const& x2Target);
+                       char const* x2Target);
     /// Leaves the element and its `Widget` open.
     void openWidget(std::string const& element, std::string const& name);
     void closeTags(int count);
     void writeConstraint(Edge const& x1, Edge const& y1, Edge const& x2, Edge const& y2);
-    void writeEdge(std::string const& edge, Edge const& place);
+    void writeEdge(char const* edge, Edge const& place);
     void writeLabelString(std::string const& text);
-    void writeLabelAlign(std::string const& h, std::string const& v);
+    void writeLabelAlign(char const* h, char const* v);
     void writeTextValue(boost::python::object const& value);
     void writeStateValue(boost::python::object const& value);
     void writeMenuValue(boost::python::object const& value);
