@@ -49,7 +49,8 @@ GeRectangle<int> makeFrame(int x, int y, int width, int height)
 /// The face for events of a widget that raises any; null for every other.
 RCShdPtr<PiWidget> findEventFace(RCShdPtr<UiWidget> const& widget)
 {
-    return hasValue(widget) || dynamicCast<UiPushButton>(widget) ? widget->getPiWidget() : nullptr;
+    bool const raisesEvents = hasValue(findValueKind(*widget)) || dynamicCast<UiPushButton>(widget);
+    return raisesEvents ? widget->getPiWidget() : nullptr;
 }
 
 } // namespace
@@ -312,14 +313,15 @@ bp::object Dialog::getWidgetValue(RCShdPtr<UiContainer> container, std::string c
 {
     for (RCShdPtr<UiWidget> const& child : container->getChildren())
     {
-        if (RCShdPtr<UiContainer> const inner = dynamicCast<UiContainer>(child))
+        ValueKind const kind = findValueKind(*child);
+        if (kind == ValueKind::Container)
         {
-            bp::object value = getWidgetValue(inner, widgetName);
+            bp::object value = getWidgetValue(dynamicCast<UiContainer>(child), widgetName);
             if (!value.is_none())
                 return value;
         }
-        else if (hasValue(child) && child->getName() == widgetName)
-            return readValue(child);
+        else if (hasValue(kind) && child->getName() == widgetName)
+            return readValue(*child, kind);
     }
     return bp::object();
 }
@@ -330,10 +332,11 @@ void Dialog::getWidgetValues(RCShdPtr<UiContainer> container, bp::dict& values) 
         values[getCloseButtonClickedKey()] = closeButton;
     for (RCShdPtr<UiWidget> const& child : container->getChildren())
     {
-        if (RCShdPtr<UiContainer> const inner = dynamicCast<UiContainer>(child))
-            getWidgetValues(inner, values);
-        else if (hasValue(child))
-            values[child->getName()] = readValue(child);
+        ValueKind const kind = findValueKind(*child);
+        if (kind == ValueKind::Container)
+            getWidgetValues(dynamicCast<UiContainer>(child), values);
+        else if (hasValue(kind))
+            values[child->getName()] = readValue(*child, kind);
     }
 }
 
@@ -342,14 +345,15 @@ bool Dialog::setWidgetValue(RCShdPtr<UiContainer> container, std::string const& 
 {
     for (RCShdPtr<UiWidget> const& child : container->getChildren())
     {
-        if (RCShdPtr<UiContainer> const inner = dynamicCast<UiContainer>(child))
+        ValueKind const kind = findValueKind(*child);
+        if (kind == ValueKind::Container)
         {
-            if (setWidgetValue(inner, widgetName, value, invokeCallback))
+            if (setWidgetValue(dynamicCast<UiContainer>(child), widgetName, value, invokeCallback))
                 return true;
         }
-        else if (child->getName() == widgetName && hasValue(child))
+        else if (hasValue(kind) && child->getName() == widgetName)
         {
-            writeValue(child, value, MenuEntries::Replace, invokeCallback);
+            writeValue(*child, kind, value, MenuEntries::Replace, invokeCallback);
             return true;
         }
     }
@@ -360,10 +364,11 @@ void Dialog::setWidgetValues(RCShdPtr<UiContainer> container, bp::dict const& va
 {
     for (RCShdPtr<UiWidget> const& child : container->getChildren())
     {
-        if (RCShdPtr<UiContainer> const inner = dynamicCast<UiContainer>(child))
-            setWidgetValues(inner, values, invokeCallback);
-        else if (values.has_key(child->getName()) && hasValue(child))
-            writeValue(child, values.get(child->getName()), MenuEntries::Add, invokeCallback);
+        ValueKind const kind = findValueKind(*child);
+        if (kind == ValueKind::Container)
+            setWidgetValues(dynamicCast<UiContainer>(child), values, invokeCallback);
+        else if (values.has_key(child->getName()) && hasValue(kind))
+            writeValue(*child, kind, values.get(child->getName()), MenuEntries::Add, invokeCallback);
     }
 }
 

@@ -4,11 +4,15 @@
 
 #include "pyUiError.h"
 #include "pyUtils.h"
+#include "uiContainer.h"
 #include "uiDualState.h"
 #include "uiMenu.h"
 #include "uiTextField.h"
 
 #include <map>
+#include <typeinfo>
+#include <utility>
+#include <vector>
 
 namespace bp = boost::python;
 
@@ -47,34 +51,68 @@ int fillMenu(UiMenu& menu, bp::object const& value, MenuEntries mode)
     return bp::extract<int>(form[1]);
 }
 
+ValueKind castToKind(UiWidget const& widget)
+{
+    if (dynamic_cast<UiContainer const*>(&widget))
+        return ValueKind::Container;
+    if (dynamic_cast<UiTextField const*>(&widget))
+        return ValueKind::TextField;
+    if (dynamic_cast<UiDualState const*>(&widget))
+        return ValueKind::ToggleButton;
+    return dynamic_cast<UiMenu const*>(&widget) ? ValueKind::Menu : ValueKind::None;
+}
+
 } // namespace
 
-bool hasValue(RCShdPtr<UiWidget> const& widget)
+ValueKind findValueKind(UiWidget const& widget)
 {
-    return dynamicCast<UiTextField>(widget) || dynamicCast<UiDualState>(widget) || dynamicCast<UiMenu>(widget);
+    // Few classes, each looked into once: a cast compares names.
+    static std::vector<std::pair<std::type_info const*, ValueKind>> known;
+    std::type_info const* const type = &typeid(widget);
+    for (auto const& [knownType, kind] : known)
+        if (knownType == type)
+            return kind;
+    known.emplace_back(type, castToKind(widget));
+    return known.back().second;
 }
 
-bp::object readValue(RCShdPtr<UiWidget> const& widget)
+bp::object readValue(UiWidget const& widget, ValueKind kind)
 {
-    if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
-        return bp::object(field->getString());
-    if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
-        return bp::object(toggle->getState());
-    return bp::object(dynamicCast<UiMenu>(widget)->getStrPtr());
-}
-
-void writeValue(RCShdPtr<UiWidget> const& widget, bp::object const& value, MenuEntries mode, bool invokeCallback)
-{
-    auto const read = [&](auto action, char const* kind)
-    { return withNote(action, [&] { return describeValue(kind, widget->getName(), value); }); };
-    if (RCShdPtr<UiTextField> const field = dynamicCast<UiTextField>(widget))
-        field->setString(read([&] { return readText(value); }, "TextField"), UiTextField::End, false, invokeCallback);
-    else if (RCShdPtr<UiDualState> const toggle = dynamicCast<UiDualState>(widget))
-        toggle->setState(read([&] { return bp::extract<bool>(value)(); }, "ToggleButton"), invokeCallback);
-    else
+    switch (kind)
     {
-        RCShdPtr<UiMenu> const menu = dynamicCast<UiMenu>(widget);
-        menu->setSelection(read([&] { return fillMenu(*menu, value, mode); }, "Menu"), invokeCallback);
+    case ValueKind::TextField:
+        return bp::object(static_cast<UiTextField const&>(widget).getString());
+    case ValueKind::ToggleButton:
+        return bp::object(static_cast<UiDualState const&>(widget).getState());
+    case ValueKind::Menu:
+        return bp::object(static_cast<UiMenu const&>(widget).getStrPtr());
+    default:
+        return bp::object();
+    }
+}
+
+void writeValue(UiWidget& widget, ValueKind kind, bp::object const& value, MenuEntries mode, bool invokeCallback)
+{
+    auto const read = [&](auto action, char const* name)
+    { return withNote(action, [&] { return describeValue(name, widget.getName(), value); }); };
+    switch (kind)
+    {
+    case ValueKind::TextField:
+        static_cast<UiTextField&>(widget).setString(read([&] { return readText(value); }, "TextField"),
+                                                    UiTextField::End, false, invokeCallback);
+        break;
+    case ValueKind::ToggleButton:
+        static_cast<UiDualState&>(widget).setState(read([&] { return bp::extract<bool>(value)(); }, "ToggleButton"),
+                                                   invokeCallback);
+        break;
+    case ValueKind::Menu:
+    {
+        auto& menu = static_cast<UiMenu&>(widget);
+        menu.setSelection(read([&] { return fillMenu(menu, value, mode); }, "Menu"), invokeCallback);
+        break;
+    }
+    default:
+        break;
     }
 }
 

@@ -2,7 +2,6 @@
 
 #include <boost/python/object.hpp>
 
-#include "pointers/rcShdPtr.h"
 #include "uiWidget.h"
 
 #include <string>
@@ -12,11 +11,26 @@ namespace Kv::PyextUi
 
 // The values of widgets as scripts see them. The source of this file knows the kinds that have one.
 
-/// True for a widget of a kind that has a value.
-bool hasValue(RCShdPtr<UiWidget> const& widget);
+/// The kinds of widgets that a value tells apart.
+enum class ValueKind
+{
+    None,
+    Container,
+    TextField,
+    ToggleButton,
+    Menu,
+};
 
-/// The value of a widget that has one.
-boost::python::object readValue(RCShdPtr<UiWidget> const& widget);
+ValueKind findValueKind(UiWidget const& widget);
+
+/// True for the kinds that have a value.
+constexpr bool hasValue(ValueKind kind)
+{
+    return kind != ValueKind::None && kind != ValueKind::Container;
+}
+
+/// The value of a widget of that kind; None where it has none.
+boost::python::object readValue(UiWidget const& widget, ValueKind kind);
 
 /// The fate of the entries that a menu has when it is written.
 enum class MenuEntries
@@ -25,8 +39,9 @@ enum class MenuEntries
     Add,
 };
 
-/// Writes the value of a widget that has one. A value of the wrong form is a Python error with a note of the right one.
-void writeValue(RCShdPtr<UiWidget> const& widget, boost::python::object const& value, MenuEntries mode,
+/// Writes the value of a widget of that kind, where it has one. A value of the wrong form is a Python error with a note
+/// of the right one.
+void writeValue(UiWidget& widget, ValueKind kind, boost::python::object const& value, MenuEntries mode,
                 bool invokeCallback);
 
 /// Says what the widget of that name takes, and what it was given. `kind` is the kind's name in a description.
