@@ -9,9 +9,11 @@ if(KV_SANITIZE)
   target_compile_options(kv_options INTERFACE -fsanitize=address,undefined -fno-sanitize=vptr
                                               -fno-sanitize-recover=undefined -fno-omit-frame-pointer)
   target_link_options(kv_options INTERFACE -fsanitize=address,undefined)
-else()
-  target_link_options(kv_options INTERFACE -Wl,--no-undefined)
 endif()
+
+# kv_python: Python for libraries, which find the interpreter in the process that loads them.
+add_library(kv_python INTERFACE)
+target_link_libraries(kv_python INTERFACE Boost::python Python3::Module)
 
 # kv_library(NAME SOURCES... [DEPENDS rooms...] [PUBLIC targets...] [PRIVATE targets...] [OWN_RECORD]): a host or sibling
 # library, lib<NAME>.so. Its folder is the include folder for those that link it. It is a package by the name without
@@ -21,6 +23,9 @@ function(kv_library name)
   add_library(${name} SHARED ${arg_SOURCES})
   target_link_libraries(${name} PUBLIC ${arg_DEPENDS} ${arg_PUBLIC} PRIVATE kv_options ${arg_PRIVATE})
   target_include_directories(${name} PUBLIC ${CMAKE_CURRENT_SOURCE_DIR})
+  if(NOT KV_SANITIZE AND NOT kv_python IN_LIST arg_PUBLIC AND NOT kv_python IN_LIST arg_PRIVATE)
+    target_link_options(${name} PRIVATE -Wl,--no-undefined)
+  endif()
   set_target_properties(${name} PROPERTIES LIBRARY_OUTPUT_DIRECTORY ${KV_LIBRARY_DIR})
   if(NOT arg_OWN_RECORD)
     set(record ${PROJECT_SOURCE_DIR}/host/base/packages/inPackageRecord.cpp)
@@ -35,8 +40,7 @@ endfunction()
 
 # kv_python_module(NAME ...): as kv_library, an extension module lib<NAME> of the package.
 function(kv_python_module name)
-  kv_library(${name} ${ARGN})
-  target_link_libraries(${name} PUBLIC Boost::python Python3::Python)
+  kv_library(${name} ${ARGN} PUBLIC kv_python)
   # Modules that are linked to each other find each other wherever the package lies.
   set_target_properties(${name} PROPERTIES LIBRARY_OUTPUT_DIRECTORY ${KV_PACKAGE_DIR}/quorvane_velmora/libs
                                            BUILD_RPATH "$ORIGIN")
