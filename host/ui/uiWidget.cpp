@@ -227,13 +227,16 @@ GeVector2<int> UiWidget::flipY(int x, int y) const
 void UiWidget::realize(NtPlatform& platform, NtContainer& parent)
 {
     _peer = createPeer(platform, parent);
-    enablePeer();
-    _peer->setTooltip(_tooltip);
+    if (!_enabled || _blocked)
+        enablePeer();
+    if (!_tooltip.empty())
+        _peer->setTooltip(_tooltip);
     if (_frame || _background)
         showLook();
     if (_pointerCallbacks)
         _peer->setPointerListener(*_pointerCallbacks);
-    _peer->setDisplayed(_displayed);
+    if (!_displayed)
+        _peer->setDisplayed(false);
 }
 
 void UiWidget::dropPeer()

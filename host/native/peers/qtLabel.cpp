@@ -78,9 +78,13 @@ void QtLabel::setNamed(QWidget* widget)
 {
     if (widget == buddy())
         return;
-    clear();
+    // With a buddy an ampersand marks a shortcut.
+    bool const hasAmpersand = _words.contains(QLatin1Char('&'));
+    if (hasAmpersand)
+        clear();
     setBuddy(widget);
-    showWords();
+    if (hasAmpersand)
+        showWords();
 }
 
 bool QtLabel::event(QEvent* event)
@@ -158,7 +162,7 @@ TextLines QtLabel::getLines() const
 void QtLabel::nameSoon() const
 {
     for (QWidget* around = parentWidget(); around; around = around->parentWidget())
-        if (auto* const area = dynamic_cast<QtContentArea*>(around))
+        if (auto* const area = dynamic_cast<QtContentArea*>(qobject_cast<QScrollArea*>(around)))
         {
             area->nameValuesSoon();
             return;

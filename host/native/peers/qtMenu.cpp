@@ -31,7 +31,6 @@ public:
         // The wheel alone must not take the keyboard.
         setFocusPolicy(Qt::StrongFocus);
         setMaxVisibleItems(maxShown);
-        setSizeAdjustPolicy(AdjustToMinimumContentsLengthWithIcon);
         connect(this, &QComboBox::activated, this, [this](int index) { tellPicked(index); });
     }
 
@@ -40,6 +39,19 @@ public:
         _align = align;
         update();
     }
+
+    /// As high as a line of text needs; the cell gives the width. Qt's own hint looks at all entries, and asked for one
+    /// that does not, Qt makes the popup of each box at once.
+    QSize sizeHint() const override
+    {
+        QStyleOptionComboBox option;
+        initStyleOption(&option);
+        constexpr int air = 2;
+        return style()->sizeFromContents(QStyle::CT_ComboBox, &option,
+                                         QSize(0, std::max(fontMetrics().height(), iconSize().height()) + air), this);
+    }
+
+    QSize minimumSizeHint() const override { return sizeHint(); }
 
     void showPopup() override
     {

@@ -64,6 +64,28 @@ std::unordered_map<std::type_index, QtPeerKinds::Make>& getKinds()
     return kinds;
 }
 
+/// The number of widgets in one that is shown again, beyond which it takes care that they do not cost their square.
+constexpr int many = 100;
+
+/// Lets a widget and those in it be painted again, all at once. Qt's own way would have each ask for it.
+void resumeUpdates(QWidget& widget)
+{
+    for (QWidget* const inner : widget.findChildren<QWidget*>())
+        inner->setAttribute(Qt::WA_UpdatesDisabled, false);
+    widget.setAttribute(Qt::WA_UpdatesDisabled, false);
+    widget.update();
+}
+
+/// Shows a widget that was hidden. Qt posts an event to each widget in it, to be painted on its own, for which each
+/// looks at all its siblings for those that cover it. Until these events are through, nobody asks to be painted.
+void showAgain(QWidget& widget)
+{
+    widget.setUpdatesEnabled(false);
+    widget.show();
+    QMetaObject::invokeMethod(
+        &widget, [&widget] { resumeUpdates(widget); }, Qt::QueuedConnection);
+}
+
 } // namespace
 
 QtPeer::QtPeer(QWidget* widget, std::string const& name, int inset) : _widget(widget), _inset(inset)
@@ -74,7 +96,9 @@ QtPeer::QtPeer(QWidget* widget, std::string const& name, int inset) : _widget(wi
     if (_widget->isWindow())
         return;
     _widget->setGeometry(0, 0, 0, 0);
-    _widget->show();
+    // In a parent that is not shown yet it comes with that.
+    if (_widget->isHidden())
+        _widget->show();
 }
 
 QtPeer::QtPeer(NtForeignWidget widget) : _widget(static_cast<QWidget*>(widget.widget)), _foreign(true) {}
@@ -95,14 +119,18 @@ void QtPeer::setCell(int x, int y, int width, int height)
     QWidget* const widget = getNative();
     if (!widget || _foreign)
         return;
-    int const inset = widget->sizeHint().height() > height - 2 * _inset ? 0 : _inset;
+    bool const hasRoom = _inset > 0 && widget->sizeHint().height() <= height - 2 * _inset;
+    int const inset = hasRoom ? _inset : 0;
     widget->setGeometry(x, y + inset, std::max(width, 0), std::max(height - 2 * inset, 0));
 }
 
 void QtPeer::setDisplayed(bool displayed)
 {
     QtErrorAside const aside;
-    if (QWidget* const widget = getNative())
+    QWidget* const widget = getNative();
+    if (widget && displayed && widget->isHidden() && widget->findChildren<QWidget*>().size() > many)
+        showAgain(*widget);
+    else if (widget)
         widget->setVisible(displayed);
 }
 

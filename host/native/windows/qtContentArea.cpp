@@ -53,7 +53,7 @@ void QtContentArea::setContentSize(int width, int height)
     if (!widget())
         return;
     widget()->resize(width, height);
-    nameValuesIn(*widget());
+    nameValuesSoon();
 }
 
 void QtContentArea::nameValuesSoon()
