@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <exception>
+#include <malloc.h>
 #include <memory>
 #include <new>
 #include <strings.h>
@@ -156,14 +157,21 @@ private:
 
 } // namespace
 
-XmlDocument::XmlDocument(std::string const& text)
+XmlDocument::XmlDocument(std::string const& text) : _size(text.size())
 {
     auto const tree = std::make_shared<XmlTree const>(Reader(text).read());
     if (!tree->elements.empty())
         _root = makeShd<XmlElement>(tree, 0);
 }
 
-XmlDocument::~XmlDocument() = default;
+XmlDocument::~XmlDocument()
+{
+    // The memory of a large document lies below that of what was made from it, and would stay with the process.
+    constexpr std::size_t large = std::size_t(1) << 22;
+    _root.reset();
+    if (_size > large)
+        malloc_trim(0);
+}
 
 RCShdPtr<XmlElement> XmlDocument::getRoot() const
 {

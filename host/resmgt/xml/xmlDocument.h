@@ -4,6 +4,7 @@
 #include "pointers/rcShdPtr.h"
 #include "xml/xmlElement.h"
 
+#include <cstddef>
 #include <string>
 
 namespace Kv
@@ -27,6 +28,8 @@ public:
 
 private:
     RCShdPtr<XmlElement> _root;
+    /// That of the text, in bytes.
+    std::size_t _size;
 };
 
 } // namespace Kv
