@@ -1,7 +1,6 @@
 #include "browser/qtBrowserList.h"
 
 #include "browser/qtDirModel.h"
-#include "windows/qtFocusOrder.h"
 
 #include <QHeaderView>
 #include <QKeyEvent>
@@ -51,7 +50,6 @@ protected:
 
 QtBrowserList::QtBrowserList(QWidget* parent, Actions actions) : QTreeView(parent), _actions(std::move(actions))
 {
-    QtFocusOrder::markAsValue(*this);
     setItemDelegate(new RowDelegate(this));
     setRootIsDecorated(false);
     setItemsExpandable(false);

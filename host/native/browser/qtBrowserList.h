@@ -1,5 +1,7 @@
 #pragma once
 
+#include "windows/qtFocusOrder.h"
+
 #include <QTreeView>
 
 #include <functional>
@@ -9,7 +11,7 @@ namespace Kv
 
 /// The list of a browser with its keys and clicks; shows the columns that there is room for. A key that is not its own,
 /// as Escape, goes on to what holds it.
-class QtBrowserList final : public QTreeView
+class QtBrowserList final : public QTreeView, public QtValueWidget
 {
 public:
     /// Functions that keys and clicks call; all are set before the list is shown.

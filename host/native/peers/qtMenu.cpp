@@ -22,12 +22,11 @@ namespace
 /// The number of entries that a popup shows at once; with more it scrolls.
 constexpr int maxShown = 20;
 
-class ComboBox final : public QComboBox
+class ComboBox final : public QComboBox, public QtValueWidget
 {
 public:
     ComboBox(QWidget* parent, QtListenerHandle<NtMenuListener> const& handle) : QComboBox(parent), _handle(handle)
     {
-        QtFocusOrder::markAsValue(*this);
         // The wheel alone must not take the keyboard.
         setFocusPolicy(Qt::StrongFocus);
         setMaxVisibleItems(maxShown);

@@ -15,12 +15,11 @@ namespace Kv
 namespace
 {
 
-class LineEdit final : public QLineEdit
+class LineEdit final : public QLineEdit, public QtValueWidget
 {
 public:
     LineEdit(QWidget* parent, QtListenerHandle<NtTextFieldListener> const& handle) : QLineEdit(parent), _handle(handle)
     {
-        QtFocusOrder::markAsValue(*this);
         setMaxLength(std::numeric_limits<int>::max());
         connect(this, &QLineEdit::textEdited, this, [this] { tellEdited(); });
         connect(this, &QLineEdit::returnPressed, this, [this] { tellEnded(); });

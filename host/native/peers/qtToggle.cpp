@@ -10,12 +10,11 @@ namespace Kv
 namespace
 {
 
-class CheckBox final : public QCheckBox
+class CheckBox final : public QCheckBox, public QtValueWidget
 {
 public:
     CheckBox(QWidget* parent, QtListenerHandle<NtToggleListener> const& handle) : QCheckBox(parent), _handle(handle)
     {
-        QtFocusOrder::markAsValue(*this);
         setFocusPolicy(Qt::StrongFocus);
         connect(this, &QCheckBox::clicked, this, [this](bool state) { tellToggled(state); });
     }

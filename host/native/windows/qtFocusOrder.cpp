@@ -45,8 +45,6 @@ bool inOneRow(QRect const& a, QRect const& b)
     return 2 * std::abs(a.center().y() - b.center().y()) <= std::min(a.height(), b.height());
 }
 
-constexpr char const* valueMark = "kvHoldsValue";
-
 bool isPushButton(QWidget const& widget)
 {
     return qobject_cast<QPushButton const*>(&widget);
@@ -100,15 +98,10 @@ bool QtFocusOrder::step(bool next) const
     return true;
 }
 
-void QtFocusOrder::markAsValue(QWidget& widget)
-{
-    widget.setProperty(valueMark, true);
-}
-
 bool QtFocusOrder::holdsValue(QWidget const& widget)
 {
     QWidget const* const proxy = widget.focusProxy();
-    return (proxy ? proxy : &widget)->property(valueMark).toBool();
+    return dynamic_cast<QtValueWidget const*>(proxy ? proxy : &widget);
 }
 
 QWidget* QtFocusOrder::getFirst() const

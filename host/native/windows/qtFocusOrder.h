@@ -7,6 +7,16 @@
 namespace Kv
 {
 
+/// Base of the widgets that hold a value: such a one has the keyboard first.
+class QtValueWidget
+{
+public:
+    QtValueWidget() = default;
+    QtValueWidget(QtValueWidget const&) = delete;
+    QtValueWidget& operator=(QtValueWidget const&) = delete;
+    virtual ~QtValueWidget() = default;
+};
+
 /// The way of the keyboard through the widgets: as the eye goes, row by row from the top, each from left to right.
 class QtFocusOrder
 {
@@ -23,10 +33,7 @@ public:
     /// keyboard any more. False where nothing else does.
     bool step(bool next) const;
 
-    /// Says that a widget holds a value: such a one has the keyboard first.
-    static void markAsValue(QWidget& widget);
-
-    /// True for a widget that is marked so, and for one that hands the keyboard on to such a one.
+    /// True for a `QtValueWidget`, and for a widget that hands the keyboard on to one.
     static bool holdsValue(QWidget const& widget);
 
     /// The first widget that holds a value, else the first push button, else null.
