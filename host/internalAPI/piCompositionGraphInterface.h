@@ -11,8 +11,6 @@ namespace Kv
 class KV_API PiCompositionGraphInterface : public virtual PiNodeController
 {
 public:
-    ~PiCompositionGraphInterface() override;
-
     virtual RCShdPtr<const PiGraph> getGraph() const = 0;
     virtual RCShdPtr<PiGraph> getGraph() = 0;
 

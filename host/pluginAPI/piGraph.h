@@ -11,6 +11,7 @@
 namespace Kv
 {
 
+class PiGraph;
 class PiNode;
 
 /// The object behind a node, which decides about it. It is held by strong pointers alone, and reached by weak ones.
@@ -20,13 +21,10 @@ public:
     PiNodeController() = default;
     PiNodeController(PiNodeController const&) = delete;
     PiNodeController& operator=(PiNodeController const&) = delete;
-    virtual ~PiNodeController();
+    virtual ~PiNodeController() = default;
 
     virtual RCShdPtr<const PiNode> getNode() const = 0;
 };
-
-class PiGraph;
-class PiNodeController;
 
 /// An operation in a graph. All texts are UTF-8 where nothing else is said.
 class KV_API PiNode : public RCBase<LkCounter<int>>
@@ -34,8 +32,6 @@ class KV_API PiNode : public RCBase<LkCounter<int>>
 public:
     /// Pairs of a name and what stands under it, each name once, in their order.
     using NamedTexts = std::vector<std::pair<std::string, std::string>>;
-
-    ~PiNode() override;
 
     /// The graph that the node belongs to; null once that is closed.
     virtual RCShdPtr<const PiGraph> getGraph() const = 0;
@@ -55,15 +51,10 @@ public:
     virtual NamedTexts const& getValues() const = 0;
 };
 
-class PiNode;
-class PiNodeController;
-
 /// Nodes that are joined by their inputs. It can outlive its controller; then it is closed, and no longer changes.
 class KV_API PiGraph : public RCBase<LkCounter<int>>
 {
 public:
-    ~PiGraph() override;
-
     /// The controller of the graph as a whole; expired once the graph is closed.
     virtual RCWeakPtr<const PiNodeController> getController() const = 0;
     virtual RCWeakPtr<PiNodeController> getController() = 0;

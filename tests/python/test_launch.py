@@ -447,3 +447,17 @@ def test_dialogs_can_be_dropped_on_another_thread(user):
     assert make('OK').launch() == 'CloseButton_OK'
     gc.collect()  # what failures of other tests still hold
     assert [window.objectName() for window in QApplication.topLevelWidgets()].count('Launched') == 0
+
+
+def test_a_long_dialog_that_is_launched_again_is_painted_again_and_follows_what_changes(user):
+    rows = [('TextField', 'Row %d' % i, 'Row %d' % i, 'text') for i in range(120)]
+    dialog = make('OK', widgets=rows, height=400)
+
+    def look(user):
+        # Without the first rows: a cursor blinks there.
+        return user.window().grab(QRect(0, 100, 400, 300)).toImage()
+
+    first = launch(user, dialog, look)
+    assert launch(user, dialog, look) == first
+    dialog.setValue('Row 8', 'other')
+    assert launch(user, dialog, look) != first

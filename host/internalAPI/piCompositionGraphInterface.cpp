@@ -1,8 +1,0 @@
-#include "piCompositionGraphInterface.h"
-
-namespace Kv
-{
-
-PiCompositionGraphInterface::~PiCompositionGraphInterface() = default;
-
-} // namespace Kv
