@@ -47,13 +47,6 @@ UiWindow* UiContainer::getWindow() const
     return _window ? _window : UiWidget::getWindow();
 }
 
-void UiContainer::setRect(GeRectangle<int> const& rect, bool layOut)
-{
-    UiWidget::setRect(rect, layOut);
-    if (layOut)
-        layOutChildren();
-}
-
 void UiContainer::show()
 {
     UiWidget::show();
@@ -129,6 +122,20 @@ std::unique_ptr<NtPeer> UiContainer::createPeer(NtPlatform& platform, NtContaine
 bool UiContainer::takesInput() const
 {
     return _window ? isDisplayed() && isEnabled() && _window->isShown() : UiWidget::takesInput();
+}
+
+void UiContainer::takeRect(GeRectangle<int> const& rect, bool layOut)
+{
+    UiWidget::takeRect(rect, layOut);
+    if (layOut)
+        layOutChildren();
+}
+
+void UiContainer::placePeers()
+{
+    UiWidget::placePeers();
+    for (RCShdPtr<UiWidget> const& child : _children)
+        child->placePeers();
 }
 
 void UiContainer::attachNative(NtPlatform& platform, NtContainer& native)

@@ -25,7 +25,6 @@ public:
     /// The rectangle that the widgets in it are laid out in, in pixels of the window.
     virtual GeRectangle<int> getFrame() const { return getRect(); }
 
-    void setRect(GeRectangle<int> const& rect, bool layOut) override;
     void show() override;
 
     /// The widgets directly in it, in order of creation. To be read in place.
@@ -56,11 +55,13 @@ protected:
     void dropPeer() override;
 
     bool takesInput() const override;
+    void takeRect(GeRectangle<int> const& rect, bool layOut) override;
+    void placePeers() override;
 
     /// Makes the peers of the widgets in it inside `native`, which is borrowed.
     void attachNative(NtPlatform& platform, NtContainer& native);
 
-    /// Places the widgets in it by their constraints, all the way down.
+    /// Works out the places of the widgets in it from their constraints, all the way down.
     virtual void layOutChildren();
 
 private:

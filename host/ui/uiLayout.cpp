@@ -93,7 +93,7 @@ void UiLayout::apply()
         {
             GeRectangle<int> const rect{at(child, UiConstraint::X1), at(child, UiConstraint::X2),
                                         at(child, UiConstraint::Y1), at(child, UiConstraint::Y2)};
-            _children[child]->setRect(rect, true);
+            _children[child]->takeRect(rect, true);
         }
 }
 

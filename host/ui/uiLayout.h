@@ -32,7 +32,7 @@ public:
     /// The first constraint that names a sibling which is not there, or that hangs on itself.
     std::optional<Fault> findFault();
 
-    /// Places the widgets, and those in them. A widget without a constraint stays where it is.
+    /// Gives the widgets, and those in them, their rectangles. A widget without a constraint stays where it is.
     void apply();
 
 private:

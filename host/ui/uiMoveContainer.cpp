@@ -62,15 +62,6 @@ GeRectangle<int> UiMoveContainer::getFrame() const
     return {cell.xMin, cell.xMin + _contentSize.x, cell.yMax - _contentSize.y, cell.yMax};
 }
 
-void UiMoveContainer::setRect(GeRectangle<int> const& rect, bool layOut)
-{
-    GeRectangle<int> const before = getCell();
-    GeRectangle<int> const now = getShown(rect);
-    if (now.getWidth() != before.getWidth() || now.getHeight() != before.getHeight())
-        _room.reset();
-    UiContainer::setRect(rect, layOut);
-}
-
 void UiMoveContainer::display(bool displayed)
 {
     if (!displayed)
@@ -81,6 +72,7 @@ void UiMoveContainer::display(bool displayed)
 void UiMoveContainer::show()
 {
     layOutChildren();
+    placePeers();
     UiContainer::show();
 }
 
@@ -137,6 +129,22 @@ bool UiMoveContainer::takesInput() const
     return getReferenceCount() > 1 && UiContainer::takesInput();
 }
 
+void UiMoveContainer::takeRect(GeRectangle<int> const& rect, bool layOut)
+{
+    GeRectangle<int> const before = getCell();
+    GeRectangle<int> const now = getShown(rect);
+    if (now.getWidth() != before.getWidth() || now.getHeight() != before.getHeight())
+        _room.reset();
+    UiContainer::takeRect(rect, layOut);
+}
+
+void UiMoveContainer::placePeers()
+{
+    UiContainer::placePeers();
+    if (_float)
+        _float->setContentSize(_contentSize.x, _contentSize.y);
+}
+
 void UiMoveContainer::layOutChildren()
 {
     GeVector2<int> const given{getRect().getWidth(), getRect().getHeight()};
@@ -151,8 +159,6 @@ void UiMoveContainer::layOutChildren()
         _contentSize = {room.x + overflow.x, room.y + overflow.y};
         UiContainer::layOutChildren();
     }
-    if (_float)
-        _float->setContentSize(_contentSize.x, _contentSize.y);
 }
 
 void UiMoveContainer::cameToFront()
@@ -230,6 +236,7 @@ void UiMoveContainer::onResized(int width, int height)
     RCShdPtr<UiMoveContainer> const self(this);
     _room = {width, height};
     layOutChildren();
+    placePeers();
 }
 
 void UiMoveContainer::onEscape()
@@ -252,7 +259,10 @@ void UiMoveContainer::onFirstTurn()
     if (isLost)
         clearParent();
     else
+    {
         layOutChildren();
+        placePeers();
+    }
 }
 
 } // namespace Kv

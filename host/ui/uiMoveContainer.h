@@ -29,7 +29,6 @@ public:
     static void follow(UiContainer const& parent, GeRectangle<int> const& before);
 
     GeRectangle<int> getFrame() const override;
-    void setRect(GeRectangle<int> const& rect, bool layOut) override;
     void display(bool displayed) override;
     void show() override;
 
@@ -53,6 +52,8 @@ protected:
     bool takesInput() const override;
 
     GeRectangle<int> getCell() const override { return getShown(getRect()); }
+    void takeRect(GeRectangle<int> const& rect, bool layOut) override;
+    void placePeers() override;
     void layOutChildren() override;
     void cameToFront() override;
 

@@ -112,10 +112,11 @@ void UiTopLevel::dropNative()
 void UiTopLevel::onResized(int width, int height)
 {
     RCShdPtr<UiTopLevel> const self(this);
-    _root->setRect({0, width, 0, height}, true);
+    _root->takeRect({0, width, 0, height}, true);
     GeVector2<int> const overflow = UiLayout::measureOverflow(*_root);
     if (overflow.x > 0 || overflow.y > 0)
-        _root->setRect({0, width + overflow.x, 0, height + overflow.y}, true);
+        _root->takeRect({0, width + overflow.x, 0, height + overflow.y}, true);
+    _root->placePeers();
     _osWindow->getNative().setContentSize(_root->getRect().getWidth(), _root->getRect().getHeight());
 }
 

@@ -56,10 +56,15 @@ GeRectangle<int> const& UiWidget::getRect() const
     return _rect;
 }
 
-void UiWidget::setRect(GeRectangle<int> const& rect, bool)
+void UiWidget::setRect(GeRectangle<int> const& rect, bool layOut)
+{
+    takeRect(rect, layOut);
+    placePeers();
+}
+
+void UiWidget::takeRect(GeRectangle<int> const& rect, bool)
 {
     _rect = rect;
-    placePeer();
 }
 
 void UiWidget::setConstraint(UiConstraint const& constraint)
@@ -244,7 +249,7 @@ void UiWidget::dropPeer()
     _peer.reset();
 }
 
-void UiWidget::placePeer()
+void UiWidget::placePeers()
 {
     if (!_peer || !_parent)
         return;

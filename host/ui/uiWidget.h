@@ -59,7 +59,7 @@ public:
     GeRectangle<int> const& getRect() const;
 
     /// Places the widget, and with `layOut` the widgets in it.
-    virtual void setRect(GeRectangle<int> const& rect, bool layOut);
+    void setRect(GeRectangle<int> const& rect, bool layOut);
 
     std::optional<UiConstraint> const& getConstraint() const { return _constraint; }
     void setConstraint(UiConstraint const& constraint);
@@ -152,6 +152,12 @@ protected:
     /// The place of the native peer in the window, in pixels, y growing upward.
     virtual GeRectangle<int> getCell() const { return _rect; }
 
+    /// As `setRect`, but that nothing on the screen follows before `placePeers`.
+    virtual void takeRect(GeRectangle<int> const& rect, bool layOut);
+
+    /// Places the native peer, and those of the widgets in it.
+    virtual void placePeers();
+
     /// The widget has been put above its siblings.
     virtual void cameToFront() {}
 
@@ -160,11 +166,11 @@ protected:
 
 private:
     friend class UiContainer;
+    friend class UiLayout;
     friend class UiPointerCallbacks;
 
     virtual void forgetHandlers();
     void realize(NtPlatform& platform, NtContainer& parent);
-    void placePeer();
     void enablePeer();
     void showLook();
     UiPointerCallbacks& getPointerCallbacks();

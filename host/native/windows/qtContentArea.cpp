@@ -14,9 +14,6 @@ namespace Kv
 namespace
 {
 
-/// The number of times that scroll bars may come and go before a layout is left as it is.
-constexpr int maxRounds = 4;
-
 /// Height of a row of a form, in pixels.
 constexpr int rowHeight = 28;
 
@@ -26,24 +23,43 @@ QtContentArea::QtContentArea(QWidget* parent, std::function<void(int, int)> onRo
     : QScrollArea(parent), _onRoom(std::move(onRoom))
 {
     setFrameShape(QFrame::NoFrame);
+    setBars(false, false);
     // Tab stops at widgets only.
     setFocusPolicy(Qt::NoFocus);
     connect(verticalScrollBar(), &QScrollBar::actionTriggered, this, [this](int action) { turnPage(action); });
 }
 
+void QtContentArea::fill(QRect const& place)
+{
+    setGeometry(place);
+    tellRoom();
+}
+
 void QtContentArea::tellRoom()
 {
     // Laying out can bring scroll bars, and these change the room again: that is told when the first is done.
-    if (_telling || !isVisible())
+    if (!widget() || _telling)
         return;
     _telling = true;
     QPointer<QWidget> const alive(this);
-    for (int round = 0; round < maxRounds && _told != viewport()->size(); ++round)
+    // What comes and goes with its own bar keeps it.
+    for (bool mayLoseBars = true;;)
     {
-        _told = viewport()->size();
-        _onRoom(_told.width(), _told.height());
-        if (!alive)
+        QSize const room = maximumViewportSize();
+        if (std::exchange(_told, room) != room)
+            _onRoom(room.width(), room.height());
+        if (!alive || !widget())
             return;
+        bool const isWide = widget()->width() > room.width();
+        bool const isHigh = widget()->height() > room.height();
+        bool const hasBelow = horizontalScrollBarPolicy() == Qt::ScrollBarAlwaysOn;
+        bool const hasBeside = verticalScrollBarPolicy() == Qt::ScrollBarAlwaysOn;
+        bool const losesBars = (hasBelow && !isWide) || (hasBeside && !isHigh);
+        bool const getsBars = (isWide && !hasBelow) || (isHigh && !hasBeside);
+        if (!getsBars && !(losesBars && mayLoseBars))
+            break;
+        setBars(isWide || (hasBelow && !mayLoseBars), isHigh || (hasBeside && !mayLoseBars));
+        mayLoseBars = mayLoseBars && !losesBars;
     }
     _telling = false;
 }
@@ -54,6 +70,8 @@ void QtContentArea::setContentSize(int width, int height)
         return;
     widget()->resize(width, height);
     nameValuesSoon();
+    if (isVisible())
+        tellRoom();
 }
 
 void QtContentArea::nameValuesSoon()
@@ -70,10 +88,12 @@ void QtContentArea::nameValuesSoon()
             Qt::QueuedConnection);
 }
 
-void QtContentArea::resizeEvent(QResizeEvent* event)
+void QtContentArea::setBars(bool below, bool beside)
 {
-    QScrollArea::resizeEvent(event);
-    tellRoom();
+    // Left to Qt, a bar comes with a later turn, when all in the content is on the screen and has to be placed again.
+    auto const getPolicy = [](bool isThere) { return isThere ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAlwaysOff; };
+    setHorizontalScrollBarPolicy(getPolicy(below));
+    setVerticalScrollBarPolicy(getPolicy(beside));
 }
 
 void QtContentArea::turnPage(int action)

@@ -15,7 +15,10 @@ public:
     /// `onRoom` hears of the width and height in pixels; it may end the area.
     QtContentArea(QWidget* parent, std::function<void(int, int)> onRoom);
 
-    /// Tells the room if it is another than was told last; none is told while the area is hidden.
+    /// Takes that place in the parent, and tells the room.
+    void fill(QRect const& place);
+
+    /// Tells the room if it is another than was told last. Before the area is shown that is the room that it will have.
     void tellRoom();
 
     /// Gives the content its size, in pixels, once all in it has its place.
@@ -30,10 +33,8 @@ public:
     /// `cover`, borrowed, is not in the content, and lies over the upper edge of what is seen of that.
     void setCover(QWidget& cover) { _cover = &cover; }
 
-protected:
-    void resizeEvent(QResizeEvent* event) override;
-
 private:
+    void setBars(bool below, bool beside);
     void turnPage(int action);
 
     std::function<void(int, int)> _onRoom;

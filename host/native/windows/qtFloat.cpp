@@ -189,7 +189,7 @@ void QtFloat::resizeEvent(QResizeEvent* event)
     QWidget::resizeEvent(event);
     QtFrontOrder::getInstance().cutHoles();
     if (_area)
-        _area->setGeometry(rect());
+        _area->fill(rect());
     if (_edge)
         _edge->setGeometry(rect());
 }

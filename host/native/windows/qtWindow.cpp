@@ -77,6 +77,7 @@ void QtWindowWidget::showModal()
     if (QApplication::activeModalWidget() != this)
         hide();
     setWindowModality(Qt::ApplicationModal);
+    layOut();
     show();
     if (hasStack())
         raise();
@@ -115,9 +116,7 @@ void QtWindowWidget::showEvent(QShowEvent* event)
     QWidget::showEvent(event);
     if (!event->spontaneous() && isModal())
         blockOthers();
-    // Not on the screen yet, but with its final size: the first picture is laid out.
-    if (_area)
-        _area->tellRoom();
+    layOut();
 }
 
 void QtWindowWidget::hideEvent(QHideEvent* event)
@@ -134,8 +133,7 @@ void QtWindowWidget::hideEvent(QHideEvent* event)
 void QtWindowWidget::resizeEvent(QResizeEvent* event)
 {
     QWidget::resizeEvent(event);
-    if (_area)
-        _area->setGeometry(rect());
+    layOut();
 }
 
 void QtWindowWidget::closeEvent(QCloseEvent* event)
@@ -159,6 +157,12 @@ void QtWindowWidget::keyPressEvent(QKeyEvent* event)
 bool QtWindowWidget::focusNextPrevChild(bool next)
 {
     return QtFocusOrder(*this).step(next);
+}
+
+void QtWindowWidget::layOut()
+{
+    if (_area)
+        _area->fill(rect());
 }
 
 void QtWindowWidget::unblock(QWidget const& window)

@@ -47,6 +47,8 @@ protected:
     bool focusNextPrevChild(bool next) override;
 
 private:
+    /// Ahead of the first picture too: what is laid out before it is shown, costs Qt a fraction.
+    void layOut();
     void blockOthers();
     /// Lets input through to a window that is shown above this one now.
     void unblock(QWidget const& window);
