@@ -37,9 +37,14 @@ UiConstraint at(int row, int column, int columns = 1)
 class ScreenReader : public testing::Test
 {
 protected:
+    void TearDown() override { QAccessible::setActive(false); }
+
+    /// Shows the window, which is read from then on.
     void show()
     {
         window->show();
+        QCoreApplication::processEvents();
+        QAccessible::setActive(true);
         QCoreApplication::processEvents();
     }
 

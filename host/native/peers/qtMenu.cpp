@@ -67,6 +67,12 @@ protected:
         return QComboBox::event(event);
     }
 
+    void showEvent(QShowEvent* event) override
+    {
+        // Qt's own announces a new size, as a box gets that is as wide as its entries.
+        QWidget::showEvent(event); // NOLINT(bugprone-parent-virtual-call)
+    }
+
     void paintEvent(QPaintEvent*) override
     {
         QStylePainter painter(this);

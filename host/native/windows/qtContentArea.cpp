@@ -2,6 +2,8 @@
 
 #include "windows/qtCaptions.h"
 
+#include <QAccessible>
+#include <QApplication>
 #include <QPointer>
 #include <QScrollBar>
 
@@ -16,6 +18,33 @@ namespace
 
 /// Height of a row of a form, in pixels.
 constexpr int rowHeight = 28;
+
+/// Tells whether there is one, and has all areas named when it comes.
+class ScreenReader final : private QAccessible::ActivationObserver
+{
+public:
+    static ScreenReader& getInstance()
+    {
+        // Never destroyed: areas go as late as the last objects of the interpreter do.
+        static auto* const reader = new ScreenReader;
+        return *reader;
+    }
+
+    bool isThere() const { return _isThere; }
+
+private:
+    ScreenReader() { QAccessible::installActivationObserver(this); }
+
+    void accessibilityActiveChanged(bool active) override
+    {
+        _isThere = active;
+        for (QWidget* const widget : QApplication::allWidgets())
+            if (auto* const area = dynamic_cast<QtContentArea*>(widget))
+                area->nameValuesSoon();
+    }
+
+    bool _isThere = QAccessible::isActive();
+};
 
 } // namespace
 
@@ -76,7 +105,7 @@ void QtContentArea::setContentSize(int width, int height)
 
 void QtContentArea::nameValuesSoon()
 {
-    if (!std::exchange(_naming, true))
+    if (ScreenReader::getInstance().isThere() && !std::exchange(_naming, true))
         QMetaObject::invokeMethod(
             this,
             [this]

@@ -25,6 +25,7 @@ public:
     void setContentSize(int width, int height);
 
     /// The widgets in the content are called anew by what stands beside them, once the event that is handled is over.
+    /// Nothing happens before somebody reads the screen to the user.
     void nameValuesSoon();
 
     /// The room is told anew, whatever it was.
