@@ -129,25 +129,27 @@ UiLayout::EdgeIndex UiLayout::findBase(EdgeIndex edge) const
 /// Finds the position of an edge, and first those of the edges that it hangs on.
 std::optional<UiLayout::Fault> UiLayout::settle(EdgeIndex edge)
 {
-    std::vector<EdgeIndex> chain;
-    for (EdgeIndex next = edge; next != nowhere && _progress[next] != Progress::Settled; next = findBase(next))
+    _chain.clear();
+    EdgeIndex base = nowhere;
+    for (EdgeIndex next = edge; next != nowhere && _progress[next] != Progress::Settled; next = base)
     {
         std::size_t const child = next / edgeCount;
         if (_progress[next] == Progress::UnderWay)
             return Fault{child, std::string(wordFor(nameOf(next))) + " of \"" + _children[child]->getName() +
                                     "\" hangs on itself"};
         _progress[next] = Progress::UnderWay;
-        chain.push_back(next);
+        base = findBase(next);
+        _chain.emplace_back(next, base);
         UiConstraint::Edge const& constraint = getEdge(next);
-        if (constraint.target == UiConstraint::SiblingEdge && findBase(next) == nowhere)
+        if (constraint.target == UiConstraint::SiblingEdge && base == nowhere)
             return Fault{child, std::string(wordFor(nameOf(next))) + " of \"" + _children[child]->getName() +
                                     "\" names the sibling \"" + constraint.sibling.toString() +
                                     "\", which is not there"};
     }
-    for (auto link = chain.rbegin(); link != chain.rend(); ++link)
+    for (auto link = _chain.rbegin(); link != _chain.rend(); ++link)
     {
-        _positions[*link] = place(*link, findBase(*link));
-        _progress[*link] = Progress::Settled;
+        _positions[link->first] = place(link->first, link->second);
+        _progress[link->first] = Progress::Settled;
     }
     return std::nullopt;
 }

@@ -5,6 +5,7 @@
 #include <optional>
 #include <string>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 namespace Kv
@@ -58,6 +59,8 @@ private:
     std::unordered_map<std::string, std::size_t> _places;
     std::vector<float> _positions;
     std::vector<Progress> _progress;
+    /// The edges that the one being settled hangs on, each with the one that it is measured from.
+    std::vector<std::pair<EdgeIndex, EdgeIndex>> _chain;
 };
 
 } // namespace Kv
