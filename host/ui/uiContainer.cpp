@@ -1,6 +1,7 @@
 #include "uiContainer.h"
 
 #include "ntPlatform.h"
+#include "uiLatePeers.h"
 #include "uiLayout.h"
 #include "uiWidgetElement.h"
 #include "uiWidgetFactory.h"
@@ -91,6 +92,8 @@ void UiContainer::front(RCShdPtr<UiWidget> const& descendant)
 void UiContainer::setFocusWidget(RCShdPtr<UiWidget> const& descendant)
 {
     requireUiThread();
+    if (!descendant->_peer)
+        UiLatePeers::getInstance().makeAll();
     if (descendant->_peer && descendant->isKeyboardFocusable())
         descendant->_peer->takeKeyboard();
 }
@@ -180,10 +183,8 @@ void UiContainer::removeChild(UiWidget* child)
 void UiContainer::forgetNames()
 {
     for (UiContainer* container = this; container; container = container->_parent)
-    {
-        container->_namesKnown = false;
-        container->_names.clear();
-    }
+        if (std::exchange(container->_namesKnown, false))
+            container->_names = {};
 }
 
 void UiContainer::collect(PrdPredicate<UiWidget> const& predicate, std::vector<RCShdPtr<UiWidget>>& found) const

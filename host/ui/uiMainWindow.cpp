@@ -1,6 +1,7 @@
 #include "uiMainWindow.h"
 
 #include "ntPlatform.h"
+#include "uiLatePeers.h"
 #include "uiMoveContainer.h"
 #include "uiPanel.h"
 
@@ -46,6 +47,7 @@ RCShdPtr<UiMainWindow> UiMainWindow::create(char const* name, char const* title,
 void UiMainWindow::refuseInput()
 {
     requireUiThread();
+    UiLatePeers::getInstance().makeAll();
     ++_inputLevel;
     _native->refuseInput();
     blockWidgetsIn(*getRootContainer());

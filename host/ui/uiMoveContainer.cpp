@@ -4,9 +4,11 @@
 #include "uiEscapeButton.h"
 #include "uiLayout.h"
 #include "uiWindow.h"
+#include "wsNative.h"
 
 #include <algorithm>
 #include <tuple>
+#include <utility>
 
 namespace Kv
 {
@@ -71,8 +73,13 @@ void UiMoveContainer::display(bool displayed)
 
 void UiMoveContainer::show()
 {
-    layOutChildren();
-    placePeers();
+    if (!isDisplayed())
+        UiLatePeers::getInstance().makeAll();
+    if (!_waiting)
+    {
+        layOutChildren();
+        placePeers();
+    }
     UiContainer::show();
 }
 
@@ -113,12 +120,29 @@ std::unique_ptr<NtPeer> UiMoveContainer::createPeer(NtPlatform& platform, NtCont
 {
     std::unique_ptr<NtFloat> peer = platform.create<NtFloat>(parent, getName(), *this);
     _float = peer.get();
-    attachNative(platform, *peer);
+    _waiting = UiLatePeers::getInstance().add(*this);
     return peer;
+}
+
+void UiMoveContainer::fill()
+{
+    UiLatePeers::getInstance().remove(*std::exchange(_waiting, std::nullopt));
+    bool const isLost = getReferenceCount() == 1;
+    RCShdPtr<UiMoveContainer> const self(this);
+    if (isLost)
+    {
+        clearParent();
+        return;
+    }
+    attachNative(WsNative::getPlatform(), *_float);
+    layOutChildren();
+    placePeers();
 }
 
 void UiMoveContainer::dropPeer()
 {
+    if (_waiting)
+        UiLatePeers::getInstance().remove(*std::exchange(_waiting, std::nullopt));
     _float = nullptr;
     _room.reset();
     UiContainer::dropPeer();
@@ -141,7 +165,7 @@ void UiMoveContainer::takeRect(GeRectangle<int> const& rect, bool layOut)
 void UiMoveContainer::placePeers()
 {
     UiContainer::placePeers();
-    if (_float)
+    if (_float && !_waiting)
         _float->setContentSize(_contentSize.x, _contentSize.y);
 }
 
@@ -250,19 +274,6 @@ void UiMoveContainer::onMoveWanted(int x, int y)
 {
     RCShdPtr<UiMoveContainer> const self(this);
     setRect(getMoved(getRect(), {x, -y}), true);
-}
-
-void UiMoveContainer::onFirstTurn()
-{
-    bool const isLost = getReferenceCount() == 1 && getParent();
-    RCShdPtr<UiMoveContainer> const self(this);
-    if (isLost)
-        clearParent();
-    else
-    {
-        layOutChildren();
-        placePeers();
-    }
 }
 
 } // namespace Kv

@@ -4,6 +4,7 @@
 #include "ntContainer.h"
 #include "piWidget.h"
 #include "uiContainer.h"
+#include "uiLatePeers.h"
 
 #include <optional>
 
@@ -15,7 +16,8 @@ namespace Kv
 /// lost. Where it is wider or higher than its parent, it fills that on the screen, and scrolls. So does what needs more
 /// room than it has. Escape in it presses the button that it does in a window.
 ///
-/// One that nobody but its parent owns goes with the next turn of the loop: its maker has failed.
+/// The peers of the widgets in it come a little later than its own, as `UiLatePeers` tells. One that nobody but its
+/// parent owns goes then: its maker has failed.
 class KV_API UiMoveContainer : public UiContainer, private NtFloatListener
 {
 public:
@@ -41,6 +43,9 @@ public:
     /// Keeps input from it if it came to the front last while fewer than `level` refusals of input were in force.
     /// Those above `level` are over.
     void followInputLevel(int level);
+
+    /// Makes the native peers of the widgets in it, if it waits for them; it goes if nobody but its parent owns it.
+    void fill();
 
 protected:
     explicit UiMoveContainer(char const* name);
@@ -81,7 +86,6 @@ private:
     void onResized(int width, int height) override;
     void onEscape() override;
     void onMoveWanted(int x, int y) override;
-    void onFirstTurn() override;
 
     UiEventCallback<UiMoveContainer> _moveCb;
     UiEventCallback<UiMoveContainer> _downCb;
@@ -94,6 +98,8 @@ private:
     std::optional<GeVector2<int>> _room;
     GeVector2<int> _contentSize;
     NtFloat* _float = nullptr;
+    /// Its place among those that are to be filled, while it is.
+    std::optional<UiLatePeers::Place> _waiting;
 };
 
 } // namespace Kv

@@ -2,6 +2,7 @@
 
 #include "text/liString.h"
 #include "uiEscapeButton.h"
+#include "uiLatePeers.h"
 #include "uiLayout.h"
 #include "wsNative.h"
 
@@ -59,6 +60,7 @@ RCShdPtr<WsWindow> UiTopLevel::getOSWindow() const
 
 bool UiTopLevel::redraw()
 {
+    UiLatePeers::getInstance().makeAll();
     if (isShown())
         _osWindow->getNative().redraw();
     return isShown();

@@ -3,6 +3,7 @@
 #include "ntPlatform.h"
 #include "text/liString.h"
 #include "uiContainer.h"
+#include "uiLatePeers.h"
 #include "uiPointerCallbacks.h"
 #include "uiResTable.h"
 #include "uiWindow.h"
@@ -127,11 +128,13 @@ void UiWidget::setKeyboardFocusable(bool focusable)
 
 bool UiWidget::hasKeyboard() const
 {
+    UiLatePeers::getInstance().makeAll();
     return _peer && _peer->hasKeyboard();
 }
 
 bool UiWidget::holdsValue() const
 {
+    UiLatePeers::getInstance().makeAll();
     return _peer && _peer->holdsValue();
 }
 

@@ -288,9 +288,8 @@ def test_a_description_that_fails_leaves_nothing_behind(description):
     kept = make_dialog('kept')
     with pytest.raises(RuntimeError):
         ui.createDialog('failed', description.replace('</PushButton>', '<Nonsense/></PushButton>'), 300, 200)
-    failed = [title_bar(window) for window in stage.floating() if stage.title_of(window) == 'failed']
-    for bar in failed:  # before the loop comes around: who it would tell is gone
-        drag(bar, (5, 5))
+    _, failed = stage.floating()
+    drag(failed, (5, 5))  # before the loop comes around: who it would tell is gone
     assert stage.titles() == ['kept']
     assert kept.getValue('Text') == 'old'
 
@@ -314,7 +313,7 @@ def states():
     main = stage.APPLICATION
     own = [main.menuBar().actions()[0], main.findChild(QTreeView, 'Browser.list'),
            main.findChild(QWidget, 'compositions')]
-    return [widget.isEnabled() for widget in own], {stage.title_of(one): one.isEnabled() for one in stage.floating()}
+    return [widget.isEnabled() for widget in own], {stage.title_of(one): one.isEnabled() for one in stage.dialogs()}
 
 
 def test_the_application_takes_no_input_during_a_run_and_is_afterwards_as_before(patient):

@@ -28,8 +28,6 @@ public:
     virtual void onEscape() = 0;
     /// It should move by so many pixels, y growing downward, to bring the widget into view that has the keyboard.
     virtual void onMoveWanted(int x, int y) = 0;
-    /// The loop has come around for the first time since the peer was made.
-    virtual void onFirstTurn() = 0;
 };
 
 /// Floats above its siblings and keeps Tab within itself. When it is hidden, the keyboard goes to the front-most that
@@ -43,7 +41,8 @@ public:
     /// Gives the keyboard to the widget in it that had it last, else as `focusFirst` does.
     virtual void resumeKeyboard() = 0;
 
-    /// Size of the content in pixels.
+    /// Size of the content in pixels. Before the first call the content is not shown: what is placed in it until then
+    /// costs less.
     virtual void setContentSize(int width, int height) = 0;
 
     /// The room that a scroll bar takes beside the content, in pixels.

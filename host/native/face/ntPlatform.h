@@ -96,6 +96,9 @@ public:
     /// Takes a widget of the application's window as a container, which stays where the application has it.
     virtual std::unique_ptr<NtContainer> adoptContainer(NtForeignWidget widget, NtPlaceListener& listener) = 0;
 
+    /// Calls the function once, with the next turn of the loop. What it throws comes out of the innermost loop.
+    virtual void callNextTurn(std::function<void()> call) = 0;
+
     /// Makes a peer of the kind that `Face` is, displayed and enabled, without a cell. The listener is borrowed and
     /// outlives the peer.
     template <typename Face>

@@ -155,6 +155,13 @@ std::unique_ptr<NtPeer> QtPlatform::createPeer(std::type_index face, NtContainer
     return QtPeerKinds::make(face, dynamic_cast<QtPeer&>(parent).getContent(), name, listener);
 }
 
+void QtPlatform::callNextTurn(std::function<void()> call)
+{
+    if (QCoreApplication* const application = QCoreApplication::instance())
+        QMetaObject::invokeMethod(
+            application, [call = std::move(call)] { QtGuard::getInstance().run(call); }, Qt::QueuedConnection);
+}
+
 void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
 {
     if (*until)

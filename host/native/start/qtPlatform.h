@@ -28,6 +28,7 @@ public:
                                               NtWindowListener& listener) override;
     std::unique_ptr<NtContainer> adoptContainer(NtForeignWidget widget, NtPlaceListener& listener) override;
 
+    void callNextTurn(std::function<void()> call) override;
     void runLoop(bool const volatile* until, bool volatile* end) override;
     void endLoop() override;
     void interruptLoop() override;

@@ -11,6 +11,7 @@
 #include <QStyle>
 
 #include <algorithm>
+#include <utility>
 
 namespace Kv
 {
@@ -74,7 +75,7 @@ public:
 
     QWidget* getContent() const override
     {
-        QtFloat const* const native = getNative();
+        QtFloat* const native = getNative();
         return native ? native->getContent() : nullptr;
     }
 };
@@ -84,24 +85,9 @@ QtPeerKind<NtFloat, Float> const registered;
 } // namespace
 
 QtFloat::QtFloat(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle)
-    : QWidget(parent), _handle(handle),
-      _area(new QtContentArea(this, [handle](int width, int height)
-                              { handle.tell(&NtFloatListener::onResized, width, height); })),
-      _edge(new Edge(this))
+    : QWidget(parent), _handle(handle)
 {
     setAutoFillBackground(true);
-    // Of no size of its own: that comes with the content.
-    _area->setWidget(new QWidget);
-    // A widget that is given the keyboard is to be seen.
-    connect(qApp, &QApplication::focusChanged, this,
-            [this](QWidget* from, QWidget* to)
-            {
-                if (to && isAncestorOf(to) && !(from && isAncestorOf(from)))
-                    QtFrontOrder::getInstance().bringToFront(*this);
-            });
-    // A timer would stay until it fires, also when this is gone.
-    QMetaObject::invokeMethod(
-        this, [handle] { handle.tell(&NtFloatListener::onFirstTurn); }, Qt::QueuedConnection);
     QtFrontOrder::getInstance().bringToFront(*this);
 }
 
@@ -118,10 +104,32 @@ QtFloat* QtFloat::findAround(QWidget& widget)
     return nullptr;
 }
 
+QWidget* QtFloat::getContent()
+{
+    if (!std::exchange(_hasContent, true))
+        makeContent();
+    return _area ? _area->widget() : nullptr;
+}
+
+void QtFloat::makeContent()
+{
+    _area = new QtContentArea(this, [handle = _handle](int width, int height)
+                              { handle.tell(&NtFloatListener::onResized, width, height); });
+    _area->setWidget(new QWidget);
+    _area->widget()->hide();
+    _area->setGeometry(rect());
+    _area->show();
+    _edge = new Edge(this);
+    _edge->setGeometry(rect());
+    _edge->show();
+}
+
 void QtFloat::setContentSize(int width, int height)
 {
-    if (_area)
-        _area->setContentSize(width, height);
+    if (!_area)
+        return;
+    _area->setContentSize(width, height);
+    _area->widget()->show();
 }
 
 void QtFloat::pin(QWidget& widget)

@@ -22,8 +22,9 @@ public:
     /// The innermost one that holds the widget, or is it; null if there is none.
     static QtFloat* findAround(QWidget& widget);
 
-    /// The native parent of the widgets in it; scrolled where it is larger.
-    QWidget* getContent() const { return _area ? _area->widget() : nullptr; }
+    /// The native parent of the widgets in it; scrolled where it is larger. Made when it is asked for first, and hidden
+    /// until it has a size.
+    QWidget* getContent();
     void setContentSize(int width, int height);
 
     /// Keeps a widget of the content in place when that scrolls. A text in it becomes a title.
@@ -44,7 +45,10 @@ protected:
     bool focusNextPrevChild(bool next) override;
 
 private:
+    void makeContent();
+
     QtListenerHandle<NtFloatListener> _handle;
+    bool _hasContent = false;
     /// Natively children, which others can delete.
     QPointer<QtContentArea> _area;
     QPointer<QWidget> _edge;

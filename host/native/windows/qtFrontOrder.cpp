@@ -3,6 +3,7 @@
 #include "windows/qtFloat.h"
 #include "windows/qtFocusOrder.h"
 
+#include <QApplication>
 #include <QRegion>
 
 #include <algorithm>
@@ -21,12 +22,6 @@ QRect getVisibleRect(QWidget const& floating)
     return seen.translated(parent.mapTo(floating.window(), QPoint(0, 0)));
 }
 
-/// Null for what is no float, or gone.
-QtFloat* toFloat(QWidget* widget)
-{
-    return dynamic_cast<QtFloat*>(widget);
-}
-
 } // namespace
 
 QtFrontOrder& QtFrontOrder::getInstance()
@@ -38,9 +33,12 @@ QtFrontOrder& QtFrontOrder::getInstance()
 
 void QtFrontOrder::bringToFront(QtFloat& floating)
 {
+    watchKeyboard();
+    if (!_places.empty() && _places.back().widget == &floating)
+        return;
     floating.raise();
     forget(floating);
-    _places.emplace_back(&floating);
+    _places.push_back({&floating, &floating});
     cutHoles();
 }
 
@@ -52,29 +50,28 @@ void QtFrontOrder::remove(QtFloat& floating)
 
 void QtFrontOrder::rememberKeyboard(QWidget& widget)
 {
-    for (QPointer<QWidget> const& place : _places)
-        if (place && !toFloat(place) && place->window() == widget.window())
+    for (Place const& place : _places)
+        if (place.widget && !place.floating && place.widget->window() == widget.window())
         {
-            forget(*place);
+            forget(*place.widget);
             break;
         }
-    _places.emplace_back(&widget);
+    _places.push_back({&widget, nullptr});
 }
 
 void QtFrontOrder::cutHoles() const
 {
     for (auto lower = _places.begin(); lower != _places.end(); ++lower)
     {
-        QtFloat* const floating = toFloat(*lower);
-        QWidget const* const window = floating ? floating->parentWidget() : nullptr;
+        QWidget const* const window = lower->widget && lower->floating ? lower->widget->parentWidget() : nullptr;
         if (!window || !window->isWindow())
             continue;
         QRegion hole;
         for (auto place = lower + 1; place != _places.end(); ++place)
-            if (QtFloat const* const upper = toFloat(*place);
+            if (QWidget const* const upper = place->floating ? place->widget.data() : nullptr;
                 upper && upper->isVisible() && upper->window() == window && upper->parentWidget() != window)
                 hole += getVisibleRect(*upper);
-        cutHole(*floating, hole);
+        cutHole(*lower->widget, hole);
     }
 }
 
@@ -82,7 +79,7 @@ bool QtFrontOrder::giveKeyboard(QWidget* place)
 {
     if (!place || !QtFocusOrder::canHold(*place))
         return false;
-    if (QtFloat* const floating = toFloat(place))
+    if (auto* const floating = dynamic_cast<QtFloat*>(place))
         floating->resumeKeyboard();
     else
         place->setFocus(Qt::OtherFocusReason);
@@ -95,17 +92,32 @@ void QtFrontOrder::settleKeyboard(QWidget& window) const
     if (withKeyboard && withKeyboard != &window && QtFocusOrder::canHold(*withKeyboard))
         return;
     // A copy: who gets the keyboard comes to the front.
-    std::vector<QPointer<QWidget>> const places = _places;
-    auto const takesIt = [&window](QPointer<QWidget> const& place)
-    { return place && place->window() == &window && giveKeyboard(place); };
+    std::vector<Place> const places = _places;
+    auto const takesIt = [&window](Place const& place)
+    { return place.widget && place.widget->window() == &window && giveKeyboard(place.widget); };
     if (std::find_if(places.rbegin(), places.rend(), takesIt) == places.rend())
         window.setFocus(Qt::OtherFocusReason);
+}
+
+void QtFrontOrder::watchKeyboard()
+{
+    static QPointer<QCoreApplication> watched;
+    if (watched == QCoreApplication::instance())
+        return;
+    watched = QCoreApplication::instance();
+    QObject::connect(qApp, &QApplication::focusChanged, qApp,
+                     [](QWidget* from, QWidget* to)
+                     {
+                         QtFloat* const floating = to ? QtFloat::findAround(*to) : nullptr;
+                         if (floating && floating != to && !(from && floating->isAncestorOf(from)))
+                             getInstance().bringToFront(*floating);
+                     });
 }
 
 void QtFrontOrder::forget(QWidget const& widget)
 {
     _places.erase(std::remove_if(_places.begin(), _places.end(),
-                                 [&widget](QPointer<QWidget> const& place) { return !place || place == &widget; }),
+                                 [&widget](Place const& place) { return !place.widget || place.widget == &widget; }),
                   _places.end());
 }
 

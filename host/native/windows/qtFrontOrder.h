@@ -37,13 +37,24 @@ public:
     void settleKeyboard(QWidget& window) const;
 
 private:
+    /// A place in the order. The widget can be deleted by others.
+    struct Place
+    {
+        QPointer<QWidget> widget;
+        /// The same; null for what is no float.
+        QtFloat* floating;
+    };
+
+    /// Lets a float come to the front when a widget in it gets the keyboard: it is to be seen.
+    static void watchKeyboard();
+
     void forget(QWidget const& widget);
 
     /// `hole` is in the coordinates of the window.
     static void cutHole(QWidget& floating, QRegion const& hole);
 
     /// The front-most one last. Of the widgets that are no floats, one a window: the one that had the keyboard last.
-    std::vector<QPointer<QWidget>> _places;
+    std::vector<Place> _places;
 };
 
 } // namespace Kv
