@@ -19,6 +19,7 @@
 #include "xml/xmlDocument.h"
 
 #include <algorithm>
+#include <iterator>
 #include <memory>
 
 namespace bp = boost::python;
@@ -378,6 +379,7 @@ void Dialog::addCallback(std::string const& widgetName, PiWidget::EventType even
     auto const set = makeStrong<CallbackSet>(CallbackSet{widgetName, eventType, cb, {}});
     _callables.add(*set);
     _callbacks.push_back(set);
+    _callbacksByKey.emplace(CallbackKey(widgetName, eventType, cb), set.get());
     if (RCShdPtr<PiWidget> const piWidget = findEventFace(widget))
         _widgetCbs->addPythonHandler(piWidget, set);
 }
@@ -385,19 +387,28 @@ void Dialog::addCallback(std::string const& widgetName, PiWidget::EventType even
 void Dialog::removeCallback(std::string const& widgetName, PiWidget::EventType eventType, PyObject* cb)
 {
     RCShdPtr<UiWidget> const widget = getWidget(widgetName);
-    auto const found =
-        std::find_if(_callbacks.begin(), _callbacks.end(),
-                     [&](RCStrongPtr<CallbackSet> const& set)
-                     { return set->widgetName == widgetName && set->eventType == eventType && set->callable == cb; });
-    if (found == _callbacks.end())
+    CallbackKey const key(widgetName, eventType, cb);
+    auto const found = _callbacksByKey.lower_bound(key);
+    if (found == _callbacksByKey.end() || found->first != key)
         return;
-    RCStrongPtr<CallbackSet> const set = *found;
+    auto const place = findCallback(found->second);
+    RCStrongPtr<CallbackSet> const set = *place;
     // First, since it alone can fail.
     _callables.remove(*set);
     if (RCShdPtr<PiWidget> const piWidget = findEventFace(widget))
         piWidget->removeCallback(eventType, set->handler.get());
-    _callbacks.erase(found);
+    _callbacksByKey.erase(found);
+    _callbacks.erase(place);
     WidgetCbs::release(set);
+}
+
+Dialog::CallbackSets::iterator Dialog::findCallback(CallbackSet const* set)
+{
+    auto first = _callbacks.begin();
+    auto last = std::prev(_callbacks.end());
+    for (; first->get() != set && last->get() != set; ++first, --last)
+        ;
+    return first->get() == set ? first : last;
 }
 
 // It changes how the dialog looks. NOLINTNEXTLINE(readability-make-member-function-const)

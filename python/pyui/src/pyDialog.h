@@ -13,7 +13,9 @@
 #include "uiContainer.h"
 #include "uiTopLevel.h"
 
+#include <map>
 #include <string>
+#include <tuple>
 #include <vector>
 
 namespace Kv::PyextUi
@@ -126,6 +128,8 @@ private:
     friend class WidgetCbs;
 
     using CallbackSets = std::vector<RCStrongPtr<CallbackSet>>;
+    /// What `removeCallback` goes by.
+    using CallbackKey = std::tuple<std::string, PiWidget::EventType, PyObject*>;
 
     KV_LOCAL void createUi(Positionner const& position);
     KV_LOCAL static RCShdPtr<UiContainer> createTopLevelPanel(RCShdPtr<UiTopLevel> const& topLevel);
@@ -136,6 +140,9 @@ private:
     KV_LOCAL void onTitleBarMove(EvEvent& event);
     KV_LOCAL void onTitleBarPress(EvEvent& event);
     KV_LOCAL void onTitleBarRelease(EvEvent& event);
+
+    /// The place of a script's callback; looked for from both ends, since one of the last or first goes as a rule.
+    KV_LOCAL CallbackSets::iterator findCallback(CallbackSet const* set);
 
     KV_LOCAL void clearCloseCallbacks();
     /// Takes the handler of a close button from the button that has it, where several bear the name.
@@ -161,6 +168,8 @@ private:
     bool _closed;
     bool _disableNextClose = false;
     PyCallables _callables;
+    /// The sets in `_callbacks`; those with one key in the order in which they came.
+    std::multimap<CallbackKey, CallbackSet*> _callbacksByKey;
 };
 
 } // namespace Kv::PyextUi
