@@ -22,6 +22,7 @@ if 'DISPLAY' not in os.environ:
     os.environ.setdefault('QT_QPA_PLATFORM', 'offscreen')
 
 import plot
+import quorvane_velmora
 import sides
 import tree
 from quorvane_velmora import ui
@@ -134,6 +135,10 @@ MEASURES = [
 ]
 
 
+# Launched beside a form of PyQt6's that is as high as its rows, and beyond the screen where these are.
+WITHOUT_SCROLLING = 'launch beside no scrolling'
+
+
 def take_turns(names, once):
     """Seconds for each of the names, ABAB…; within the time for one measure."""
     taken = {name: [] for name in names}
@@ -147,12 +152,12 @@ def take_turns(names, once):
     return taken
 
 
-def measure(one, count, known):
+def measure(work, count, known):
     for side in known.values():
         side.prepare(count)
 
     def once(name):
-        seconds = one.once(known[name], count)
+        seconds = work(known[name], count)
         sides.flush()
         return seconds
     return take_turns(list(known), once)
@@ -174,12 +179,30 @@ def in_fresh_processes(what, names):
     return take_turns(names, once)
 
 
+def measure_inside():
+    """Seconds by name and number."""
+    application = Path(quorvane_velmora.__file__).parents[2] / 'bin' / 'velmora'
+    ended = subprocess.run([application, '--exit', HERE / 'inside.py'], check=True, capture_output=True)
+    return json.loads(ended.stdout.splitlines()[-1])
+
+
+def print_inside():
+    print('\nInside the application')
+    for name, by_count in measure_inside().items():
+        (few, first), (many, last) = by_count.items()
+        print('%-28s %6s %s  %6s %s   growth %5.1f' % (name, few, shown(name, first), many, shown(name, last),
+                                                      last / first))
+
+
 def collect(known, only):
     """Yields (measure, size, times by side)."""
     for one in MEASURES:
         for count in one.sizes:
             if only in one.name:
-                yield one.name, count, measure(one, count, known)
+                yield one.name, count, measure(one.once, count, known)
+    if only in WITHOUT_SCROLLING and 'PyQt6' in known:
+        for count in (30, 1000):
+            yield WITHOUT_SCROLLING, count, measure(launch, count, {'ours': known['ours'], 'PyQt6': sides.PyQt(scrolls=False)})
     if only in 'makeXmlFromWidgetList':
         yield 'makeXmlFromWidgetList', 10000, describe()
     if only in 'import':
@@ -241,6 +264,7 @@ def print_table(only):
             print('%-28s ours %6.1f   PyQt6 %6.1f' % (name, *(
                 by_size[10000][side] / by_size[1000][side] for side in ('ours', 'PyQt6'))))
     if not only:
+        print_inside()
         plot.draw(costs, HERE.parent / 'docs' / 'images' / 'cost.png')
 
 
@@ -280,7 +304,7 @@ def build_revision(revision):
     if not tree.exists():
         subprocess.run(['git', 'worktree', 'add', '--detach', tree, revision], cwd=root, check=True)
     subprocess.run(['git', 'checkout', '--quiet', '--detach', revision], cwd=tree, check=True)
-    subprocess.run(['cmake', '--preset', 'release', '--log-level=WARNING'], cwd=tree, check=True)
+    subprocess.run(['cmake', '--preset', 'release', '--log-level=WARNING', '-DBUILD_TESTING=OFF'], cwd=tree, check=True)
     subprocess.run(['cmake', '--build', '--preset', 'release'], cwd=tree, check=True)
     return tree / 'build' / 'release' / 'python'
 

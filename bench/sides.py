@@ -94,13 +94,16 @@ class Ours:
 class PyQt:
     name = 'PyQt6'
 
+    def __init__(self, scrolls=True):
+        self.scrolls = scrolls
+
     def prepare(self, count):
         self.values = {'w%d' % i: ('other', False, 3)[i % 3] for i in range(count)}
 
     def build(self, count):
         dialog = QDialog()
         dialog.setWindowTitle(TITLE)
-        dialog.resize(WIDTH, min(28 * count + 56, 700))
+        dialog.resize(WIDTH, min(28 * count + 56, 700) if self.scrolls else 28 * count + 56)
         form = QFormLayout()
         dialog.widgets = {}
         for i in range(count):
@@ -119,7 +122,7 @@ class PyQt:
             form.addRow('Row %d' % i, widget)
         column = QVBoxLayout(dialog)
         # A form that is higher than the screen has to scroll.
-        if count > 20:
+        if self.scrolls and count > 20:
             page = QWidget()
             page.setLayout(form)
             area = QScrollArea()

@@ -247,6 +247,25 @@ TEST(UiMoveContainer, StandsWhereItIsToldToAlsoWhereItsParentIsSmaller)
     window->hide();
 }
 
+TEST(UiMoveContainer, GetsWhatStandsInItAsSoonAsSomebodyAsksForTheKeyboard)
+{
+    RCShdPtr<UiTopLevel> const window = makeWindow();
+    window->show();
+    RCShdPtr<UiContainer> const root = window->getRootContainer();
+    RCShdPtr<UiMoveContainer> const floating = UiMoveContainer::create(root, "floating", nullptr);
+    floating->setRect({10, 190, 10, 90}, true);
+    RCShdPtr<UiTextField> const field = UiTextField::create(floating, "field", nullptr);
+    field->setKeyboardFocusable(true);
+    root->setFocusWidget(field);
+    EXPECT_TRUE(field->hasKeyboard() && field->holdsValue());
+    // One that nobody else has goes with the turn.
+    UiMoveContainer::create(root, "lost", nullptr);
+    EXPECT_EQ(root->getChildren().size(), 2);
+    QCoreApplication::processEvents();
+    EXPECT_EQ(root->getChildren().size(), 1);
+    window->hide();
+}
+
 TEST(UiCursorGuard, GivesTheCursorBackAlsoOnTheWayOutOfAnException)
 {
     WsCursorRegistry const& registry = WsCursorRegistry::getInstance();

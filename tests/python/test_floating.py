@@ -102,10 +102,23 @@ def test_a_dialog_floats_in_the_middle_of_the_panel_from_its_construction_on(wid
         expected = QRect(0, expected.y(), room.width(), expected.height() + bar)
     if height + 25 > room.height():
         expected = QRect(expected.x(), 0, width + bar, room.height())
-    assert the_dialog().geometry() == expected and the_dialog().parent() is panel()
-    assert the_dialog().hasFocus() and panel().children()[-1] is the_dialog()
+    for find in stage.floating, stage.dialogs:  # at once, and when the loop has turned
+        found, = find()
+        assert found.geometry() == expected and found.parent() is panel()
+        assert found.hasFocus() and panel().children()[-1] is found
     del dialog
     assert stage.dialogs() == []
+
+
+def test_a_dialog_gets_its_widgets_with_the_first_turn_and_none_if_it_goes_before(user):
+    first, second = (make_dialog(title) for title in ('first', 'second'))
+    assert [window.findChildren(QWidget) for window in stage.floating()] == [[], []]
+    del first
+    user.plan(lambda user: user.close())
+    ui.showMessageBox('A run needs all of them', ['?'])
+    window, = stage.floating()
+    assert stage.title_of(window) == 'second' and window.findChild(QWidget, 'Text').isVisible()
+    assert second.getValue('Text') == 'old'
 
 
 def test_the_title_bar_is_a_grey_strip_with_a_line_and_a_title_that_can_be_read():

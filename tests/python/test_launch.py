@@ -404,7 +404,18 @@ def test_a_form_taller_than_the_screen_can_be_scrolled_to_its_buttons(user):
         assert user.focus() == 'CloseButton_OK' and not user.find('CloseButton_OK').visibleRegion().isEmpty()
         user.press(Qt.Key.Key_Space)
 
-    user.plan(reach, reach_by_key)
+    def resize(user):
+        window, size = user.window(), user.window().size()
+        margin = 15
+        for height, scrolls in (3000, False), (size.height(), True):
+            window.resize(size.width(), height)
+            bars = [bar for bar in window.findChildren(QScrollBar) if bar.isVisible()]
+            assert [bar.orientation() for bar in bars] == [Qt.Orientation.Vertical] * scrolls
+            field = user.find('row 0')
+            end = field.mapTo(window, field.rect().topRight()).x()
+            assert size.width() - sum(bar.width() for bar in bars) - end == margin
+
+    user.plan(reach, resize, reach_by_key)
     values = ui.showSimpleDialog('t', [('TextField', 'row %d' % row, 'row') for row in range(100)], 300)
     assert values['CloseButtonClicked'] == 'CloseButton_OK' and len(values) == 101
 

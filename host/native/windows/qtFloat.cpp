@@ -84,8 +84,7 @@ QtPeerKind<NtFloat, Float> const registered;
 
 } // namespace
 
-QtFloat::QtFloat(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle)
-    : QWidget(parent), _handle(handle)
+QtFloat::QtFloat(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle) : QWidget(parent), _handle(handle)
 {
     setAutoFillBackground(true);
     QtFrontOrder::getInstance().bringToFront(*this);
