@@ -3,6 +3,8 @@ add_library(kv_options INTERFACE)
 # What Boost.Python includes of Boost is called deprecated by Boost itself.
 target_compile_definitions(kv_options INTERFACE BOOST_ALLOW_DEPRECATED_HEADERS BOOST_BIND_GLOBAL_PLACEHOLDERS)
 target_compile_options(kv_options INTERFACE -Wall -Wextra -Wpedantic -Wshadow)
+# A library calls its own functions straight, also those that it exports, and the compiler may inline them.
+target_compile_options(kv_options INTERFACE -fno-semantic-interposition)
 if(KV_SANITIZE)
   # Boost.Python asks the holder of an instance for its type when it has destroyed it, which the check of virtual tables
   # does not survive.

@@ -22,48 +22,52 @@ bool isAllowed(std::uint32_t codePoint)
     return codePoint != 0xfffe && codePoint != 0xffff;
 }
 
-/// The part that a byte can have in a text or a name.
-struct Byte
+/// The parts that a byte can have in a text or a name.
+enum Part : unsigned char
 {
-    bool isPlain = false;
-    bool startsName = false;
-    bool continuesName = false;
+    Plain = 1,
+    StartsName = 2,
+    ContinuesName = 4,
 };
 
-constexpr std::array<Byte, 256> classifyBytes()
+constexpr std::array<unsigned char, 256> classifyBytes()
 {
-    std::array<Byte, 256> bytes{};
-    for (std::size_t i = 0; i < bytes.size(); ++i)
+    std::array<unsigned char, 256> parts{};
+    for (std::size_t i = 0; i < parts.size(); ++i)
     {
         bool const isLetter = (i >= 'a' && i <= 'z') || (i >= 'A' && i <= 'Z');
         bool const isDigit = i >= '0' && i <= '9';
-        bytes[i].isPlain = i < 0x80 && (i >= ' ' || i == '\t' || i == '\n' || i == '\r');
-        bytes[i].startsName = isLetter || i == '_' || i == ':' || i >= 0x80;
-        bytes[i].continuesName = bytes[i].startsName || isDigit || i == '-' || i == '.';
+        if (i < 0x80 && (i >= ' ' || i == '\t' || i == '\n' || i == '\r'))
+            parts[i] |= Plain;
+        if (isLetter || i == '_' || i == ':' || i >= 0x80)
+            parts[i] |= StartsName | ContinuesName;
+        else if (isDigit || i == '-' || i == '.')
+            parts[i] |= ContinuesName;
     }
-    return bytes;
+    return parts;
 }
 
-constexpr std::array<Byte, 256> bytes = classifyBytes();
+constexpr std::array<unsigned char, 256> partsOfBytes = classifyBytes();
 
-Byte const& classify(char character)
+bool has(char character, Part part)
 {
-    return bytes[static_cast<unsigned char>(character)];
-}
-
-bool isAscii(char character)
-{
-    return static_cast<unsigned char>(character) < 0x80;
+    return (partsOfBytes[static_cast<unsigned char>(character)] & part) != 0;
 }
 
 } // namespace
 
 bool isName(std::string const& text)
 {
-    auto const continuesName = [](char character) { return classify(character).continuesName; };
-    if (text.empty() || !classify(text.front()).startsName || !std::all_of(text.begin(), text.end(), continuesName))
+    if (text.empty() || !has(text.front(), StartsName))
         return false;
-    if (std::all_of(text.begin(), text.end(), isAscii))
+    unsigned seen = 0;
+    for (char const character : text)
+    {
+        if (!has(character, ContinuesName))
+            return false;
+        seen |= static_cast<unsigned char>(character);
+    }
+    if (seen < 0x80)
         return true;
     // The parser knows which other characters are those of a name.
     std::string const element = "<" + text + "/>";
@@ -75,7 +79,7 @@ bool isName(std::string const& text)
 std::optional<Offence> findOffence(std::string_view text)
 {
     // Most texts are plain to the end.
-    if (std::all_of(text.begin(), text.end(), [](char character) { return classify(character).isPlain; }))
+    if (std::all_of(text.begin(), text.end(), [](char character) { return has(character, Plain); }))
         return std::nullopt;
     auto const* const begin = text.data();
     auto const* const end = begin + text.size();

@@ -57,18 +57,6 @@ constexpr Escaped escapedInText = makeEscaped("<>&\"\r");
 // A reader turns these, when they stand in an attribute as they are, into blanks.
 constexpr Escaped escapedInAttribute = makeEscaped("<>&\"\r\n\t");
 
-void appendEscaped(std::string& to, std::string const& text, Escaped const& escaped)
-{
-    std::size_t copied = 0;
-    for (std::size_t place = 0; place < text.size(); ++place)
-        if (escaped[static_cast<unsigned char>(text[place])])
-        {
-            to.append(text, copied, place - copied) += getReference(text[place]);
-            copied = place + 1;
-        }
-    to.append(text, copied);
-}
-
 std::size_t requireIndent(int indent)
 {
     if (indent < 0)
@@ -81,6 +69,27 @@ std::size_t requireIndent(int indent)
 XmlWriter::XmlWriter(std::ostream& stream, int indent) : _stream(stream), _indent(requireIndent(indent)) {}
 
 XmlWriter::~XmlWriter() = default;
+
+// These come first: they are inlined in what follows.
+
+char* XmlWriter::makeRoom(std::size_t size)
+{
+    if (_text.size() - _textSize < size)
+        grow(size);
+    return _text.data() + _textSize;
+}
+
+void XmlWriter::add(char character)
+{
+    *makeRoom(1) = character;
+    ++_textSize;
+}
+
+void XmlWriter::add(std::string_view text)
+{
+    std::copy(text.begin(), text.end(), makeRoom(text.size()));
+    _textSize += text.size();
+}
 
 void XmlWriter::openTag(std::string const& name)
 {
@@ -99,8 +108,8 @@ void XmlWriter::writeAttrib(std::string const& name, std::string const& value)
     if (XmlSyntax::findOffence(value))
         requireText(value, "attribute '" + name + "' of element '" + _openNames.back() + "'");
     beginAttribute(name);
-    appendEscaped(_text, value, escapedInAttribute);
-    _text += '"';
+    addEscaped(value, escapedInAttribute);
+    add('"');
     rememberAttribute(name);
 }
 
@@ -113,8 +122,10 @@ void XmlWriter::writeAttrib(std::string const& name, int value)
 {
     requireAttribute(name);
     beginAttribute(name);
-    addNumber(value);
-    _text += '"';
+    std::array<char, 16> digits;
+    char const* const end = std::to_chars(digits.data(), digits.data() + digits.size(), value).ptr;
+    add(std::string_view(digits.data(), static_cast<std::size_t>(end - digits.data())));
+    add('"');
     rememberAttribute(name);
 }
 
@@ -125,12 +136,12 @@ void XmlWriter::writeTag(std::string const& name, std::string const& text)
         requireText(text, "text of element '" + name + "'");
     beginTag(name);
     if (text.empty())
-        _text += "/>";
+        add("/>");
     else
     {
-        _text += '>';
-        appendEscaped(_text, text, escapedInText);
-        _text.append("</").append(name) += '>';
+        add('>');
+        addEscaped(text, escapedInText);
+        endTag(name);
     }
     _isStartTagOpen = false;
     _hasRoot = true;
@@ -153,11 +164,11 @@ void XmlWriter::closeTag()
         fail("There is no open element to close");
     std::size_t const depth = _openNames.size() - 1;
     if (_isStartTagOpen)
-        _text += "/>";
+        add("/>");
     else
     {
         addLine(depth);
-        _text.append("</").append(_openNames.back()) += '>';
+        endTag(_openNames.back());
     }
     _openNames.pop_back();
     _isStartTagOpen = false;
@@ -195,27 +206,53 @@ void XmlWriter::requireAttribute(std::string const& name) const
 void XmlWriter::beginTag(std::string const& name)
 {
     if (_isStartTagOpen)
-        _text += '>';
+        add('>');
     if (!_openNames.empty())
         addLine(_openNames.size());
-    (_text += '<') += name;
+    add('<');
+    add(name);
+}
+
+void XmlWriter::endTag(std::string const& name)
+{
+    add("</");
+    add(name);
+    add('>');
 }
 
 void XmlWriter::beginAttribute(std::string const& name)
 {
-    ((_text += ' ') += name) += "=\"";
+    add(' ');
+    add(name);
+    add("=\"");
 }
 
 void XmlWriter::addLine(std::size_t depth)
 {
-    (_text += '\n').append(depth * _indent, ' ');
+    add('\n');
+    std::size_t const width = depth * _indent;
+    std::fill_n(makeRoom(width), width, ' ');
+    _textSize += width;
 }
 
-void XmlWriter::addNumber(int number)
+void XmlWriter::addEscaped(std::string const& text, std::array<bool, 256> const& escaped)
 {
-    std::array<char, 16> digits;
-    std::to_chars_result const end = std::to_chars(digits.data(), digits.data() + digits.size(), number);
-    _text.append(digits.data(), end.ptr);
+    std::string_view const all = text;
+    std::size_t added = 0;
+    for (std::size_t place = 0; place < all.size(); ++place)
+        if (escaped[static_cast<unsigned char>(all[place])])
+        {
+            add(all.substr(added, place - added));
+            add(getReference(all[place]));
+            added = place + 1;
+        }
+    add(all.substr(added));
+}
+
+void XmlWriter::grow(std::size_t size)
+{
+    constexpr std::size_t least = 4096;
+    _text.resize(std::max({least, 2 * _text.size(), _textSize + size}));
 }
 
 void XmlWriter::flush()
@@ -223,11 +260,11 @@ void XmlWriter::flush()
     constexpr std::size_t much = 1 << 16;
     bool const isWhole = _openNames.empty();
     if (isWhole)
-        _text += '\n';
-    if (isWhole || _text.size() > much)
+        add('\n');
+    if (isWhole || _textSize > much)
     {
-        _stream.write(_text.data(), static_cast<std::streamsize>(_text.size()));
-        _text.clear();
+        _stream.write(_text.data(), static_cast<std::streamsize>(_textSize));
+        _textSize = 0;
     }
     if (!_stream)
         fail("The stream of an XML document takes no more text");

@@ -2,9 +2,11 @@
 
 #include "kvExport.h"
 
+#include <array>
 #include <cstddef>
 #include <iosfwd>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace Kv
@@ -46,9 +48,16 @@ private:
     void requireAttribute(std::string const& name) const;
 
     void beginTag(std::string const& name);
+    void endTag(std::string const& name);
     void beginAttribute(std::string const& name);
     void addLine(std::size_t depth);
-    void addNumber(int number);
+    void addEscaped(std::string const& text, std::array<bool, 256> const& escaped);
+    void add(char character);
+    void add(std::string_view text);
+
+    /// Gives room for so many more bytes of text.
+    char* makeRoom(std::size_t size);
+    void grow(std::size_t size);
 
     /// Hands the text that waits to the stream, where that is all of the document or much.
     void flush();
@@ -60,8 +69,9 @@ private:
     /// Those of the element just opened are the first ones; the others wait to be used again.
     std::vector<std::string> _attributeNames;
     std::size_t _attributeCount = 0;
-    /// The text that the stream has not got yet.
+    /// Holds the text that the stream has not got yet, which is so many bytes.
     std::string _text;
+    std::size_t _textSize = 0;
     bool _isStartTagOpen = false;
     bool _hasRoot = false;
 };
