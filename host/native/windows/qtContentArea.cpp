@@ -19,7 +19,7 @@ namespace
 /// Height of a row of a form, in pixels.
 constexpr int rowHeight = 28;
 
-/// Tells whether there is one, and has all areas named when it comes.
+/// Knows whether a screen reader is there, and has the widgets in all areas named when it comes.
 class ScreenReader final : private QAccessible::ActivationObserver
 {
 public:
@@ -71,14 +71,16 @@ void QtContentArea::tellRoom()
         return;
     _telling = true;
     QPointer<QWidget> const alive(this);
-    // What comes and goes with its own bar keeps it.
+    // A content that fits without a bar, but not with what it needs then, keeps the bar.
     for (bool mayLoseBars = true;;)
     {
         QSize const room = maximumViewportSize();
         if (std::exchange(_told, room) != room)
             _onRoom(room.width(), room.height());
-        if (!alive || !widget())
+        if (!alive)
             return;
+        if (!widget())
+            break;
         bool const isWide = widget()->width() > room.width();
         bool const isHigh = widget()->height() > room.height();
         bool const hasBelow = horizontalScrollBarPolicy() == Qt::ScrollBarAlwaysOn;

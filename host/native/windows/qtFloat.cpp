@@ -127,8 +127,10 @@ void QtFloat::setContentSize(int width, int height)
 {
     if (!_area)
         return;
+    QPointer<QWidget> const content(_area->widget());
     _area->setContentSize(width, height);
-    _area->widget()->show();
+    if (content)
+        content->show();
 }
 
 void QtFloat::pin(QWidget& widget)

@@ -34,9 +34,9 @@ QtFrontOrder& QtFrontOrder::getInstance()
 void QtFrontOrder::bringToFront(QtFloat& floating)
 {
     watchKeyboard();
+    floating.raise();
     if (!_places.empty() && _places.back().widget == &floating)
         return;
-    floating.raise();
     forget(floating);
     _places.push_back({&floating, &floating});
     cutHoles();
