@@ -27,10 +27,10 @@ bp::object toBytes(std::string const& bytes)
     return bp::object(bp::handle<>(PyBytes_FromStringAndSize(bytes.data(), static_cast<Py_ssize_t>(bytes.size()))));
 }
 
-/// The modules lie beside the folder of this program.
+/// The modules lie in the same tree as this program.
 std::filesystem::path getModuleFolder()
 {
-    return std::filesystem::canonical("/proc/self/exe").parent_path().parent_path() / "python";
+    return std::filesystem::canonical("/proc/self/exe").parent_path().parent_path() / KV_PACKAGE_PLACE;
 }
 
 void require(PyStatus const& status)

@@ -181,7 +181,7 @@ def in_fresh_processes(what, names):
 
 def measure_inside():
     """Seconds by name and number."""
-    application = Path(quorvane_velmora.__file__).parents[2] / 'bin' / 'velmora'
+    application = Path(quorvane_velmora.__file__).parents[4] / 'bin' / 'velmora'
     ended = subprocess.run([application, '--exit', HERE / 'inside.py'], check=True, capture_output=True)
     return json.loads(ended.stdout.splitlines()[-1])
 
@@ -306,7 +306,8 @@ def build_revision(revision):
     subprocess.run(['git', 'checkout', '--quiet', '--detach', revision], cwd=tree, check=True)
     subprocess.run(['cmake', '--preset', 'release', '--log-level=WARNING', '-DBUILD_TESTING=OFF'], cwd=tree, check=True)
     subprocess.run(['cmake', '--build', '--preset', 'release'], cwd=tree, check=True)
-    return tree / 'build' / 'release' / 'python'
+    package = next((tree / 'build' / 'release').rglob('quorvane_velmora/__init__.py'))
+    return package.parents[1]
 
 
 parser = argparse.ArgumentParser(description=__doc__, formatter_class=argparse.RawDescriptionHelpFormatter)

@@ -18,13 +18,13 @@ namespace
 
 namespace fs = std::filesystem;
 
-/// The folder of resources that is installed beside the libraries.
+/// The folder of resources that is installed in the same tree as the libraries.
 fs::path installedFolder()
 {
     static char const anchor = 0;
     Dl_info info{};
     dladdr(&anchor, &info);
-    return fs::path(info.dli_fname).parent_path() / "../resources/tooltips";
+    return fs::path(info.dli_fname).parent_path() / "../../share/velmora/tooltips";
 }
 
 std::function<std::string()>& scriptFolder()

@@ -15,7 +15,7 @@ from scripts import environment
 
 pytestmark = pytest.mark.standalone
 
-PROGRAM = str(pathlib.Path(ui.__file__).parents[3] / 'bin' / 'velmora')
+PROGRAM = str(pathlib.Path(ui.__file__).parents[5] / 'bin' / 'velmora')
 PACKAGES = {'base', 'resmgt', 'pluginAPI', 'internalAPI', 'framework', 'gfx', 'ui', 'appUi', 'scriptingAPI',
             'pyextInit', 'pyextGraph', 'pyextUi'}
 COMPOSITION = '''<composition>

@@ -63,7 +63,8 @@ for attempt in range(2):
         sys.exit('imported')
     except ImportError as error:
         assert error.name == 'libKVpyextGraph', repr(error)
-''', PYTHONPATH=str(tmp_path))
+''', PYTHONPATH=str(tmp_path),
+               LD_LIBRARY_PATH=os.pathsep.join([LIBS, os.path.join(LIBS, *['..'] * 4, 'velmora')]))  # the linker finds it
 
 
 def test_an_import_that_runs_out_of_stack_says_so():

@@ -1,0 +1,71 @@
+"""The installed tree, wherever it is moved, needs nothing of the build tree."""
+
+import os
+import pathlib
+import subprocess
+import sys
+
+import pytest
+from quorvane_velmora import ui
+from scripts import environment
+
+pytestmark = pytest.mark.standalone
+
+BUILD = pathlib.Path(ui.__file__).parents[5]
+
+# Ends with the files that the process has loaded.
+SCRIPT = '''
+from quorvane_velmora import graph, ui
+dialog = ui.createDialog('Votes', ui.makeXmlFromWidgetList([('TextField', 'Show', 'Show', 'x')]))
+dialog.setWidgetResourceName('Show', 'votes')
+assert dialog.getValues() == {'Show': 'x'}
+with open('/proc/self/maps') as maps:
+    print(*{line.split()[-1] for line in maps if '/' in line}, sep='\\n')
+'''
+
+
+@pytest.fixture(scope='module')
+def tree(tmp_path_factory):
+    """An installed tree that was moved afterwards."""
+    first = tmp_path_factory.mktemp('installed') / 'here'
+    subprocess.run(['cmake', '--install', BUILD, '--prefix', first], check=True, capture_output=True)
+    return first.rename(first.with_name('there'))
+
+
+def run(tree, *command, **changes):
+    ended = subprocess.run(command, env=environment(QT_QPA_PLATFORM='offscreen', **changes), cwd=tree,
+                           capture_output=True, text=True, timeout=120)
+    assert ended.returncode == 0, ended.stderr
+    return ended.stdout
+
+
+def check_loaded(output, tree, least):
+    loaded = [path for path in output.splitlines() if '/libKV' in path]
+    assert len(loaded) >= least and all(path.startswith(str(tree)) for path in loaded)
+    assert not [path for path in output.splitlines() if path.startswith(str(BUILD))]
+
+
+def test_the_modules_work_with_the_path_of_the_package_alone(tree):
+    package = tree / 'lib/python3/dist-packages'
+    check_loaded(run(tree, sys.executable, '-c', SCRIPT, PYTHONPATH=str(package)), tree, 12)
+
+
+def test_the_application_works_by_its_path_alone_and_by_a_link_to_it(tree, tmp_path):
+    script = tmp_path / 'script.py'
+    script.write_text(SCRIPT)
+    link = tmp_path / 'velmora'
+    link.symlink_to(tree / 'bin/velmora')
+    for program in tree / 'bin/velmora', link:
+        check_loaded(run(tree, program, '--exit', script, PYTHONPATH=''), tree, 12)
+    assert 'pyextUi' in run(tree, link, '--build-info')
+
+
+def test_what_a_desktop_and_a_reader_need_is_there(tree):
+    files = {os.path.relpath(path, tree) for path in tree.rglob('*') if path.is_file()}
+    assert files >= {'share/applications/velmora.desktop', 'share/icons/hicolor/scalable/apps/velmora.svg',
+                     'share/man/man1/velmora.1', 'share/velmora/tooltips/votes.xml'}
+    pages = [path for path in files if path.endswith('docs/widget-list.md')]
+    assert len(pages) == 1 and os.path.join(os.path.dirname(os.path.dirname(pages[0])), 'README.md') in files
+    page = run(tree, 'man', '--warnings', '-l', str(tree / 'share/man/man1/velmora.1'), MANWIDTH='100')
+    usage = run(tree, tree / 'bin/velmora', '--help')
+    assert all(option in page for option in usage.split() if option.startswith('-'))
