@@ -25,9 +25,20 @@ with open('/proc/self/maps') as maps:
 
 
 @pytest.fixture(scope='module')
-def tree(tmp_path_factory):
-    """An installed tree that was moved afterwards."""
-    first = tmp_path_factory.mktemp('installed') / 'here'
+def package(tmp_path_factory):
+    folder = tmp_path_factory.mktemp('package')
+    subprocess.run(['cpack', '-B', folder], cwd=BUILD, check=True, capture_output=True)
+    path, = folder.glob('*.deb')
+    return path
+
+
+@pytest.fixture(scope='module', params=['installed', 'packed'])
+def tree(request, package, tmp_path_factory):
+    """An installed tree that was moved afterwards, and that of the Debian package."""
+    first = tmp_path_factory.mktemp(request.param) / 'here'
+    if request.param == 'packed':
+        subprocess.run(['dpkg-deb', '-x', package, first], check=True)
+        return first / 'usr'
     subprocess.run(['cmake', '--install', BUILD, '--prefix', first], check=True, capture_output=True)
     return first.rename(first.with_name('there'))
 
@@ -60,12 +71,20 @@ def test_the_application_works_by_its_path_alone_and_by_a_link_to_it(tree, tmp_p
     assert 'pyextUi' in run(tree, link, '--build-info')
 
 
+def test_the_package_has_no_errors_and_depends_on_what_it_is_linked_to(package):
+    found = subprocess.run(['lintian', '--allow-root', package], capture_output=True, text=True).stdout
+    assert not [line for line in found.splitlines() if line.startswith('E:')], found
+    fields = subprocess.run(['dpkg-deb', '-f', package, 'Depends'], check=True, capture_output=True, text=True).stdout
+    assert {'python3', 'libqt6widgets6', 'libexpat1'} < {part.split()[0] for part in fields.split(',')}
+    assert 'libboost-python' in fields
+
+
 def test_what_a_desktop_and_a_reader_need_is_there(tree):
     files = {os.path.relpath(path, tree) for path in tree.rglob('*') if path.is_file()}
     assert files >= {'share/applications/velmora.desktop', 'share/icons/hicolor/scalable/apps/velmora.svg',
-                     'share/man/man1/velmora.1', 'share/velmora/tooltips/votes.xml'}
+                     'share/man/man1/velmora.1.gz', 'share/velmora/tooltips/votes.xml'}
     pages = [path for path in files if path.endswith('docs/widget-list.md')]
     assert len(pages) == 1 and os.path.join(os.path.dirname(os.path.dirname(pages[0])), 'README.md') in files
-    page = run(tree, 'man', '--warnings', '-l', str(tree / 'share/man/man1/velmora.1'), MANWIDTH='100')
+    page = run(tree, 'man', '--warnings', '-l', str(tree / 'share/man/man1/velmora.1.gz'), MANWIDTH='100')
     usage = run(tree, tree / 'bin/velmora', '--help')
     assert all(option in page for option in usage.split() if option.startswith('-'))
