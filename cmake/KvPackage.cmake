@@ -17,6 +17,7 @@ set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${KV_LIBRARY_DIR} ${KV_PACKAGE_D
 # The modules are for one version of the interpreter.
 math(EXPR next "${Python3_VERSION_MINOR} + 1")
 set(CPACK_DEBIAN_PACKAGE_DEPENDS "python3 (>= 3.${Python3_VERSION_MINOR}), python3 (<< 3.${next})")
-set(CPACK_DEBIAN_PACKAGE_RECOMMENDS "qt6-wayland, fonts-dejavu-core")
+# The examples play themselves by PyQt6 where there is no display.
+set(CPACK_DEBIAN_PACKAGE_RECOMMENDS "qt6-wayland, fonts-dejavu-core, python3-pyqt6")
 set(CPACK_DEBIAN_PACKAGE_SUGGESTS "fonts-noto-color-emoji")
 include(CPack)
