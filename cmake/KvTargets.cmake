@@ -17,34 +17,36 @@ endif()
 add_library(kv_python INTERFACE)
 target_link_libraries(kv_python INTERFACE Boost::python Python3::Module)
 
-# kv_install(NAME PLACE): installs a target at a place in the tree. There, as in the build tree, it finds the host's
+# kv_place(NAME PLACE): gives a target its place, in the build tree and in the installed one. In both it finds the host's
 # libraries from where it stands itself.
-function(kv_install name place)
+function(kv_place name place)
   set(found $ORIGIN)
   file(RELATIVE_PATH libraries /${place} /${KV_LIBRARY_PLACE})
   if(libraries)
     list(APPEND found $ORIGIN/${libraries})
   endif()
-  set_target_properties(${name} PROPERTIES BUILD_WITH_INSTALL_RPATH ON INSTALL_RPATH "${found}")
+  set_target_properties(${name} PROPERTIES
+    BUILD_WITH_INSTALL_RPATH ON INSTALL_RPATH "${found}"
+    LIBRARY_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/${place} RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/${place})
   install(TARGETS ${name} DESTINATION ${place})
 endfunction()
 
-# kv_library(NAME SOURCES... [DEPENDS rooms...] [PUBLIC targets...] [PRIVATE targets...] [OWN_RECORD] [MODULE]): a host or sibling
-# library, lib<NAME>.so. Its folder is the include folder for those that link it. It is a package by the name without
-# KV. Its record names the libraries of DEPENDS in their order; one with OWN_RECORD makes it itself. A MODULE is installed
-# by its own rule.
+# kv_library(NAME SOURCES... [DEPENDS rooms...] [PUBLIC targets...] [PRIVATE targets...] [OWN_RECORD] [PLACE place]): a
+# host or sibling library, lib<NAME>.so, at KV_LIBRARY_PLACE if not told otherwise. Its folder is the include folder for
+# those that link it. It is a package by the name without KV. Its record names the libraries of DEPENDS in their order;
+# one with OWN_RECORD makes it itself.
 function(kv_library name)
-  cmake_parse_arguments(PARSE_ARGV 1 arg "OWN_RECORD;MODULE" "" "SOURCES;DEPENDS;PUBLIC;PRIVATE")
+  cmake_parse_arguments(PARSE_ARGV 1 arg "OWN_RECORD" "PLACE" "SOURCES;DEPENDS;PUBLIC;PRIVATE")
   add_library(${name} SHARED ${arg_SOURCES})
   target_link_libraries(${name} PUBLIC ${arg_DEPENDS} ${arg_PUBLIC} PRIVATE kv_options ${arg_PRIVATE})
   target_include_directories(${name} PUBLIC ${CMAKE_CURRENT_SOURCE_DIR})
   if(NOT KV_SANITIZE AND NOT kv_python IN_LIST arg_PUBLIC AND NOT kv_python IN_LIST arg_PRIVATE)
     target_link_options(${name} PRIVATE -Wl,--no-undefined)
   endif()
-  set_target_properties(${name} PROPERTIES LIBRARY_OUTPUT_DIRECTORY ${KV_LIBRARY_DIR})
-  if(NOT arg_MODULE)
-    kv_install(${name} ${KV_LIBRARY_PLACE})
+  if(NOT arg_PLACE)
+    set(arg_PLACE ${KV_LIBRARY_PLACE})
   endif()
+  kv_place(${name} ${arg_PLACE})
   if(NOT arg_OWN_RECORD)
     set(record ${PROJECT_SOURCE_DIR}/host/base/packages/inPackageRecord.cpp)
     list(TRANSFORM arg_DEPENDS REPLACE "^KV" "")
@@ -58,7 +60,5 @@ endfunction()
 
 # kv_python_module(NAME ...): as kv_library, an extension module lib<NAME> of the package.
 function(kv_python_module name)
-  kv_library(${name} ${ARGN} PUBLIC kv_python MODULE)
-  set_target_properties(${name} PROPERTIES LIBRARY_OUTPUT_DIRECTORY ${KV_PACKAGE_DIR}/quorvane_velmora/libs)
-  kv_install(${name} ${KV_PACKAGE_PLACE}/quorvane_velmora/libs)
+  kv_library(${name} ${ARGN} PUBLIC kv_python PLACE ${KV_PACKAGE_PLACE}/quorvane_velmora/libs)
 endfunction()

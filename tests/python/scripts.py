@@ -1,12 +1,17 @@
 """Scripts in processes of their own."""
 
 import os
+import pathlib
 import subprocess
 import sys
 import tempfile
 
+from quorvane_velmora import ui
+
 PROGRAM = os.readlink('/proc/self/exe')
 INSIDE = os.path.basename(PROGRAM) == 'velmora'
+# The tree that the tests run in: the build's, with `bin` and `lib`.
+TREE = pathlib.Path(ui.__file__).parents[5]
 HERE = os.path.dirname(os.path.abspath(__file__))
 CHOOSES_DISPLAY = ('DISPLAY', 'QT_QPA_PLATFORM', 'WAYLAND_DISPLAY', 'WAYLAND_SOCKET', 'XDG_SESSION_TYPE')
 

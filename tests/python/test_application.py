@@ -1,7 +1,6 @@
 """The application as a whole, in a process of its own, as it is started from a terminal."""
 
 import os
-import pathlib
 import re
 import subprocess
 import sys
@@ -11,11 +10,11 @@ import zipfile
 import pytest
 
 from quorvane_velmora import ui
-from scripts import environment
+from scripts import TREE, environment
 
 pytestmark = pytest.mark.standalone
 
-PROGRAM = str(pathlib.Path(ui.__file__).parents[5] / 'bin' / 'velmora')
+PROGRAM = str(TREE / 'bin' / 'velmora')
 PACKAGES = {'base', 'resmgt', 'pluginAPI', 'internalAPI', 'framework', 'gfx', 'ui', 'appUi', 'scriptingAPI',
             'pyextInit', 'pyextGraph', 'pyextUi'}
 COMPOSITION = '''<composition>

@@ -8,12 +8,12 @@ from collections import Counter
 import pytest
 
 from quorvane_velmora import ui
+from scripts import TREE
 
 pytestmark = pytest.mark.standalone
 
 SOURCES = os.path.join(os.path.dirname(__file__), '..', '..')
 LIBS = os.path.dirname(ui.__file__)
-BUILD = os.path.join(LIBS, *['..'] * 5)
 MODULE = os.path.join(LIBS, 'libKVpyextUi.so')
 DIALOG = 'Kv::PyextUi::Dialog'
 ERROR = 'Kv::PyextInit::ModError<Kv::PyextUi::Ui>'
@@ -80,7 +80,7 @@ def linked_to(path):
 
 
 def test_a_library_names_what_it_is_linked_to_as_its_dependencies():
-    paths = {name[5:-3]: os.path.join(folder, name) for folder in (LIBS, os.path.join(BUILD, 'lib', 'velmora'))
+    paths = {name[5:-3]: os.path.join(folder, name) for folder in (LIBS, TREE / 'lib' / 'velmora')
              for name in os.listdir(folder) if name.endswith('.so')}
     get_type = re.compile(r'Kv::InInit<KvInit::(\w+)>::getType\(\)')
     named, shown = ({package: set(get_type.findall('\n'.join(symbols(path, kind)))) for package, path in paths.items()}

@@ -1,17 +1,13 @@
 """The installed tree, wherever it is moved, needs nothing of the build tree."""
 
 import os
-import pathlib
 import subprocess
 import sys
 
 import pytest
-from quorvane_velmora import ui
-from scripts import environment
+from scripts import TREE, environment
 
 pytestmark = pytest.mark.standalone
-
-BUILD = pathlib.Path(ui.__file__).parents[5]
 
 # Ends with the files that the process has loaded.
 SCRIPT = '''
@@ -27,7 +23,7 @@ with open('/proc/self/maps') as maps:
 @pytest.fixture(scope='module')
 def package(tmp_path_factory):
     folder = tmp_path_factory.mktemp('package')
-    subprocess.run(['cpack', '-B', folder], cwd=BUILD, check=True, capture_output=True)
+    subprocess.run(['cpack', '-B', folder], cwd=TREE, check=True, capture_output=True)
     path, = folder.glob('*.deb')
     return path
 
@@ -39,7 +35,7 @@ def tree(request, package, tmp_path_factory):
     if request.param == 'packed':
         subprocess.run(['dpkg-deb', '-x', package, first], check=True)
         return first / 'usr'
-    subprocess.run(['cmake', '--install', BUILD, '--prefix', first], check=True, capture_output=True)
+    subprocess.run(['cmake', '--install', TREE, '--prefix', first], check=True, capture_output=True)
     return first.rename(first.with_name('there'))
 
 
@@ -53,7 +49,7 @@ def run(tree, *command, **changes):
 def check_loaded(output, tree, least):
     loaded = [path for path in output.splitlines() if '/libKV' in path]
     assert len(loaded) >= least and all(path.startswith(str(tree)) for path in loaded)
-    assert not [path for path in output.splitlines() if path.startswith(str(BUILD))]
+    assert not [path for path in output.splitlines() if path.startswith(str(TREE))]
 
 
 def test_the_modules_work_with_the_path_of_the_package_alone(tree):

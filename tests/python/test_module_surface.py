@@ -7,7 +7,7 @@ import shutil
 import pytest
 
 from quorvane_velmora import ui
-from scripts import run_script
+from scripts import TREE, run_script
 
 pytestmark = pytest.mark.standalone
 
@@ -64,7 +64,7 @@ for attempt in range(2):
     except ImportError as error:
         assert error.name == 'libKVpyextGraph', repr(error)
 ''', PYTHONPATH=str(tmp_path),
-               LD_LIBRARY_PATH=os.pathsep.join([LIBS, os.path.join(LIBS, *['..'] * 4, 'velmora')]))  # the linker finds it
+               LD_LIBRARY_PATH=os.pathsep.join([LIBS, str(TREE / 'lib' / 'velmora')]))  # the linker finds it
 
 
 def test_an_import_that_runs_out_of_stack_says_so():
