@@ -20,5 +20,5 @@ math(EXPR next "${Python3_VERSION_MINOR} + 1")
 set(CPACK_DEBIAN_PACKAGE_DEPENDS "python3 (>= 3.${Python3_VERSION_MINOR}), python3 (<< 3.${next})")
 # The examples play themselves by PyQt6 where there is no display.
 set(CPACK_DEBIAN_PACKAGE_RECOMMENDS "qt6-wayland, fonts-dejavu-core, python3-pyqt6")
-set(CPACK_DEBIAN_PACKAGE_SUGGESTS "fonts-noto-color-emoji")
+set(CPACK_DEBIAN_PACKAGE_SUGGESTS "fonts-noto-color-emoji, python3-pytest")
 include(CPack)

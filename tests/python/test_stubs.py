@@ -13,6 +13,7 @@ PACKAGE = os.path.join(os.path.dirname(ui.__file__), '..', '..')
 
 # Names for types that the modules do not have, and what Boost.Python's classes have of their own.
 ALLOWED = r'''
+quorvane_velmora\.testing\.(Filling|__tracebackhide__)
 quorvane_velmora\.ui\.(Value|NewValue|Callback|\w+Entry)
 quorvane_velmora\.(ui|graph)\.(BrowserScheme|CursorGuard|Dialog|Graph|Workspace)
 .*\.__instance_size__
@@ -20,7 +21,7 @@ quorvane_velmora\.(ui|graph)\.(BrowserScheme|CursorGuard|Dialog|Graph|Workspace)
 
 SCRIPT = '''
 from __future__ import annotations
-from quorvane_velmora import graph, ui
+from quorvane_velmora import graph, testing, ui
 
 form: list[ui.WidgetEntry] = [
     ('TextField', 'Show', 'Show', 'x'), ('ToggleButton', 'Win', 'Win ?', True), ('Label', 'Note'),
@@ -37,6 +38,11 @@ guard = ui.CursorGuard('busy')
 path: str = ui.showBrowser(title='Pick', initialPath='/', pathValidationCb=lambda focus, current: focus)
 name: str = ui.Workspace.getCurrentComposition().getName()
 graph.readComposition(path='a').setNodeValue('n', 'k', 'v')
+with testing.person(deadline=2.5, pictures='/tmp') as person:
+    person.answer('t', {'Show': 'x', 'Step': 'b', 'Win': True}, 'OK', says='Sure', do=lambda person: person.press('Tab'))
+    person.answer('t', {'Show': 1.5})  # wrong
+    person.answer('t', 'OK')  # wrong
+    text: str = person.see()
 ui.showSimpleDialog('t', [('TextFiled', 'Show')], 400)  # wrong
 ui.showSimpleDialog('t', [('TextField', 'Show', 'Show', 5)], 400)  # wrong
 ui.showSimpleDialog('t', [('Menu', 'Step', 'Step', 'a')], 400)  # wrong
@@ -61,7 +67,8 @@ def run(*arguments):
 def test_the_stubs_agree_with_the_modules(tmp_path):
     allowed = tmp_path / 'allowed'
     allowed.write_text(ALLOWED)
-    done = run('mypy.stubtest', 'quorvane_velmora.ui', 'quorvane_velmora.graph', '--allowlist', str(allowed))
+    done = run('mypy.stubtest', 'quorvane_velmora.ui', 'quorvane_velmora.graph', 'quorvane_velmora.testing',
+               '--allowlist', str(allowed))
     assert done.returncode == 0, done.stdout
 
 

@@ -30,6 +30,9 @@ public:
     virtual void onMoveWanted(int x, int y) = 0;
 };
 
+/// The property of Qt that tells a floating container from other widgets, to those who look at the screen.
+constexpr char const* ntFloatMark = "velmoraFloat";
+
 /// Floats above its siblings and keeps Tab within itself. When it is hidden, the keyboard goes to the front-most that
 /// takes input, a float or what else had it, and there to the widget that had it last. Where the content is larger, the
 /// user can scroll it.

@@ -6,6 +6,7 @@
 #include "peers/qtText.h"
 #include "start/qtTextEstimate.h"
 #include "windows/qtAdoptedContainer.h"
+#include "windows/qtContentArea.h"
 #include "windows/qtMainWindow.h"
 #include "windows/qtWindow.h"
 
@@ -90,6 +91,11 @@ QRect fitToScreen(GeRectangle<int> const& frame)
 }
 
 } // namespace
+
+QtPlatform::QtPlatform()
+{
+    QtContentArea::noticeReaders();
+}
 
 void QtPlatform::setScriptHook(NtScriptHook* hook)
 {

@@ -16,6 +16,8 @@ namespace Kv
 class QtPlatform final : public NtPlatform
 {
 public:
+    QtPlatform();
+
     void setScriptHook(NtScriptHook* hook) override;
     float measureText(std::string const& text) override;
     GeVector2<int> getScreenSize() override;

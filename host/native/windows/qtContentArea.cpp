@@ -105,6 +105,11 @@ void QtContentArea::setContentSize(int width, int height)
         tellRoom();
 }
 
+void QtContentArea::noticeReaders()
+{
+    ScreenReader::getInstance();
+}
+
 void QtContentArea::nameValuesSoon()
 {
     if (ScreenReader::getInstance().isThere() && !std::exchange(_naming, true))

@@ -24,6 +24,9 @@ public:
     /// Gives the content its size, in pixels, once all in it has its place.
     void setContentSize(int width, int height);
 
+    /// Notices from now on whether somebody reads the screen to the user.
+    static void noticeReaders();
+
     /// The widgets in the content are called anew by what stands beside them, once the event that is handled is over.
     /// Nothing happens before somebody reads the screen to the user.
     void nameValuesSoon();

@@ -86,6 +86,7 @@ QtPeerKind<NtFloat, Float> const registered;
 
 QtFloat::QtFloat(QWidget* parent, QtListenerHandle<NtFloatListener> const& handle) : QWidget(parent), _handle(handle)
 {
+    setProperty(ntFloatMark, true);
     setAutoFillBackground(true);
     QtFrontOrder::getInstance().bringToFront(*this);
 }
