@@ -18,7 +18,6 @@ set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${PROJECT_BINARY_DIR}/${KV_LIBRA
 # The modules are for one version of the interpreter.
 math(EXPR next "${Python3_VERSION_MINOR} + 1")
 set(CPACK_DEBIAN_PACKAGE_DEPENDS "python3 (>= 3.${Python3_VERSION_MINOR}), python3 (<< 3.${next})")
-# The examples play themselves by PyQt6 where there is no display.
-set(CPACK_DEBIAN_PACKAGE_RECOMMENDS "qt6-wayland, fonts-dejavu-core, python3-pyqt6")
+set(CPACK_DEBIAN_PACKAGE_RECOMMENDS "qt6-wayland, fonts-dejavu-core")
 set(CPACK_DEBIAN_PACKAGE_SUGGESTS "fonts-noto-color-emoji, python3-pytest")
 include(CPack)

@@ -11,7 +11,7 @@ values = ui.showSimpleDialog('Awards', [
     ('TextField', 'Speech', 'Speech'),
 ], 400, True)
 
-if values['CloseButtonClicked'] == 'CloseButton_OK':
+if values.get('CloseButtonClicked') == 'CloseButton_OK':
     outcome = 'You win' if values['Win'] else 'You do not win'
     ui.showMessageBox('Awards', [
         'Show: ' + values['Show'],

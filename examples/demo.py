@@ -1,4 +1,4 @@
-"""The awards form: on the screen if there is one; without one, filled in by a player that saves pictures."""
+"""The awards form: on the screen if there is one; without one, filled in by a person of C{quorvane_velmora.testing}."""
 
 import ctypes
 import os
@@ -34,32 +34,20 @@ def has_display():
 def play():
     """Fills in the form as a person would, and reads the message box that follows."""
     os.environ['QT_QPA_PLATFORM'] = 'offscreen'
-    from PyQt6.QtCore import Qt
-
-    from player import Player
+    from quorvane_velmora import testing
 
     folder = os.path.join(os.getcwd(), 'build', 'demo')
     os.makedirs(folder, mode=0o700, exist_ok=True)
     os.environ.setdefault('XDG_RUNTIME_DIR', folder)
-    player = Player(folder, [
-        [
-            lambda person: person.type('Golden Reel Awards'),
-            lambda person: person.tab(),
-            lambda person: person.press(Qt.Key.Key_Space),
-            lambda person: person.press(Qt.Key.Key_Space),
-            lambda person: person.tab(),
-            lambda person: person.press(Qt.Key.Key_Down),
-            lambda person: person.tab(),
-            lambda person: person.type('Thank you, all of you.'),
-            lambda person: person.click('CloseButton_OK'),
-        ],
-        [lambda person: person.click('CloseButton_OK')],
-    ])
-    print('There is no display: a player fills in the form offscreen.')
-    player.run(AWARDS)
-    for picture in player.pictures:
+    pictures = [os.path.join(folder, name) for name in ('awards.png', 'outcome.png')]
+    print('There is no display: the form is filled in offscreen.')
+    with testing.person() as person:
+        person.answer('Awards', {'Show': 'Golden Reel Awards', 'Category': 'Music', 'Speech': 'Thank you, all of you.'},
+                      'OK', do=lambda person: person.picture(pictures[0]))
+        person.answer('Awards', says='You win', press='OK', do=lambda person: person.picture(pictures[1]))
+        runpy.run_path(AWARDS, run_name='__main__')
+    for picture in pictures:
         print('Picture: ' + picture)
-    sys.exit(0 if len(player.pictures) == 2 else 'The player saw %d of 2 dialogs.' % len(player.pictures))
 
 
 if has_display():
