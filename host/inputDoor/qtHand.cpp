@@ -36,6 +36,10 @@ void clickAt(QWidget& widget, QPoint const& place, Qt::KeyboardModifiers modifie
     QPointer<QWindow> const window = widget.window()->windowHandle();
     QPoint const position = widget.mapTo(widget.window(), place);
     pointAt(widget, place);
+    // An open popup, such as suggestions for a path, would take the first click to go.
+    QWidget* const popup = QApplication::activePopupWidget();
+    if (popup && popup != widget.window())
+        popup->close();
     QTest::mousePress(window, Qt::LeftButton, modifiers, position);
     // What was pressed may have gone.
     if (window)

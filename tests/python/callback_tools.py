@@ -1,5 +1,5 @@
-"""What the tests of callbacks share: a dialog with a widget of each kind, and a user who goes on while a callback blocks
-in a dialog of its own."""
+"""What the tests of callbacks share: a user who goes on while a callback blocks in a dialog of its own, and scripts on the
+same screen."""
 
 import os
 import signal
@@ -9,27 +9,7 @@ from quorvane_velmora import ui
 from user import User
 from PyQt6.QtCore import QTimer
 
-EVENTS = (ui.EventType.ENABLE, ui.EventType.DISABLE, ui.EventType.STATE, ui.EventType.ACTIVATE,
-          ui.EventType.VALUE_CHANGED)
-
 SAME_SCREEN = {name: os.environ[name] for name in ('DISPLAY', 'QT_QPA_PLATFORM') if name in os.environ}
-
-UNKNOWN = 'Cannot find widget: the specified widget does not exist.'
-
-
-def make_dialog(title='Form', buttons=('OK', 'Cancel')):
-    return ui.createDialog(title, ui.makeXmlFromWidgetList([
-        ('TextField', 'Text', 'Caption', 'old'), ('ToggleButton', 'Toggle', '', False), ('Menu', 'Menu', '', (['a', 'b'], 0)),
-        ('PushButton', 'Button'), ('PushButton', 'Other'), ('Label', 'Note', '', 'note')], list(buttons)), 400, 224)
-
-
-def listen(dialog, *widgets):
-    """Gives the list into which every event of the widgets goes from now on."""
-    heard = []
-    for widget in widgets:
-        for event in EVENTS:
-            dialog.addCallback(widget, event, lambda _, name, what: heard.append((name, what)))
-    return heard
 
 
 class PatientUser(User):

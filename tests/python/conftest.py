@@ -8,14 +8,20 @@ import traceback
 
 import pytest
 
-import stage
-from callback_tools import PatientUser
+import scripts
 from desk import Desk
-from user import User
+
+# There is PyQt6 for the distribution's interpreter. Tests that need it are not run for others.
+try:
+    import stage
+    from callback_tools import PatientUser
+    from user import User
+except ModuleNotFoundError:
+    stage = None
 
 
 def pytest_configure(config):
-    if stage.APPLICATION:
+    if stage and stage.APPLICATION:
         stage.APPLICATION.resize(1180, 860)  # with room for the dialogs of the tests
     config.addinivalue_line('markers', 'standalone: about dialogs that have windows of their own')
     config.addinivalue_line('markers', 'inside: about the running application')
@@ -24,7 +30,7 @@ def pytest_configure(config):
 
 def pytest_collection_modifyitems(config, items):
     """Each test belongs to both settings unless it is marked as one of a single setting."""
-    other = 'standalone' if stage.APPLICATION else 'inside'
+    other = 'standalone' if scripts.INSIDE else 'inside'
     left = [item for item in items if item.get_closest_marker(other)]
     items[:] = [item for item in items if item not in left]
     config.hook.pytest_deselected(items=left)

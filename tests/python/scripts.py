@@ -6,6 +6,7 @@ import subprocess
 import sys
 import tempfile
 
+import pytest
 from quorvane_velmora import ui
 
 PROGRAM = os.readlink('/proc/self/exe')
@@ -13,6 +14,9 @@ INSIDE = os.path.basename(PROGRAM) == 'velmora'
 # The tree that the tests run in: the build's, with `bin` and `lib`.
 TREE = pathlib.Path(ui.__file__).parents[5]
 HERE = os.path.dirname(os.path.abspath(__file__))
+# The Debian package and the type checker are for its interpreter.
+distribution = pytest.mark.skipif(os.path.realpath(sys.executable) != os.path.realpath('/usr/bin/python3'),
+                                  reason='for the interpreter of the distribution')
 CHOOSES_DISPLAY = ('DISPLAY', 'QT_QPA_PLATFORM', 'WAYLAND_DISPLAY', 'WAYLAND_SOCKET', 'XDG_SESSION_TYPE')
 
 

@@ -207,7 +207,8 @@ def test_a_script_that_fails_leaves_the_application_running_and_can_be_run_again
 def test_its_window_can_be_closed_under_dialogs_and_the_script_comes_to_its_own_end(tmp_path, inner, exit):
     status, printed, errors = run_inside(tmp_path, '''
         import stage, sys
-        from callback_tools import PatientUser, make_dialog, ui
+        from callback_tools import PatientUser
+        from forms import make_dialog, ui
         outer, inner = make_dialog('outer'), make_dialog('inner')
         outer.addCallback('Button', ui.EventType.ACTIVATE, lambda *_: print(repr(%s)))
         user = PatientUser()
@@ -231,7 +232,8 @@ def test_its_window_can_be_closed_under_dialogs_and_the_script_comes_to_its_own_
 def test_a_script_that_asks_until_it_is_answered_ends_when_its_window_is_closed(tmp_path):
     status, _, errors = run_inside(tmp_path, '''
         import stage
-        from callback_tools import QTimer, make_dialog
+        from callback_tools import QTimer
+        from forms import make_dialog
         dialog = make_dialog()
         QTimer.singleShot(50, stage.APPLICATION.close)
         while True:
@@ -245,7 +247,7 @@ def test_a_script_that_asks_until_it_is_answered_ends_when_its_window_is_closed(
 
 LEAVING = '''
 import gc, stage
-from callback_tools import make_dialog
+from forms import make_dialog
 from PyQt6.QtCore import QObject
 from PyQt6.QtWidgets import QApplication, QTreeView
 

@@ -64,7 +64,7 @@ def run_with_tools(folder, script, *options, plan='', **changes):
 def test_the_log_shows_what_scripts_print_with_errors_told_apart_and_the_terminal_gets_it_too(tmp_path):
     printed, errors = run_with_tools(tmp_path, r'''
         import threading
-        from callback_tools import make_dialog, ui
+        from forms import make_dialog, ui
         print('to the \x1b[1mterminal\x1b[0m')
         print('to the other', file=sys.stderr)
         sys.stdout.buffer.write('bytes \u00fc\n'.encode())
@@ -206,7 +206,7 @@ def test_a_script_is_stopped_by_a_key_while_its_dialog_runs_and_no_other_command
         plan += [(1, 'script.py was stopped', lambda: trigger('Run Script Again')),
                  (2, 'script.py has ended', stage.APPLICATION.close)]
         '''), script=TOOLS + textwrap.dedent('''
-        from callback_tools import make_dialog, ui
+        from forms import make_dialog, ui
 
         def can_be_used(action):
             menus = [one for one in action.associatedObjects() if isinstance(one, QMenu)]
@@ -244,7 +244,7 @@ def test_a_script_that_keeps_the_window_from_answering_is_stopped_in_a_window_of
         plan += [(1, 'was stopped', again), (2, 'was stopped', again), (3, 'has ended', press)]
         '''), script='''
         import time, watching
-        from callback_tools import make_dialog, ui
+        from forms import make_dialog, ui
 
         def hang(*_):
             print('busy', flush=True)
@@ -352,7 +352,7 @@ def test_a_key_leads_to_each_pane_and_only_the_one_that_has_the_keyboard_has_a_b
     for name in 'one', 'two':
         (tmp_path / (name + '.vmcomposition')).write_text(COMPOSITION)
     printed, _ = run_with_tools(tmp_path, '''
-        from callback_tools import make_dialog
+        from forms import make_dialog
         nodes = window.findChild(QTreeWidget, 'nodes')
         compositions = window.findChild(QListWidget, 'compositions')
         dialog = make_dialog()

@@ -5,7 +5,7 @@ import weakref
 
 import pytest
 
-from callback_tools import UNKNOWN, listen, make_dialog
+from forms import UNKNOWN, listen, make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtTest import QTest

@@ -3,7 +3,7 @@
 import pytest
 
 import scripts
-from callback_tools import make_dialog
+from forms import make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtWidgets import QApplication

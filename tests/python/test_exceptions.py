@@ -7,7 +7,7 @@ import traceback
 import pytest
 
 import stage
-from callback_tools import listen, make_dialog
+from forms import listen, make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import QEventLoop, QObject, QTimer, Qt
 from PyQt6.QtTest import QTest

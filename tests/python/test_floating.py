@@ -3,7 +3,7 @@
 import pytest
 
 import stage
-from callback_tools import listen, make_dialog
+from forms import listen, make_dialog
 from descriptions import close_button, container, widget
 from quorvane_velmora import ui
 from PyQt6.QtCore import QEvent, QPoint, QPointF, QRect, Qt

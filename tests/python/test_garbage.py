@@ -7,7 +7,8 @@ import weakref
 
 import pytest
 
-from callback_tools import make_dialog, run_script
+from callback_tools import run_script
+from forms import make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import QEvent
 from PyQt6.QtWidgets import QApplication
@@ -160,7 +161,7 @@ def test_the_collector_may_come_in_the_middle_of_an_event(user):
 
 GROWTH = '''
 import ctypes, gc, itertools
-from callback_tools import make_dialog, ui
+from forms import make_dialog, ui
 from test_garbage import MADE_BY, Keeper
 
 class Heap(ctypes.Structure):
@@ -259,7 +260,8 @@ def test_what_is_connected_to_a_native_widget_goes_with_it_and_not_before(user):
 
 def test_windows_that_are_left_go_while_those_who_hear_of_it_have_all_their_names():
     printed = run_script('''
-from callback_tools import PatientUser, make_dialog
+from callback_tools import PatientUser
+from forms import make_dialog
 from PyQt6.QtWidgets import QWidget
 def hear(*_):
     print(name)

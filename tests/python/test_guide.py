@@ -9,8 +9,13 @@ import re
 import shutil
 
 import pytest
-import stage
+import scripts
 from quorvane_velmora import graph, testing, ui
+
+try:
+    import stage
+except ModuleNotFoundError:  # there is no PyQt6
+    stage = None
 
 ROOT = pathlib.Path(__file__).parents[2]
 PAGES = [ROOT / 'README.md', *sorted((ROOT / 'docs').glob('*.md'))]
@@ -51,9 +56,11 @@ def test_each_block_of_a_page_runs(page, tmp_path, monkeypatch, capsys):
     for before, language, code, file in BLOCK.findall(page.read_text()):
         if file:
             pathlib.Path(file).write_text(code)
+        if 'PyQt6' in code and not stage:
+            continue
         before = before or None
         if before and before.startswith('inside'):
-            if not stage.APPLICATION:
+            if not scripts.INSIDE:
                 continue
             before = before[len('inside'):].lstrip('\n')
         if language == 'xml':

@@ -5,7 +5,7 @@ import subprocess
 import sys
 
 import pytest
-from scripts import TREE, environment
+from scripts import TREE, distribution, environment
 
 pytestmark = pytest.mark.standalone
 
@@ -28,12 +28,12 @@ def package(tmp_path_factory):
     return path
 
 
-@pytest.fixture(scope='module', params=['installed', 'packed'])
-def tree(request, package, tmp_path_factory):
+@pytest.fixture(scope='module', params=['installed', pytest.param('packed', marks=distribution)])
+def tree(request, tmp_path_factory):
     """An installed tree that was moved afterwards, and that of the Debian package."""
     first = tmp_path_factory.mktemp(request.param) / 'here'
     if request.param == 'packed':
-        subprocess.run(['dpkg-deb', '-x', package, first], check=True)
+        subprocess.run(['dpkg-deb', '-x', request.getfixturevalue('package'), first], check=True)
         return first / 'usr'
     subprocess.run(['cmake', '--install', TREE, '--prefix', first], check=True, capture_output=True)
     return first.rename(first.with_name('there'))
@@ -67,6 +67,22 @@ def test_the_application_works_by_its_path_alone_and_by_a_link_to_it(tree, tmp_p
     assert 'pyextUi' in run(tree, link, '--build-info')
 
 
+def test_a_wheel_brings_the_modules_into_an_environment_and_leaves_it(tmp_path):
+    subprocess.run(['cmake', '--build', TREE, '--target', 'wheel'], check=True, capture_output=True)
+    wheel, = TREE.glob('*.whl')
+    environment = tmp_path / 'environment'
+    subprocess.run([sys.executable, '-m', 'venv', environment], check=True, capture_output=True)
+    python = environment / 'bin/python'
+    before = set(environment.rglob('*.so'))
+    run(environment, python, '-m', 'pip', 'install', '--no-index', wheel, PYTHONPATH='')
+    check_loaded(run(environment, python, '-c', SCRIPT, PYTHONPATH=''), environment, 12)
+    assert 'velmora' in run(environment, python, '-c', 'import importlib.metadata as metadata; print(metadata.entry_points())',
+                            PYTHONPATH='')
+    run(environment, python, '-m', 'pip', 'uninstall', '--yes', 'quorvane-velmora', PYTHONPATH='')
+    assert set(environment.rglob('*.so')) == before
+
+
+@distribution
 def test_the_package_has_no_errors_and_depends_on_what_it_is_linked_to(package):
     found = subprocess.run(['lintian', '--allow-root', package], capture_output=True, text=True).stdout
     assert not [line for line in found.splitlines() if line.startswith('E:')], found

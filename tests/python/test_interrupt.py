@@ -17,7 +17,8 @@ pytestmark = [pytest.mark.standalone, pytest.mark.screen]
 
 PRELUDE = '''
 import gc, time
-from callback_tools import PatientUser, make_dialog, ui
+from callback_tools import PatientUser
+from forms import make_dialog, ui
 from stage import titles as visible
 
 def ready(user):

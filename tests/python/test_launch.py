@@ -8,7 +8,7 @@ import threading
 import pytest
 
 import stage
-from callback_tools import make_dialog
+from forms import make_dialog
 from descriptions import close_button, container, text, widget
 from quorvane_velmora import ui
 from scripts import run_script

@@ -5,7 +5,8 @@ import gc
 import pytest
 
 import stage
-from callback_tools import listen, make_dialog, run_script
+from callback_tools import run_script
+from forms import listen, make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import Qt
 from PyQt6.QtWidgets import QApplication, QPushButton
@@ -97,7 +98,8 @@ def test_a_callback_that_adds_and_removes_in_a_nested_event_disturbs_neither(use
 
 def test_events_that_raise_events_end_with_the_recursion_error_of_python():
     printed = run_script('''
-from callback_tools import PatientUser, make_dialog, ui
+from callback_tools import PatientUser
+from forms import make_dialog, ui
 dialog, depth = make_dialog(), [0]
 def again(given, name, event):
     depth[0] += 1
@@ -128,7 +130,8 @@ def test_launches_that_open_launches_end_with_the_recursion_error_of_python():
     # Who presses the button has no Python in it, which would come to the limit too and give up.
     printed = run_script('''
 import sys
-from callback_tools import PatientUser, make_dialog, ui
+from callback_tools import PatientUser
+from forms import make_dialog, ui
 from PyQt6.QtCore import QTimer, Qt
 from PyQt6.QtWidgets import QApplication
 timer, user, dialog, depths = QTimer(), PatientUser(), make_dialog(), []

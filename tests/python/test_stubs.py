@@ -6,8 +6,9 @@ import sys
 
 import pytest
 from quorvane_velmora import ui
+from scripts import distribution
 
-pytestmark = pytest.mark.standalone
+pytestmark = [pytest.mark.standalone, distribution]
 
 PACKAGE = os.path.join(os.path.dirname(ui.__file__), '..', '..')
 

@@ -5,7 +5,7 @@ import runpy
 
 import pytest
 
-from callback_tools import UNKNOWN, listen, make_dialog
+from forms import UNKNOWN, listen, make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import QPoint, QRect, Qt
 from PyQt6.QtGui import QCursor, QTextDocument
