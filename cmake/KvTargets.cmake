@@ -16,9 +16,10 @@ endif()
 # kv_python: Python for libraries, which find the interpreter in the process that loads them.
 add_library(kv_python INTERFACE)
 target_link_libraries(kv_python INTERFACE Boost::python Python3::Module)
+install(TARGETS kv_python EXPORT velmora)
 
-# kv_place(NAME PLACE): gives a target its place, in the build tree and in the installed one. In both it finds the host's
-# libraries from where it stands itself.
+# kv_place(NAME PLACE [EXPORT velmora]): gives a target its place, in the build tree and in the installed one. In both it
+# finds the host's libraries from where it stands itself.
 function(kv_place name place)
   set(found $ORIGIN)
   file(RELATIVE_PATH libraries /${place} /${KV_LIBRARY_PLACE})
@@ -28,25 +29,41 @@ function(kv_place name place)
   set_target_properties(${name} PROPERTIES
     BUILD_WITH_INSTALL_RPATH ON INSTALL_RPATH "${found}"
     LIBRARY_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/${place} RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/${place})
-  install(TARGETS ${name} DESTINATION ${place})
+  install(TARGETS ${name} ${ARGN} DESTINATION ${place})
 endfunction()
 
-# kv_library(NAME SOURCES... [DEPENDS rooms...] [PUBLIC targets...] [PRIVATE targets...] [OWN_RECORD] [PLACE place]): a
-# host or sibling library, lib<NAME>.so, at KV_LIBRARY_PLACE if not told otherwise. Its folder is the include folder for
-# those that link it. It is a package by the name without KV. Its record names the libraries of DEPENDS in their order;
-# one with OWN_RECORD makes it itself.
+# kv_headers(NAME KIND FOLDER): the folder whose headers are for those that link the target. The installed tree has a copy.
+function(kv_headers name kind folder)
+  target_include_directories(${name} ${kind} $<BUILD_INTERFACE:${CMAKE_CURRENT_SOURCE_DIR}/${folder}>
+                                             $<INSTALL_INTERFACE:${KV_HEADER_PLACE}/${name}>)
+  install(DIRECTORY ${folder}/ DESTINATION ${KV_HEADER_PLACE}/${name} FILES_MATCHING PATTERN "*.h")
+endfunction()
+
+# kv_library(NAME SOURCES... [DEPENDS rooms...] [PUBLIC targets...] [PRIVATE targets...] [OWN_RECORD] [INTERNAL]
+# [PLACE place] [HEADERS folder]): a host or sibling library, lib<NAME>.so, at KV_LIBRARY_PLACE if not told otherwise. Its
+# folder, or that of HEADERS, has the headers for those that link it. It is a package by the name without KV. Its record
+# names the libraries of DEPENDS in their order; one with OWN_RECORD makes it itself. One that is INTERNAL is not for
+# programs outside the project.
 function(kv_library name)
-  cmake_parse_arguments(PARSE_ARGV 1 arg "OWN_RECORD" "PLACE" "SOURCES;DEPENDS;PUBLIC;PRIVATE")
+  cmake_parse_arguments(PARSE_ARGV 1 arg "OWN_RECORD;INTERNAL" "PLACE;HEADERS" "SOURCES;DEPENDS;PUBLIC;PRIVATE")
   add_library(${name} SHARED ${arg_SOURCES})
   target_link_libraries(${name} PUBLIC ${arg_DEPENDS} ${arg_PUBLIC} PRIVATE kv_options ${arg_PRIVATE})
-  target_include_directories(${name} PUBLIC ${CMAKE_CURRENT_SOURCE_DIR})
   if(NOT KV_SANITIZE AND NOT kv_python IN_LIST arg_PUBLIC AND NOT kv_python IN_LIST arg_PRIVATE)
     target_link_options(${name} PRIVATE -Wl,--no-undefined)
   endif()
   if(NOT arg_PLACE)
     set(arg_PLACE ${KV_LIBRARY_PLACE})
   endif()
-  kv_place(${name} ${arg_PLACE})
+  if(arg_INTERNAL)
+    target_include_directories(${name} PUBLIC ${CMAKE_CURRENT_SOURCE_DIR})
+    kv_place(${name} ${arg_PLACE})
+  else()
+    if(NOT arg_HEADERS)
+      set(arg_HEADERS .)
+    endif()
+    kv_headers(${name} PUBLIC ${arg_HEADERS})
+    kv_place(${name} ${arg_PLACE} EXPORT velmora)
+  endif()
   if(NOT arg_OWN_RECORD)
     set(record ${PROJECT_SOURCE_DIR}/host/base/packages/inPackageRecord.cpp)
     list(TRANSFORM arg_DEPENDS REPLACE "^KV" "")

@@ -19,6 +19,46 @@ with open('/proc/self/maps') as maps:
     print(*{line.split()[-1] for line in maps if '/' in line}, sep='\\n')
 '''
 
+# A program outside the project, which has a dialog of the module and hears of its errors.
+PROJECT = '''
+cmake_minimum_required(VERSION 3.25)
+project(program LANGUAGES CXX)
+set(CMAKE_CXX_STANDARD 17)
+find_package(velmora 8 REQUIRED)
+add_executable(program program.cpp)
+target_link_libraries(program PRIVATE velmora::KVpyextUi Python3::Python)
+'''
+PROGRAM = r'''
+#include <boost/python.hpp>
+
+#include "pyDialog.h"
+#include "pyUiError.h"
+
+#include <iostream>
+
+namespace bp = boost::python;
+using namespace Kv::PyextUi;
+
+int main()
+{
+    Py_Initialize();
+    bp::object const ui = bp::import("quorvane_velmora.ui");
+    std::string const xml = bp::extract<std::string>(ui.attr("makeXmlFromWidgetList")(
+        bp::eval("[('TextField', 'Name')]"), bp::list()));
+    Kv::RCShdPtr<Dialog> const dialog = Kv::makeShd<Dialog>("Title", xml, 400, 84, Dialog::Positionner(2, 1));
+    dialog->setValue("Name", bp::str("Ada"), false);
+    std::cout << bp::extract<std::string>(dialog->getValue("Name"))() << std::endl;
+    try
+    {
+        dialog->enableWidget("Nobody", true);
+    }
+    catch (UiError const& error)
+    {
+        std::cout << error.getReason() << std::endl;
+    }
+}
+'''
+
 
 @pytest.fixture(scope='module')
 def package(tmp_path_factory):
@@ -80,6 +120,17 @@ def test_a_wheel_brings_the_modules_into_an_environment_and_leaves_it(tmp_path):
                             PYTHONPATH='')
     run(environment, python, '-m', 'pip', 'uninstall', '--yes', 'quorvane-velmora', PYTHONPATH='')
     assert set(environment.rglob('*.so')) == before
+
+
+@distribution
+def test_a_program_in_another_folder_is_built_against_the_tree_and_runs(tree, tmp_path):
+    (tmp_path / 'CMakeLists.txt').write_text(PROJECT)
+    (tmp_path / 'program.cpp').write_text(PROGRAM)
+    for step in ['-S', '.', '-B', 'build', '-G', 'Ninja', '-DCMAKE_PREFIX_PATH=%s' % tree], ['--build', 'build']:
+        done = subprocess.run(['cmake', *step], cwd=tmp_path, capture_output=True, text=True)
+        assert done.returncode == 0, done.stdout + done.stderr
+    printed = run(tmp_path, tmp_path / 'build/program', PYTHONPATH=str(tree / 'lib/python3/dist-packages'))
+    assert printed == 'Ada\nCannot find widget: the specified widget does not exist.\n'
 
 
 @distribution
