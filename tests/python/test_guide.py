@@ -7,6 +7,8 @@ text says so."""
 import pathlib
 import re
 import shutil
+import subprocess
+import sys
 
 import pytest
 import scripts
@@ -68,3 +70,13 @@ def test_each_block_of_a_page_runs(page, tmp_path, monkeypatch, capsys):
         else:
             run_python(code, before, names, {'capsys': capsys})
             capsys.readouterr()
+
+
+@pytest.mark.standalone
+@scripts.distribution
+def test_the_reference_is_made_without_warnings_and_names_what_can_be_left_out(tmp_path):
+    done = subprocess.run([sys.executable, str(ROOT / 'docs/reference.py'), str(tmp_path)], capture_output=True, text=True)
+    assert done.returncode == 0, done.stdout + done.stderr
+    page = re.sub(r'<[^>]+>', '', (tmp_path / 'quorvane_velmora.ui.html').read_text())
+    assert 'showSimpleDialog(title, list, width, /, cancelButton=..., initialValues=...)' in page
+    assert 'The title of the dialog.' in page and (tmp_path / 'quorvane_velmora.testing.Person.html').exists()
