@@ -42,9 +42,14 @@ def show():
     return ui.showSimpleDialog('Publish', FORM, 400, True)
 
 
-def fail(act=show, deadline=0.2, **answer):
-    """What a test fails with whose person plans at most one answer."""
-    with pytest.raises(BaseException) as failed, testing.person(deadline) as person:
+@pytest.fixture
+def fail(tmp_path):
+    """Gives what a test fails with whose person plans at most one answer."""
+    return lambda *arguments, **keywords: fail_in(tmp_path, *arguments, **keywords)
+
+
+def fail_in(pictures, act=show, deadline=0.2, **answer):
+    with pytest.raises(BaseException) as failed, testing.person(deadline, pictures) as person:
         if answer:
             person.answer('Publish', **answer)
         act()
@@ -139,7 +144,7 @@ def cover(person):
     pytest.param({'do': cover}, '"shot" of the dialog "Publish" cannot be filled: it is covered by "veil"',
                  marks=needs_binding),
 ])
-def test_what_a_user_cannot_do_fails_at_once_and_says_what_is_there(answer, words):
+def test_what_a_user_cannot_do_fails_at_once_and_says_what_is_there(fail, answer, words):
     failure = fail(deadline=60, **answer)
     assert isinstance(failure, testing.Failure) and words in str(failure)
     picture = str(failure).splitlines()[-1].split(': ')[1]
@@ -147,14 +152,14 @@ def test_what_a_user_cannot_do_fails_at_once_and_says_what_is_there(answer, word
 
 
 @pytest.mark.parametrize('change, word', [('hideWidget', 'hidden'), ('enableWidget', 'disabled')])
-def test_widgets_that_take_no_input_are_not_touched(change, word):
+def test_widgets_that_take_no_input_are_not_touched(fail, change, word):
     dialog = make_dialog('Publish')
     getattr(dialog, change)(*['Text', False][:1 + (word == 'disabled')])
     assert 'cannot be filled: it is ' + word in str(fail(dialog.launch, values={'Text': 'x'}))
     assert dialog.getValue('Text') == 'old'
 
 
-def test_a_wrong_value_and_an_exception_of_the_test_come_out_of_the_dialog_with_their_traceback():
+def test_a_wrong_value_and_an_exception_of_the_test_come_out_of_the_dialog_with_their_traceback(fail):
     assert isinstance(fail(values={'shot': 5}), TypeError)
     raised = KeyError('mine')
 
@@ -171,7 +176,7 @@ def test_a_wrong_value_and_an_exception_of_the_test_come_out_of_the_dialog_with_
     assert names.index('show') < names.index('break_off')
 
 
-def test_a_dialog_that_nobody_answers_fails_with_what_it_shows_and_what_was_expected():
+def test_a_dialog_that_nobody_answers_fails_with_what_it_shows_and_what_was_expected(fail):
     words = str(fail())
     assert 'The dialog "Publish" is open, and nobody answers it. It shows:\nPublish\n  Shot: "" (focused)\n' in words
     assert 'Expected next: no dialog.' in words
@@ -181,7 +186,7 @@ def test_a_dialog_that_nobody_answers_fails_with_what_it_shows_and_what_was_expe
     assert words == 'Expected, and never came: "Publish", which says "Which?", to fill in "Path".'
 
 
-def test_a_script_that_catches_everything_and_asks_again_comes_to_an_end():
+def test_a_script_that_catches_everything_and_asks_again_comes_to_an_end(fail):
     def insist():
         while True:
             try:
@@ -200,7 +205,7 @@ def test_a_script_that_catches_everything_and_asks_again_comes_to_an_end():
 
 
 @needs_binding
-def test_a_dialog_that_the_script_runs_by_other_means_is_closed():
+def test_a_dialog_that_the_script_runs_by_other_means_is_closed(fail):
     def show_foreign():
         dialog = QDialog()
         dialog.setWindowTitle('Theirs')
@@ -209,7 +214,7 @@ def test_a_dialog_that_the_script_runs_by_other_means_is_closed():
     assert 'The dialog "Theirs" is open' in str(fail(show_foreign))
 
 
-def test_afterwards_all_is_as_it_was():
+def test_afterwards_all_is_as_it_was(fail):
     before = sys.excepthook, signal.getsignal(signal.SIGINT), dict(os.environ)
     with testing.person() as person:
         with pytest.raises(RuntimeError, match='Another person'):
@@ -238,7 +243,7 @@ def test_the_browser_is_answered_in_the_same_words(person, tmp_path):
 @pytest.mark.inside
 def test_a_row_that_the_browser_does_not_have_fails_with_those_that_it_has(tmp_path):
     (tmp_path / 'notes.txt').touch()
-    with pytest.raises(testing.Failure, match='Files: "notes.txt"'), testing.person(0.2) as person:
+    with pytest.raises(testing.Failure, match='Files: "notes.txt"'), testing.person(0.2, tmp_path) as person:
         person.answer('Pick', {'Files': 'missing'}, 'OK')
         ui.showBrowser('Pick', str(tmp_path))
 

@@ -279,3 +279,15 @@ def test_a_damaged_tooltip_resource_is_refused_with_words_and_changes_nothing(us
     user.plan(lambda someone: setattr(someone, 'tips', [someone.find('Text').toolTip()]), close)
     dialog.launch()
     assert user.tips == ['The text']
+
+
+def test_a_dialog_looks_the_same_to_those_who_read_from_right_to_left(person, tmp_path):
+    time = QApplication.cursorFlashTime()
+    QApplication.setCursorFlashTime(0)
+    for direction in Qt.LayoutDirection.RightToLeft, Qt.LayoutDirection.LeftToRight:
+        QApplication.setLayoutDirection(direction)
+        person.answer('Form', do=lambda person: person.picture(tmp_path / (direction.name + '.png')), press='OK')
+        make_dialog().launch()
+    QApplication.setCursorFlashTime(time)
+    one, other = (path.read_bytes() for path in tmp_path.iterdir())
+    assert one == other

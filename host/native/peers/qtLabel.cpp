@@ -140,6 +140,7 @@ void QtLabel::paintEvent(QPaintEvent* event)
         return;
     }
     QPainter painter(this);
+    painter.setLayoutDirection(layoutDirection());
     style()->drawItemText(&painter, getRoom(), static_cast<int>(alignment()) | Qt::TextExpandTabs, palette(),
                           isEnabled(), getLines().lines.join(QLatin1Char('\n')), foregroundRole());
 }

@@ -88,6 +88,8 @@ QtFloat::QtFloat(QWidget* parent, QtListenerHandle<NtFloatListener> const& handl
 {
     setProperty(ntFloatMark, true);
     setAutoFillBackground(true);
+    // Left and right are what descriptions say, whatever direction the user reads in.
+    setLayoutDirection(Qt::LeftToRight);
     QtFrontOrder::getInstance().bringToFront(*this);
 }
 

@@ -59,6 +59,8 @@ QtWindowWidget::QtWindowWidget(QtListenerHandle<NtWindowListener> const& handle)
                               { handle.tell(&NtWindowListener::onResized, width, height); }))
 {
     setAttribute(Qt::WA_QuitOnClose, false);
+    // Left and right are what descriptions say, whatever direction the user reads in.
+    setLayoutDirection(Qt::LeftToRight);
 }
 
 std::vector<QPointer<QtWindowWidget>> QtWindowWidget::findAll()
