@@ -1,5 +1,7 @@
 """How the module is imported, and everything that a script then finds in it."""
 
+import inspect
+import operator
 import os
 import re
 import shutil
@@ -277,3 +279,11 @@ def test_the_module_and_the_dialog_say_what_they_are():
         assert words in ui.Dialog.__doc__
     told = ui.Dialog.__doc__.split('registers a callable:\n')[1].split('\n\n')[0].replace('EventType.', '')
     assert ui.EventType.__doc__.endswith(told) and re.findall(r'- C\{(\w+)\}: ', told) == list(ui.EventType.names)
+
+
+@pytest.mark.parametrize('name, signature', [
+    ('showSimpleDialog', '(title, list, width, /, cancelButton=False, initialValues={})'),
+    ('showBrowser', "(title, initialPath='', pathValidationCb=None)"),
+    ('Dialog.setValue', '(self, widgetName, value, invokeCallback=True, /)'), ('Dialog.launch', '(self, /)')])
+def test_inspect_tells_what_a_function_takes(name, signature):
+    assert str(inspect.signature(operator.attrgetter(name)(ui))) == signature

@@ -125,7 +125,46 @@ PyObject* callAndExplain(PyObject* function, PyObject* arguments, PyObject* keyw
     return result;
 }
 
-/// The type of Boost.Python's functions, but for what a call does when it has failed.
+/// Makes the signature that `inspect` asks for of what the docstring says of the parameters. `names` are those that can
+/// go by name; a function that has none is a method.
+bp::object makeSignature(bp::object const& function, Names const& names)
+{
+    bp::object const inspect = bp::import("inspect");
+    bp::object const make = inspect.attr("Parameter");
+    bp::object const byPlace = make.attr("POSITIONAL_ONLY");
+    bp::list parameters;
+    if (names.empty())
+        parameters.append(make("self", byPlace));
+    bp::object const findAll = bp::import("re").attr("findall");
+    bp::list const found(findAll(R"((?s)@param (\w+):(.*?)(?=\n@|$))", bp::object(function.attr("__doc__"))));
+    for (int i = 0; i < bp::len(found); ++i)
+    {
+        std::string const name = bp::extract<std::string>(found[i][0]);
+        bool const goesByName = std::find(names.begin(), names.end(), name) != names.end();
+        bp::dict options;
+        bp::list const defaults(findAll(R"(Default(?:s to| is) (?:C\{(\w+)\}|(\S+))\.\s*$)", bp::object(found[i][1])));
+        if (bp::len(defaults) > 0)
+            options["default"] = bp::eval(bp::str("").join(defaults[0]), bp::import("builtins").attr("__dict__"));
+        bp::object const kind = goesByName ? make.attr("POSITIONAL_OR_KEYWORD") : byPlace;
+        parameters.append(make(*bp::make_tuple(name, kind), **options));
+    }
+    return inspect.attr("Signature")(parameters);
+}
+
+PyObject* getSignature(PyObject* function, void*)
+{
+    try
+    {
+        bp::object const itself(bp::handle<>(bp::borrowed(function)));
+        return bp::incref(makeSignature(itself, getParameters().at(function)).ptr());
+    }
+    catch (bp::error_already_set const&)
+    {
+        return nullptr;
+    }
+}
+
+/// The type of Boost.Python's functions, but for what a call does when it has failed, and for the signature.
 PyTypeObject* getExplainedType(PyTypeObject* base)
 {
     static PyTypeObject type{};
@@ -137,7 +176,12 @@ PyTypeObject* getExplainedType(PyTypeObject* base)
         type.tp_flags = Py_TPFLAGS_DEFAULT;
         type.tp_call = &callAndExplain;
         // Not inherited: a type has a docstring of its own, which would hide that of the function.
-        type.tp_getset = base->tp_getset;
+        static std::vector<PyGetSetDef> attributes;
+        for (PyGetSetDef const* one = base->tp_getset; one && one->name; ++one)
+            attributes.push_back(*one);
+        attributes.push_back({"__signature__", &getSignature, nullptr, nullptr, nullptr});
+        attributes.push_back({});
+        type.tp_getset = attributes.data();
         if (PyType_Ready(&type) != 0)
             bp::throw_error_already_set();
     }
@@ -150,6 +194,17 @@ void explainArguments(bp::object const& function, Names const& parameters)
 {
     Py_SET_TYPE(function.ptr(), getExplainedType(Py_TYPE(function.ptr())));
     getParameters()[function.ptr()] = parameters;
+}
+
+void explainMethods(bp::object const& type)
+{
+    bp::list const names(type.attr("__dict__").attr("keys")());
+    for (int i = 0; i < bp::len(names); ++i)
+    {
+        bp::object const method = type.attr("__dict__")[names[i]];
+        if (std::string(Py_TYPE(method.ptr())->tp_name) == "Boost.Python.function" && method.attr("__doc__"))
+            explainArguments(method, {});
+    }
 }
 
 } // namespace Kv::PyextUi

@@ -162,9 +162,7 @@ void registerDialog()
         .def("enableWidget", &Dialog::enableWidget, Docs::enableWidget)
         .def("isEnabled", &Dialog::isEnabled, Docs::isEnabled)
         .def("disableNextClose", &Dialog::disableNextClose, Docs::disableNextClose);
-    // The parameters that can be left out are those that one would name.
-    for (char const* const name : {"setValue", "setValues"})
-        explainArguments(dialog.attr(name), {});
+    explainMethods(dialog);
 }
 
 void registerCursorGuard()
