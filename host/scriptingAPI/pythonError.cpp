@@ -1,5 +1,9 @@
 #include "pythonError.h"
 
+#include <algorithm>
+#include <unordered_set>
+#include <vector>
+
 namespace Kv
 {
 
@@ -10,18 +14,30 @@ using boost::python::allow_null;
 using boost::python::handle;
 using boost::python::incref;
 
-handle<> contextOf(PyObject* exception)
+/// An exception, what it came from, and so on. A script can make a ring of that: it ends where it would begin anew.
+class Chain
 {
-    return handle<>(allow_null(PyException_GetContext(exception)));
-}
+public:
+    explicit Chain(handle<> const& exception)
+    {
+        for (handle<> next = exception; next && _known.insert(next.get()).second;
+             next = handle<>(allow_null(PyException_GetContext(next.get()))))
+            _exceptions.push_back(next);
+    }
 
-bool isInContextOf(PyObject* exception, PyObject* other)
-{
-    for (handle<> next(boost::python::borrowed(other)); next; next = contextOf(next.get()))
-        if (next.get() == exception)
-            return true;
-    return false;
-}
+    bool contains(handle<> const& exception) const { return _known.count(exception.get()) > 0; }
+
+    /// The last that the other chain does not have.
+    handle<> findLastBeside(Chain const& other) const
+    {
+        return *std::find_if(_exceptions.rbegin(), _exceptions.rend(),
+                             [&other](handle<> const& exception) { return !other.contains(exception); });
+    }
+
+private:
+    std::vector<handle<>> _exceptions;
+    std::unordered_set<PyObject*> _known;
+};
 
 } // namespace
 
@@ -58,16 +74,12 @@ void PythonError::restore() const
 
 bool PythonError::addContext(PythonError const& later) const
 {
-    if (isInContextOf(_exception.get(), later._exception.get()))
+    Chain const ours(_exception);
+    Chain const theirs(later._exception);
+    if (ours.contains(later._exception) || theirs.contains(_exception))
         return false;
-    handle<> last = _exception;
-    for (handle<> next = last; next; next = contextOf(last.get()))
-    {
-        if (next.get() == later._exception.get())
-            return false;
-        last = next;
-    }
-    PyException_SetContext(last.get(), incref(later._exception.get()));
+    // What both came from stays behind the later one.
+    PyException_SetContext(ours.findLastBeside(theirs).get(), incref(later._exception.get()));
     return true;
 }
 

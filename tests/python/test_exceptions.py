@@ -213,6 +213,34 @@ def test_a_second_exception_before_the_first_has_left_is_the_last_of_its_context
     assert [functions(error)[-1] for error in (first, second, third)] == ['earlier', 'earlier', 'later']
 
 
+@pytest.mark.parametrize('has_ring', [False, True])
+def test_exceptions_that_came_from_one_another_make_no_ring(user, has_ring):
+    """The dialog runs while another exception is handled: that is the context of each."""
+    dialog = make_dialog()
+    waiting = [ValueError('first'), KeyError('second'), Own('third')]
+    first, second, third = waiting
+    handled = OSError('handled')
+    if has_ring:
+        handled.__context__ = RuntimeError('ring')
+        handled.__context__.__context__ = handled
+
+    def fail(*_):
+        raise waiting.pop(0)
+
+    dialog.addCallback('Other', ACTIVATE, fail)
+    dialog.addCallback('Button', ACTIVATE, lambda *_: (press('Other'), press('Other'), press('Other')))
+    user.plan(click('Button'))
+    try:
+        raise handled
+    except OSError:
+        with pytest.raises(ValueError):
+            dialog.launch()
+    chain = [first]
+    while len(chain) < 4:
+        chain.append(chain[-1].__context__)
+    assert chain == [first, second, third, handled]
+
+
 def test_a_second_exception_that_cannot_be_its_context_is_reported(user, monkeypatch):
     unraisable = listen_to_reports(monkeypatch)
     dialog = make_dialog()
