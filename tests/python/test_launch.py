@@ -12,6 +12,7 @@ from forms import make_dialog
 from descriptions import close_button, container, text, widget
 from quorvane_velmora import ui
 from scripts import run_script
+from PyQt6 import sip
 from PyQt6.QtCore import QRect, Qt
 from PyQt6.QtGui import QFontMetrics, QGuiApplication, QTextLayout
 from PyQt6.QtTest import QTest
@@ -418,6 +419,30 @@ def test_a_form_taller_than_the_screen_can_be_scrolled_to_its_buttons(user):
     user.plan(reach, resize, reach_by_key)
     values = ui.showSimpleDialog('t', [('TextField', 'row %d' % row, 'row') for row in range(100)], 300)
     assert values['CloseButtonClicked'] == 'CloseButton_OK' and len(values) == 101
+
+
+def test_a_run_ends_when_others_delete_what_runs(user):
+    dialog = make('OK')
+    user.plan(lambda user: sip.delete(user.window()))
+    assert dialog.launch() == '' and dialog.getValue('Show') == ''
+    user.plan(lambda user: user.close())
+    assert ui.showMessageBox('after', ['it']) == 'OK'
+
+
+def test_a_thread_gets_no_user_interface_of_its_own():
+    printed = run_script('''
+import threading
+from quorvane_velmora import ui
+def show():
+    try:
+        ui.showMessageBox('t', ['x'])
+    except RuntimeError as refusal:
+        print(refusal)
+thread = threading.Thread(target=show)
+thread.start()
+thread.join()
+''', QT_QPA_PLATFORM='offscreen')
+    assert 'this is not the main thread' in printed or 'belongs to the thread that used it first' in printed
 
 
 def in_another_thread(action):

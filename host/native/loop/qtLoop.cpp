@@ -68,6 +68,11 @@ void QtLoop::end()
     endIfDone();
 }
 
+void QtLoop::endWith(QObject const& object)
+{
+    QObject::connect(&object, &QObject::destroyed, &_loop, [this] { end(); });
+}
+
 void QtLoop::endIfDone()
 {
     if (*_until)

@@ -30,6 +30,9 @@ public:
     /// Sets the end flag, which ends the loop.
     void end();
 
+    /// Ends the loop when the object is destroyed, by whomever.
+    void endWith(QObject const& object);
+
     /// Ends the loop if its flag says so.
     void endIfDone();
 

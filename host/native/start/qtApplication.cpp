@@ -10,6 +10,7 @@
 
 #include <array>
 #include <clocale>
+#include <unistd.h>
 
 namespace Kv
 {
@@ -99,6 +100,12 @@ void QtApplication::start()
 {
     if (_tried || QCoreApplication::instance())
         return;
+    // Qt's objects would outlive a thread that ends before the process, and end that.
+    if (gettid() != getpid())
+    {
+        _refusal = "this is not the main thread, and there is no QApplication; launch dialogs from the main thread";
+        return;
+    }
     _tried = true;
     QtDisplayProbe probe;
     DisplayChoice choice = probe.choose();

@@ -7,6 +7,8 @@
 #include "start/qtTextEstimate.h"
 #include "windows/qtAdoptedContainer.h"
 #include "windows/qtContentArea.h"
+#include "windows/qtFloat.h"
+#include "windows/qtFrontOrder.h"
 #include "windows/qtMainWindow.h"
 #include "windows/qtWindow.h"
 
@@ -175,13 +177,21 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     _application.requireLoop();
     if (_closed)
         refuseLoop();
-    QPointer<QWidget> const window = QApplication::activeModalWidget();
-    std::exception_ptr const error = QtLoop(until, end).run();
+    QPointer<QtWindowWidget> const window = dynamic_cast<QtWindowWidget*>(QApplication::activeModalWidget());
+    QWidget const* const stage = window ? window.data() : static_cast<QWidget*>(QtFrontOrder::getInstance().getFront());
+    std::exception_ptr error;
+    {
+        QtLoop loop(until, end);
+        // Where somebody destroys what runs, nobody could end it any more.
+        if (stage)
+            loop.endWith(*stage);
+        error = loop.run();
+    }
     QtDisposal::destroyWaiting();
     if (!error)
         return;
-    if (auto* const left = dynamic_cast<QtWindowWidget*>(window.data()))
-        left->stopWaiting();
+    if (window)
+        window->stopWaiting();
     QtGuard::getInstance().getScriptHook().rethrow(error);
 }
 

@@ -42,6 +42,13 @@ void QtFrontOrder::bringToFront(QtFloat& floating)
     cutHoles();
 }
 
+QtFloat* QtFrontOrder::getFront() const
+{
+    auto const front = std::find_if(_places.rbegin(), _places.rend(),
+                                    [](Place const& place) { return place.floating && place.widget; });
+    return front == _places.rend() ? nullptr : front->floating;
+}
+
 void QtFrontOrder::remove(QtFloat& floating)
 {
     forget(floating);

@@ -25,6 +25,9 @@ public:
     /// A widget of the window's own, in no float, has got the keyboard: it stands before all floats for now.
     void rememberKeyboard(QWidget& widget);
 
+    /// The float that came to the front last; null if there is none.
+    QtFloat* getFront() const;
+
     /// A float has been moved, shown or hidden.
     void cutHoles() const;
 
