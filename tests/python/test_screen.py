@@ -33,6 +33,20 @@ print(sorted(values.items()))
     assert script.returncode == 0 and not desk.run('search', '--onlyvisible', '--name', 'Awards')
 
 
+def test_a_run_ends_when_others_destroy_its_window_and_the_next_dialog_opens(desk):
+    script = start(desk, '''
+from quorvane_velmora import ui
+dialog = ui.createDialog('Lost', ui.makeXmlFromWidgetList([('TextField', 'a', '', 'kept')]), 300, 84)
+print(repr(dialog.launch()), dialog.getValue('a'))
+print(ui.showMessageBox('Next', ['It opens.']))
+''')
+    desk.run('windowclose', desk.wait_for_window('Lost'))
+    assert script.stdout.readline() == "'' kept\n"
+    desk.wait_for_window('Next')
+    desk.run('key', 'Return')
+    assert script.communicate()[0] == 'OK\n' and script.returncode == 0
+
+
 def test_a_dialog_gets_the_keys_each_time_it_opens_and_again_after_a_box_above_it(desk):
     script = start(desk, '''
 from quorvane_velmora import ui

@@ -4,6 +4,7 @@
 #include "loop/qtInputDrop.h"
 #include "peers/qtText.h"
 #include "windows/qtFocusOrder.h"
+#include "windows/qtLostWindows.h"
 #include "windows/qtWindowIcon.h"
 
 #include <QApplication>
@@ -42,6 +43,7 @@ void goWithApplication()
         return;
     watched = QCoreApplication::instance();
     qAddPostRoutine(&QtWindow::destroyLeft);
+    QtLostWindows::watch();
 }
 
 /// False where windows never cover each other, and Qt complains when they are asked to.
