@@ -11,17 +11,20 @@ import pytest
 import scripts
 from desk import Desk
 
-# There is PyQt6 for the distribution's interpreter. Tests that need it are not run for others.
-try:
-    import stage
-    from callback_tools import PatientUser
-    from user import User
-except ModuleNotFoundError:
-    stage = None
+# There is PyQt6 for the distribution's interpreter alone. For others the user is one of the module's own.
+if not scripts.HAS_PYQT:
+    import absent
+    from door_user import DoorUser
+
+    absent.install()
+
+import stage
+from callback_tools import PatientUser
+from user import User
 
 
 def pytest_configure(config):
-    if stage and stage.APPLICATION:
+    if scripts.HAS_PYQT and stage.APPLICATION:
         stage.APPLICATION.resize(1180, 860)  # with room for the dialogs of the tests
     config.addinivalue_line('markers', 'standalone: about dialogs that have windows of their own')
     config.addinivalue_line('markers', 'inside: about the running application')
@@ -38,14 +41,14 @@ def pytest_collection_modifyitems(config, items):
 
 @pytest.fixture
 def user():
-    someone = User()
+    someone = User() if scripts.HAS_PYQT else DoorUser()
     yield someone
     someone.judge()
 
 
 @pytest.fixture
 def patient():
-    someone = PatientUser()
+    someone = PatientUser() if scripts.HAS_PYQT else DoorUser()
     yield someone
     someone.judge()
 

@@ -9,11 +9,22 @@ import tempfile
 import pytest
 from quorvane_velmora import ui
 
+
+def has_pyqt():
+    try:
+        import PyQt6.QtWidgets  # noqa: F401
+    except ImportError:
+        return False
+    return True
+
+
 PROGRAM = os.readlink('/proc/self/exe')
 INSIDE = os.path.basename(PROGRAM) == 'velmora'
 # The tree that the tests run in: the build's, with `bin` and `lib`.
 TREE = pathlib.Path(ui.__file__).parents[5]
 HERE = os.path.dirname(os.path.abspath(__file__))
+HAS_PYQT = has_pyqt()
+needs_pyqt = pytest.mark.skipif(not HAS_PYQT, reason='needs PyQt6')
 # The Debian package and the type checker are for its interpreter.
 distribution = pytest.mark.skipif(os.path.realpath(sys.executable) != os.path.realpath('/usr/bin/python3'),
                                   reason='for the interpreter of the distribution')
@@ -40,5 +51,7 @@ def run_script(text, *arguments, **changes):
         command = [PROGRAM, '--exit', file.name] if INSIDE else [sys.executable, '-c', text]
         done = subprocess.run([*command, *arguments], env=environment(**changes), capture_output=True, text=True,
                               timeout=300)
+    if not HAS_PYQT and "No module named 'PyQt6" in done.stderr:
+        pytest.skip('needs PyQt6')
     assert done.returncode == 0, 'status %d\n%s%s' % (done.returncode, done.stdout, done.stderr)
     return done.stdout

@@ -1,12 +1,19 @@
 """Where dialogs stand: each in a window of its own, or floating in the application."""
 
+import scripts
+from PyQt6 import QtWidgets
 from PyQt6.QtWidgets import QApplication, QLabel, QWidget
 
-# The application's window; None in an interpreter on its own.
-APPLICATION = next((window for window in QApplication.topLevelWidgets() if window.objectName() == 'Velmora'), None)
+# The application's window; None in an interpreter on its own. Without PyQt6 nobody can ask it anything.
+if not scripts.INSIDE:
+    APPLICATION = None
+elif scripts.HAS_PYQT:
+    APPLICATION = next(window for window in QApplication.topLevelWidgets() if window.objectName() == 'Velmora')
+else:
+    APPLICATION = QtWidgets.QMainWindow
 
 # What a dialog has above its content, in pixels.
-TITLE_HEIGHT = 25 if APPLICATION else 24
+TITLE_HEIGHT = 25 if scripts.INSIDE else 24
 
 
 # The names that floating containers go by.

@@ -10,9 +10,9 @@ import zipfile
 import pytest
 
 from quorvane_velmora import ui
-from scripts import TREE, environment
+from scripts import TREE, environment, needs_pyqt
 
-pytestmark = pytest.mark.standalone
+pytestmark = [pytest.mark.standalone, needs_pyqt]
 
 PROGRAM = str(TREE / 'bin' / 'velmora')
 PACKAGES = {'base', 'resmgt', 'pluginAPI', 'internalAPI', 'framework', 'gfx', 'ui', 'appUi', 'scriptingAPI',

@@ -5,10 +5,11 @@ import sys
 import textwrap
 
 import pytest
+from scripts import needs_pyqt
 
 from test_application import COMPOSITION, PROGRAM, WATCHING, run, run_inside, write
 
-pytestmark = pytest.mark.standalone
+pytestmark = [pytest.mark.standalone, needs_pyqt]
 
 TOOLS = '''
 import sys, time, stage, watching

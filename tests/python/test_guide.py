@@ -14,11 +14,6 @@ import pytest
 import scripts
 from quorvane_velmora import graph, testing, ui
 
-try:
-    import stage
-except ModuleNotFoundError:  # there is no PyQt6
-    stage = None
-
 ROOT = pathlib.Path(__file__).parents[2]
 PAGES = [ROOT / 'README.md', *sorted((ROOT / 'docs').glob('*.md'))]
 BLOCK = re.compile(r'(?:<!-- ((?:(?!-->).)*) -->\n)?```(python|xml)\n(.*?)```(?:\n\nSave it as `([^`]+)`)?', re.DOTALL)
@@ -58,7 +53,7 @@ def test_each_block_of_a_page_runs(page, tmp_path, monkeypatch, capsys):
     for before, language, code, file in BLOCK.findall(page.read_text()):
         if file:
             pathlib.Path(file).write_text(code)
-        if 'PyQt6' in code and not stage:
+        if 'PyQt6' in code and not scripts.HAS_PYQT:
             continue
         before = before or None
         if before and before.startswith('inside'):

@@ -13,7 +13,7 @@ import pytest
 import scripts
 from callback_tools import SAME_SCREEN
 
-pytestmark = [pytest.mark.standalone, pytest.mark.screen]
+pytestmark = [pytest.mark.standalone, pytest.mark.screen, scripts.needs_pyqt]
 
 PRELUDE = '''
 import gc, time

@@ -7,16 +7,10 @@ import sys
 
 import pytest
 import scripts
+import stage
 from forms import listen, make_dialog
 from quorvane_velmora import testing, ui
-
-try:
-    import stage
-    from PyQt6.QtWidgets import QDialog, QWidget
-except ModuleNotFoundError:
-    stage = None
-
-needs_binding = pytest.mark.skipif(not stage, reason='needs PyQt6')
+from PyQt6.QtWidgets import QDialog, QWidget
 
 pytestmark = pytest.mark.screen
 
@@ -142,7 +136,7 @@ def cover(person):
     ({'values': {'step': (['a'], 0)}}, 'has other entries: "comp", "grade", "paint"'),
     ({'press': 'Okay'}, 'no button "Okay". There are: "more" (more), "CloseButton_OK" (OK)'),
     pytest.param({'do': cover}, '"shot" of the dialog "Publish" cannot be filled: it is covered by "veil"',
-                 marks=needs_binding),
+                 marks=scripts.needs_pyqt),
 ])
 def test_what_a_user_cannot_do_fails_at_once_and_says_what_is_there(fail, answer, words):
     failure = fail(deadline=60, **answer)
@@ -204,7 +198,7 @@ def test_a_script_that_catches_everything_and_asks_again_comes_to_an_end(fail):
         assert 'nobody answers' in str(fail(act))
 
 
-@needs_binding
+@scripts.needs_pyqt
 def test_a_dialog_that_the_script_runs_by_other_means_is_closed(fail):
     def show_foreign():
         dialog = QDialog()
