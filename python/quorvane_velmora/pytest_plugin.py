@@ -24,4 +24,5 @@ def person(request, tmp_path):
             pytest.fail(str(failure), pytrace=False)
 
     request.node.obj = answered
-    return someone
+    yield someone
+    request.node.obj = test

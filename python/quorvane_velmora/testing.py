@@ -68,6 +68,8 @@ class Person:
         finally:
             if asked is None:
                 del os.environ[_PLATFORM]
+            else:
+                os.environ[_PLATFORM] = asked
         return self
 
     def __exit__(self, kind, error, traceback):

@@ -429,6 +429,29 @@ def test_a_run_ends_when_others_delete_what_runs(user):
     assert ui.showMessageBox('after', ['it']) == 'OK'
 
 
+def test_a_second_interpreter_of_the_process_is_refused_with_words():
+    printed = run_script('''
+from quorvane_velmora import ui
+ui.makeXmlFromWidgetList([('PushButton', 'b')])
+try:
+    import _xxsubinterpreters as interpreters
+except ImportError:
+    import _interpreters as interpreters
+other = interpreters.create()
+interpreters.run_string(other, """
+try:
+    from quorvane_velmora import ui
+    ui.showMessageBox('t', ['x'])
+except Exception as refusal:
+    print(type(refusal).__name__, refusal)
+""")
+print('alive')
+''', QT_QPA_PLATFORM='offscreen')
+    refusal, alive = printed.splitlines()
+    assert 'main interpreter' in refusal or 'does not support' in refusal, refusal
+    assert alive == 'alive'
+
+
 def test_a_thread_gets_no_user_interface_of_its_own():
     printed = run_script('''
 import threading

@@ -47,6 +47,13 @@ GeRectangle<int> makeFrame(int x, int y, int width, int height)
     return {x, x + width, y, y + height};
 }
 
+/// The loop takes the lock of the main interpreter, and would wait for it for ever inside another one.
+void requireMainInterpreter()
+{
+    if (PyThreadState_Get()->interp != PyInterpreterState_Main())
+        throw UiError(__FILE__, __LINE__, "Cannot run dialog: only the main interpreter of the process can.");
+}
+
 /// The face for events of a widget that raises any; null for every other.
 RCShdPtr<PiWidget> findEventFace(RCShdPtr<UiWidget> const& widget)
 {
@@ -172,6 +179,7 @@ void Dialog::onTitleBarRelease(EvEvent& event)
 
 std::string Dialog::launch()
 {
+    requireMainInterpreter();
     clearCloseCallbacks();
     setupCloseCallbacks();
     std::unique_ptr<UiAppDisabler> disabler;

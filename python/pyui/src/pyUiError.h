@@ -56,8 +56,8 @@ void forEachEntry(boost::python::object const& list, int count, char const* list
 }
 
 /// Lets a function of Boost.Python say in a note why it refuses the arguments by name that it was given, and tell its
-/// signature, as its docstring has it. `parameters` are the names of its parameters in order, empty for those that go by
-/// place. Without any, all go by place, behind the object that it is a method of.
+/// signature, as its docstring has it. `parameters` are the names of its parameters in order, empty for those that go
+/// by place. Without any, all go by place, behind the object that it is a method of.
 void explainArguments(boost::python::object const& function, std::vector<std::string> const& parameters);
 
 /// The same for all methods of a class that have a docstring.
