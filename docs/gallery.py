@@ -14,6 +14,8 @@ import sys
 ROOT = pathlib.Path(__file__).parents[1]
 EXAMPLES = ROOT / 'examples'
 TARGET = ROOT / 'build' / 'gallery'
+# Its path is seen in some pictures.
+SHOTS = pathlib.Path('/tmp/velmora-shots')
 
 # The looks, with what chooses them: environment variables, and what is done to the QApplication before a dialog comes.
 LOOKS = {
@@ -95,34 +97,33 @@ def take(look, isFloating):
     tests = (EXAMPLES / 'test_examples.py').read_text()
     common = tests[:tests.index('def isInside')].replace('Path(__file__).parent', 'Path(%r)' % str(EXAMPLES))
     extra.write_text(common + SCRIPTS)
-    program = [str(pathlib.Path(os.environ['VELMORA_PROGRAM'])), '--exit'] if isFloating else [sys.executable]
+    program = [os.environ['VELMORA_PROGRAM'], '--exit'] if isFloating else [sys.executable]
     environment = {**os.environ, **LOOKS[look][0], 'VELMORA_PICTURES': str(folder), 'GALLERY_LOOK': look,
                    'QT_QPA_PLATFORM': 'offscreen', 'XDG_CONFIG_HOME': str(folder),
                    'PYTHONPATH': os.pathsep.join([str(ROOT / 'docs'), os.environ.get('PYTHONPATH', '')])}
-    done = subprocess.run([*program, '-m', 'pytest', '-q', '-p', 'gallery', '-p', 'no:cacheprovider', '--basetemp=/tmp/shots',
+    done = subprocess.run([*program, '-m', 'pytest', '-q', '-p', 'gallery', '-p', 'no:cacheprovider', '--basetemp=%s' % SHOTS,
                            str(EXAMPLES / 'test_examples.py'), str(extra)], env=environment, capture_output=True, text=True)
     if done.returncode:
-        print('%s:\n%s' % (folder.name, done.stdout), file=sys.stderr)
+        sys.exit('%s:\n%s' % (folder.name, done.stdout))
     return folder
 
 
 def take_application(images):
     """Pictures of the application with the tour in it, and of the browser, in a folder as a shot has it."""
-    shots = pathlib.Path('/tmp/shots')
-    shutil.rmtree(shots, ignore_errors=True)
-    shutil.copytree(EXAMPLES / 'compositions', shots)
+    shutil.rmtree(SHOTS, ignore_errors=True)
+    shutil.copytree(EXAMPLES / 'compositions', SHOTS)
     for folder in 'mattes', 'plates', 'renders':
-        (shots / folder).mkdir()
+        (SHOTS / folder).mkdir()
     for frame in range(1, 49):
-        (shots / ('preview.%04d.jpg' % frame)).write_bytes(bytes(350000))
-    (shots / 'notes.txt').write_text('Notes\n')
+        (SHOTS / ('preview.%04d.jpg' % frame)).write_bytes(bytes(350000))
+    (SHOTS / 'notes.txt').write_text('Notes\n')
     # The application shows the name of the script that runs.
     script = TARGET / 'tour.py'
     script.write_text(APPLICATION)
     compositions = [option for name in ('shot_020', 'shot_010') for option in ('--open', name + '.vmcomposition')]
-    subprocess.run([os.environ['VELMORA_PROGRAM'], *compositions, '--exit', script, EXAMPLES / 'tour.py', images], cwd=shots,
+    subprocess.run([os.environ['VELMORA_PROGRAM'], *compositions, '--exit', script, EXAMPLES / 'tour.py', images], cwd=SHOTS,
                    env={**os.environ, 'QT_QPA_PLATFORM': 'offscreen', 'XDG_CONFIG_HOME': str(TARGET)}, check=True)
-    shutil.rmtree(shots)
+    shutil.rmtree(SHOTS)
 
 
 def paint(folders):
@@ -160,8 +161,7 @@ def main(arguments):
             if path.stem != 'scripts':
                 shutil.copy(path, images)
         take_application(images)
-    return 0
 
 
 if __name__ == '__main__':
-    sys.exit(main(sys.argv[1:]))
+    main(sys.argv[1:])
