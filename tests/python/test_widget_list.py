@@ -157,6 +157,13 @@ def test_a_push_button_shows_its_name_in_a_width_measured_from_it():
         'A rather long name']
 
 
+@pytest.mark.parametrize('part', ['Wide ', 'iii ', '\u6f22', 'a\u0301'])
+def test_a_line_far_wider_than_any_screen_has_at_least_the_room_that_it_needs(part):
+    name = part * (20004 // len(part))
+    width = places(make([('PushButton', name)]), name)[2].split()[0]
+    assert 7 * int(width) >= QFontMetrics(QApplication.font()).horizontalAdvance(name)
+
+
 class Undecided:
     def __bool__(self):
         raise ArithmeticError('undecided')
