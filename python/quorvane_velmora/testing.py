@@ -319,7 +319,8 @@ def _fill_menu(key, place, widget, value):
     if not 0 <= value < len(entries):
         raise Failure('The menu "%s" has no entry %d. There are %d.' % (key, value, len(entries)))
     _reach(key, place, 'filled')
-    if widget.text != entries[value] or entries.count(widget.text) > 1:
+    # An empty text can also be that of no selection, and one that is there twice that of the other entry.
+    if not widget.text or widget.text != entries[value] or entries.count(widget.text) > 1:
         _door.pick(place, value, False)
 
 
