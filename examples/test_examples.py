@@ -81,7 +81,7 @@ def test_rename(person, run, look, tmp_path):
     person.answer('Rename', says='More than one file would be called v2.', press='OK')
     person.answer('Rename', {'Find': '_v1', 'Letters': 'Lower'}, 'Rename', do=look)
     run('rename.py', tmp_path)
-    assert sorted(os.listdir(tmp_path)) == ['mask' + 'v2.exr', 'notes.txt', 'platev2.exr', 'v1', 'v2']
+    assert sorted(os.listdir(tmp_path)) == ['maskv2.exr', 'notes.txt', 'platev2.exr', 'v1', 'v2']
 
 
 def test_rename_without_a_change(person, run, tmp_path):

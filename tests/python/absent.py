@@ -37,8 +37,6 @@ class Absent(types.ModuleType):
 
 
 def install():
-    for name in 'PyQt6', 'PyQt6.sip', 'PyQt6.QtCore', 'PyQt6.QtGui', 'PyQt6.QtTest', 'PyQt6.QtWidgets':
-        sys.modules[name] = Absent(name)
-    for name in list(sys.modules):
-        if name.startswith('PyQt6.'):
-            setattr(sys.modules['PyQt6'], name.split('.')[1], sys.modules[name])
+    package = sys.modules['PyQt6'] = Absent('PyQt6')
+    for name in 'sip', 'QtCore', 'QtGui', 'QtTest', 'QtWidgets':
+        sys.modules['PyQt6.' + name] = getattr(package, name)

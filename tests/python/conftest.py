@@ -14,9 +14,9 @@ from desk import Desk
 # There is PyQt6 for the distribution's interpreter alone. For others the user is one of the module's own.
 if not scripts.HAS_PYQT:
     import absent
-    from door_user import DoorUser
 
     absent.install()
+    from door_user import DoorUser
 
 import stage
 from callback_tools import PatientUser

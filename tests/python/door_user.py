@@ -5,6 +5,7 @@ import traceback
 import pytest
 
 from absent import skip
+from user import User
 from quorvane_velmora.libs import libKVpyextTesting as door
 
 
@@ -44,17 +45,15 @@ class Seen:
         skip()
 
 
-class DoorUser:
+class DoorUser(User):
     """Steps run one after the other, each once a dialog of ours takes input and nothing else is under way."""
 
     PATIENCE = 5000  # turns of the door
 
     def __init__(self):
-        self.failures = []
-        self._steps = []
+        super().__init__()
         self._isOpen = False
         skip.isDone = False
-        self._idle = 0
 
     def plan(self, *steps):
         self._steps.extend(steps)
@@ -66,14 +65,9 @@ class DoorUser:
         if self._isOpen:
             door.close()
             self._isOpen = False
-        if self._steps and not skip.isDone:
-            self.failures.append('%d steps were never reached' % len(self._steps))
+        if skip.isDone:
             self._steps.clear()
-
-    def judge(self):
-        self.stop()
-        if self.failures:
-            pytest.fail('\n'.join(self.failures), pytrace=False)
+        super().stop()
 
     def _turn(self):
         if door.getTitle() is None:
@@ -105,12 +99,6 @@ class DoorUser:
             door.click(seen._place)
         elif obstacle not in ('is hidden', 'is disabled'):
             skip('needs PyQt6: the widget ' + obstacle)
-
-    def close(self, label='OK'):
-        self.click('CloseButton_' + label)
-
-    def ask_to_close(self):
-        skip()
 
     def dismiss(self):
         """Ends any dialog by one of its buttons."""
