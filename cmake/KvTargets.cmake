@@ -12,6 +12,9 @@ if(KV_SANITIZE)
                                               -fno-sanitize-recover=undefined -fno-omit-frame-pointer)
   target_link_options(kv_options INTERFACE -fsanitize=address,undefined)
 endif()
+if(KV_FUZZ)
+  target_compile_options(kv_options INTERFACE -fsanitize=fuzzer-no-link -fno-sanitize=function -Wno-return-type-c-linkage)
+endif()
 
 # kv_python: Python for libraries, which find the interpreter in the process that loads them.
 add_library(kv_python INTERFACE)
