@@ -13,8 +13,10 @@
 #include <QMessageBox>
 
 #include <algorithm>
+#include <cstdlib>
 #include <filesystem>
 #include <sstream>
+#include <unistd.h>
 #include <utility>
 
 namespace Velmora
@@ -92,7 +94,7 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
     _signalTimer.start(signalInterval);
     if (hasScreen())
         _watch.emplace([this] { return _scriptRuns || _interpreter.isRunning(); }, [this] { stopScript(); });
-    int const status = QApplication::exec();
+    int const status = Kv::WsNative::getPlatform().runApplication(nullptr);
     _watch.reset();
     _signalTimer.stop();
     _window.saveLook(_settings);
@@ -178,7 +180,11 @@ int Application::runScript(ScriptCall const& script)
     _window.tell(QObject::tr("%1 is running").arg(name));
     _window.note(QObject::tr("%1 is running").arg(name));
     _window.paintNow();
+    pid_t const self = getpid();
     int const status = _interpreter.run(script);
+    // The window and all else is the other one's.
+    if (getpid() != self)
+        std::exit(status); // NOLINT(concurrency-mt-unsafe): a forked process has one thread
     _scriptRuns = false;
     checkSignals();
     _window.setRunning(false);

@@ -26,6 +26,12 @@ public:
         PyGILState_Release(state);
     }
 
+    int getDepth() noexcept override
+    {
+        PyThreadState const* const state = PyGILState_GetThisThreadState();
+        return state ? state->gilstate_counter : 0;
+    }
+
     std::exception_ptr capture() noexcept override
     {
         try

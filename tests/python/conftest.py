@@ -71,8 +71,8 @@ def no_wait_is_endless():
 
 
 @pytest.fixture
-def screen():
-    """The name of an X display that nobody else uses, without a window manager."""
+def display_server():
+    """An X server that nobody else uses, without a window manager; C{display} is its name."""
     reading, writing = os.pipe()
     # Without the last option it starts anew, deaf for a moment, each time that its only client goes.
     server = subprocess.Popen(['Xvfb', '-displayfd', str(writing), '-screen', '0', '1280x1024x24', '-noreset'],
@@ -80,9 +80,15 @@ def screen():
     os.close(writing)
     with os.fdopen(reading) as answer:
         number = answer.readline().strip()
-    yield ':' + number
-    server.terminate()
+    server.display = ':' + number
+    yield server
+    server.kill()
     server.wait()
+
+
+@pytest.fixture
+def screen(display_server):
+    return display_server.display
 
 
 @pytest.fixture

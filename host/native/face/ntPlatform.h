@@ -32,6 +32,10 @@ public:
     virtual void enter() = 0;
     virtual void leave() noexcept = 0;
 
+    /// The number of times that this thread has entered the interpreter from outside, and not left it yet. Whoever
+    /// enters it counts: between two moments with the same number there is nothing of the interpreter on the stack.
+    virtual int getDepth() noexcept = 0;
+
     /// To be called while an exception is handled: that exception, for `rethrow`, with the interpreter's own error
     /// taken off the interpreter, so that scripts can run in between.
     virtual std::exception_ptr capture() noexcept = 0;
@@ -110,6 +114,11 @@ public:
     /// Dispatches events until `*until` is true, however it came to be. What a handler throws ends the loop and is
     /// thrown on from here. When the application is asked to quit, `*end` is set to true. Loops nest.
     virtual void runLoop(bool const volatile* until, bool volatile* end) = 0;
+
+    /// Runs the application to its end, and gives its exit status. `lastAct`, which throws nothing and can be null, is
+    /// called as soon as the display is gone; then an `ExBase` comes out of here and of the loops of this platform.
+    /// Where a loop of somebody else's runs in them, the process ends.
+    virtual int runApplication(std::function<void()> lastAct) = 0;
 
     /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.
     virtual void endLoop() = 0;

@@ -1,5 +1,7 @@
 #include "loop/qtDisposal.h"
 
+#include "start/qtApplication.h"
+
 #include <QCoreApplication>
 #include <QPointer>
 #include <QThread>
@@ -35,7 +37,7 @@ void QtDisposal::destroy(QWidget* widget)
 {
     QtErrorAside const aside;
     // Without its application a widget can no longer be touched.
-    if (!widget || !QCoreApplication::instance())
+    if (!widget || !QtApplication::isThere())
         return;
     if (widget->thread() != QThread::currentThread())
     {
@@ -54,7 +56,7 @@ void QtDisposal::destroy(QWidget* widget)
 
 void QtDisposal::destroyWaiting()
 {
-    if (!QtGuard::getInstance().isIdle() || !QCoreApplication::instance())
+    if (!QtGuard::getInstance().isIdle() || !QtApplication::isThere())
         return;
     for (QPointer<QWidget> const& widget : std::exchange(getWaiting(), {}))
         if (widget)

@@ -1,6 +1,7 @@
 #include "loop/qtGuard.h"
 
 #include "loop/qtLoop.h"
+#include "loop/qtWayOut.h"
 
 #include <QThread>
 
@@ -17,8 +18,9 @@ namespace
 class NoScriptHook : public NtScriptHook
 {
 public:
-    void enter() override {}
-    void leave() noexcept override {}
+    void enter() override { ++_depth; }
+    void leave() noexcept override { --_depth; }
+    int getDepth() noexcept override { return _depth; }
     std::exception_ptr capture() noexcept override { return std::current_exception(); }
     [[noreturn]] void rethrow(std::exception_ptr const& error) override { std::rethrow_exception(error); }
     std::exception_ptr takeError() noexcept override { return nullptr; }
@@ -42,6 +44,9 @@ public:
             (void)std::fputs("A handler threw what is no exception\n", stderr);
         }
     }
+
+private:
+    int _depth = 0;
 };
 
 NtScriptHook* getNoScriptHook()
@@ -79,7 +84,7 @@ void QtGuard::setScriptHook(NtScriptHook* hook)
     _hook = hook ? hook : getNoScriptHook();
 }
 
-void QtGuard::run(std::function<void()> const& call) noexcept
+void QtGuard::run(std::function<void()> const& call)
 {
     {
         InterpreterHold const hold(*_hook);
@@ -96,11 +101,13 @@ void QtGuard::run(std::function<void()> const& call) noexcept
         _currentCall = outerCall;
         --_depth;
     }
-    if (_innermostLoop)
-        _innermostLoop->endIfDone();
+    if (!_innermostLoop)
+        return;
+    _innermostLoop->endIfDone();
+    QtWayOut::take();
 }
 
-void QtGuard::checkSignals() noexcept
+void QtGuard::checkSignals()
 {
     run([hook = _hook] { hook->checkSignals(); });
 }

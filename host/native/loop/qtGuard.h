@@ -37,11 +37,12 @@ public:
     /// Without an interpreter a hook that does as much as it can.
     NtScriptHook& getScriptHook() const { return *_hook; }
 
-    /// Calls into the host; nothing that is thrown comes out.
-    void run(std::function<void()> const& call) noexcept;
+    /// Calls into the host. What is thrown there stays there; a loop that cannot go on is left from here by its
+    /// `QtWayOut`.
+    void run(std::function<void()> const& call);
 
     /// Runs what is pending for the interpreter, guarded.
-    void checkSignals() noexcept;
+    void checkSignals();
 
     QtLoop* getInnermostLoop() const { return _innermostLoop; }
     void setInnermostLoop(QtLoop* loop) { _innermostLoop = loop; }

@@ -1,5 +1,8 @@
 #include "loop/qtLoop.h"
 
+#include "exBase.h"
+#include "loop/qtWayOut.h"
+
 #include <QAbstractEventDispatcher>
 #include <QCoreApplication>
 #include <QSignalBlocker>
@@ -47,16 +50,23 @@ QtLoop::~QtLoop()
 
 std::exception_ptr QtLoop::run()
 {
+    std::string const reason = QtWayOut().run([this] { runLoop(); });
+    if (!reason.empty() && !_error)
+        fail(std::make_exception_ptr(ExBase(__FILE__, __LINE__, "Cannot go on: " + reason)));
+    // The loop was then ended by the end of the application.
+    if (!_error && !*_until && _end)
+        *_end = true;
+    return _error;
+}
+
+void QtLoop::runLoop()
+{
     _loop.exec();
     if (!_turned && QThread::currentThread()->loopLevel() == 0)
     {
         forgetExit();
         _loop.exec();
     }
-    // The loop was then ended by the end of the application.
-    if (!_error && !*_until && _end)
-        *_end = true;
-    return _error;
 }
 
 void QtLoop::end()

@@ -40,6 +40,7 @@ public:
     void fail(std::exception_ptr const& error) noexcept;
 
 private:
+    void runLoop();
     void onTick();
     void onTurn();
 

@@ -4,6 +4,7 @@
 #include "peers/qtLongText.h"
 #include "peers/qtPointerWatch.h"
 #include "peers/qtText.h"
+#include "start/qtApplication.h"
 #include "windows/qtFloat.h"
 #include "windows/qtFocusOrder.h"
 
@@ -111,7 +112,7 @@ QtPeer::~QtPeer()
 
 QWidget* QtPeer::getNative() const
 {
-    return QCoreApplication::instance() ? _widget.data() : nullptr;
+    return QtApplication::isThere() ? _widget.data() : nullptr;
 }
 
 void QtPeer::setCell(int x, int y, int width, int height)

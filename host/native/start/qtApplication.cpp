@@ -1,7 +1,9 @@
 #include "start/qtApplication.h"
 
 #include "exBase.h"
+#include "loop/qtWayOut.h"
 #include "start/qtDisplayProbe.h"
+#include "start/qtDisplayWatch.h"
 #include "windows/qtWindowIcon.h"
 
 #include <QApplication>
@@ -62,6 +64,11 @@ QtApplication::QtApplication()
     start();
 }
 
+bool QtApplication::isThere()
+{
+    return QCoreApplication::instance() && !QtDisplayWatch::isForked();
+}
+
 bool QtApplication::hasGui()
 {
     start();
@@ -78,6 +85,8 @@ void QtApplication::requireLoop()
     start();
     if (!QCoreApplication::instance())
         throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: " + _refusal);
+    if (std::string const loss = QtWayOut::findLoss(); !loss.empty())
+        throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: " + loss);
     if (QCoreApplication::instance()->thread() != QThread::currentThread())
         throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: this is not the thread of the user interface");
 }
@@ -92,14 +101,22 @@ void QtApplication::requireWindows()
                      "instead of it");
     if (!application || (application == _own && !_refusal.empty()))
         throw ExBase(__FILE__, __LINE__, "Cannot show a window: " + _refusal);
+    if (std::string const loss = QtWayOut::findLoss(); !loss.empty())
+        throw ExBase(__FILE__, __LINE__, "Cannot show a window: " + loss);
     if (application->thread() != QThread::currentThread())
         throw ExBase(__FILE__, __LINE__, "Cannot show a window: this is not the thread of the user interface");
 }
 
 void QtApplication::start()
 {
-    if (_tried || QCoreApplication::instance())
-        return;
+    if (!_tried && !QCoreApplication::instance())
+        makeOwn();
+    if (QtDisplayWatch::watch())
+        QtWayOut::listen();
+}
+
+void QtApplication::makeOwn()
+{
     // Qt's objects would outlive a thread that ends before the process, and end that.
     if (gettid() != getpid())
     {

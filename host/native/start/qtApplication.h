@@ -14,6 +14,9 @@ class QtApplication
 public:
     QtApplication();
 
+    /// True if widgets that were made can still be touched.
+    static bool isThere();
+
     /// True if fonts and screens can be asked and widgets made.
     bool hasGui();
 
@@ -28,6 +31,7 @@ public:
 
 private:
     void start();
+    void makeOwn();
 
     /// Ours, or null; never destroyed.
     QCoreApplication* _own = nullptr;

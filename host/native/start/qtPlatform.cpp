@@ -2,6 +2,7 @@
 
 #include "loop/qtDisposal.h"
 #include "loop/qtLoop.h"
+#include "loop/qtWayOut.h"
 #include "peers/qtPeer.h"
 #include "peers/qtText.h"
 #include "start/qtTextEstimate.h"
@@ -134,7 +135,7 @@ GeVector2<int> QtPlatform::getScreenSize()
 
 void QtPlatform::setCursor(NtCursor cursor)
 {
-    if (!_application.hasGui())
+    if (!_application.hasGui() || !QtApplication::isThere())
         return;
     QCoreApplication* const application = QCoreApplication::instance();
     bool const isBusy = _busyApplication == application;
@@ -215,6 +216,17 @@ void QtPlatform::refuseLoop()
     if (++_refusedLoops > patience)
         QtGuard::getInstance().getScriptHook().interrupt();
     throw ExBase(__FILE__, __LINE__, "The application is closing: no dialog can be run any more");
+}
+
+int QtPlatform::runApplication(std::function<void()> lastAct)
+{
+    int status = 0;
+    QtWayOut::setLastAct(std::move(lastAct));
+    std::string const loss = QtWayOut().run([&status] { status = QApplication::exec(); });
+    QtWayOut::setLastAct(nullptr);
+    if (!loss.empty())
+        throw ExBase(__FILE__, __LINE__, "Cannot go on: " + loss);
+    return status;
 }
 
 void QtPlatform::endLoop()

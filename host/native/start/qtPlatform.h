@@ -32,6 +32,7 @@ public:
 
     void callNextTurn(std::function<void()> call) override;
     void runLoop(bool const volatile* until, bool volatile* end) override;
+    int runApplication(std::function<void()> lastAct) override;
     void endLoop() override;
     void interruptLoop() override;
     void closeLoops() override;

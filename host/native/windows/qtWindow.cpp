@@ -3,6 +3,7 @@
 #include "loop/qtDisposal.h"
 #include "loop/qtInputDrop.h"
 #include "peers/qtText.h"
+#include "start/qtApplication.h"
 #include "windows/qtFocusOrder.h"
 #include "windows/qtLostWindows.h"
 #include "windows/qtWindowIcon.h"
@@ -219,6 +220,8 @@ QtWindow::~QtWindow()
 
 void QtWindow::destroyLeft()
 {
+    if (!QtApplication::isThere())
+        return;
     for (QPointer<QtWindowWidget> const& window : QtWindowWidget::findAll())
         std::unique_ptr<QWidget> const left(window.data());
 }
@@ -271,7 +274,7 @@ void QtWindow::flushInput()
 
 QtWindowWidget* QtWindow::getNative() const
 {
-    return QCoreApplication::instance() ? _widget.data() : nullptr;
+    return QtApplication::isThere() ? _widget.data() : nullptr;
 }
 
 } // namespace Kv

@@ -1,0 +1,152 @@
+"""What a dialog stands on goes while it runs: the display, the application object, its own process."""
+
+import sys
+
+import pytest
+
+import scripts
+from scripts import needs_pyqt, run_script
+
+PREAMBLE = '''
+import atexit, os, signal, sys, time
+from quorvane_velmora import ui
+atexit.register(lambda: print('atexit', flush=True))
+FORM = [('TextField', 'a', 'A', 'kept'), ('Menu', 'm', 'M', (['x', 'y'], 1)), ('PushButton', 'p', 'P')]
+XML = ui.makeXmlFromWidgetList(FORM, ['OK'])
+dialog = ui.createDialog('Ground', XML, 300, 160)
+
+def soon(act, seconds=0.2):
+    signal.signal(signal.SIGALRM, lambda *_: act())
+    signal.setitimer(signal.ITIMER_REAL, seconds)
+
+def tell(act, *arguments):
+    try:
+        print(act(*arguments), flush=True)
+    except RuntimeError as error:
+        print(str(error).split(':')[0], '-', type(error).__name__, flush=True)
+'''
+
+ENDS_OF_THE_SERVER = {
+    'in a callback': '''
+dialog.addCallback('a', ui.EventType.VALUE_CHANGED, lambda *_: kill())
+soon(lambda: dialog.setValue('a', 'x'))
+tell(dialog.launch)
+''',
+    'while nothing happens': '''
+if os.fork() == 0:
+    time.sleep(0.4)
+    kill()
+    os._exit(0)
+tell(dialog.launch)
+''',
+    'under two dialogs': '''
+dialog.addCallback('a', ui.EventType.VALUE_CHANGED, lambda *_: (soon(kill), tell(ui.showMessageBox, 'Upper', ['.'])))
+soon(lambda: dialog.setValue('a', 'x'))
+tell(dialog.launch)
+''',
+    'between two dialogs': '''
+soon(lambda: dialog.setValue('a', 'x'))
+class End(Exception): pass
+def end(*_): raise End
+dialog.addCallback('a', ui.EventType.VALUE_CHANGED, end)
+try:
+    dialog.launch()
+except End:
+    kill()
+''',
+}
+
+
+@pytest.mark.parametrize('moment', ENDS_OF_THE_SERVER)
+def test_a_display_that_goes_is_an_exception_and_what_the_dialog_holds_is_kept(display_server, moment):
+    printed = run_script(PREAMBLE + '''
+def kill():
+    os.kill(int(sys.argv[1]), signal.SIGKILL)
+    time.sleep(0.2)
+''' + ENDS_OF_THE_SERVER[moment] + '''
+dialog.setValue('a', 'still', False)
+print(dialog.getValue('a'), dialog.getValue('m'))
+tell(ui.showMessageBox, 'Next', ['.'])
+''', str(display_server.pid), DISPLAY=display_server.display).splitlines()
+    runs = {'under two dialogs': 2, 'between two dialogs': 0}.get(moment, 1)
+    refusal = 'Cannot dispatch events' if scripts.INSIDE else 'Cannot show a window'
+    assert printed == ['Cannot go on - RuntimeError'] * runs + ['still y', refusal + ' - RuntimeError', 'atexit']
+
+
+FORKS = {
+    'which ends': ('sys.exit(3)', '', 3),
+    'which drops the dialog and makes another': ('''
+        del dialog
+        tell(ui.createDialog('Other', XML, 300, 160).launch)
+        sys.exit(4)''', 'Cannot show a window - RuntimeError', 4),
+    'which goes on from the callback': ('return', 'Cannot go on - RuntimeError', 5),
+}
+
+
+@pytest.mark.parametrize('child', FORKS)
+@pytest.mark.standalone
+def test_a_forked_process_leaves_the_windows_to_its_parent(screen, child):
+    acts, printed, status = FORKS[child]
+    output = run_script(PREAMBLE + '''
+atexit._clear()
+class End(Exception): pass
+def end(): raise End
+parent = os.getpid()
+
+def fork(*_):
+    global dialog
+    child = os.fork()
+    if child == 0:
+        %s
+    print(os.waitstatus_to_exitcode(os.waitpid(child, 0)[1]), flush=True)
+    soon(end)
+
+dialog.addCallback('a', ui.EventType.VALUE_CHANGED, fork)
+soon(lambda: dialog.setValue('a', 'x'))
+try:
+    tell(dialog.launch)
+except End:
+    print('goes on', dialog.getValue('a'))
+if os.getpid() != parent:
+    sys.exit(5)
+soon(end)
+try:
+    ui.showMessageBox('Next', ['.'])
+except End:
+    print('next')
+''' % acts, DISPLAY=screen)
+    assert output.split('\n') == [*filter(None, [printed]), str(status), 'goes on x', 'next', '']
+
+
+@needs_pyqt
+@pytest.mark.standalone
+@pytest.mark.parametrize('act', ['click 1', 'key space', 'slot'])
+def test_a_run_ends_with_an_exception_when_its_application_object_is_deleted(desk, act):
+    script = desk.start(sys.executable, '-c', '''
+from PyQt6 import sip
+from PyQt6.QtCore import QTimer
+from PyQt6.QtWidgets import QApplication, QPushButton
+application = QApplication([])
+''' + PREAMBLE + '''
+def place():
+    button = QApplication.activeModalWidget().findChild(QPushButton, 'p')
+    button.setFocus()
+    middle = button.mapToGlobal(button.rect().center())
+    print(middle.x(), middle.y(), flush=True)
+
+dialog.addCallback('p', ui.EventType.ACTIVATE, lambda *_: sip.delete(application))
+QTimer.singleShot(200, place)
+if sys.argv[1] == 'slot':
+    QTimer.singleShot(300, lambda: sip.delete(application))
+tell(dialog.launch)
+print(dialog.getValue('a'), dialog.getValue('m'))
+application = QApplication([])
+tell(ui.showMessageBox, 'Next', ['.'])
+''', act)
+    desk.wait_for_window('Ground')
+    x, y = script.stdout.readline().split()
+    if act != 'slot':
+        desk.run('mousemove', x, y, *act.split())
+    assert script.communicate()[0].splitlines() == ['Cannot go on - RuntimeError', 'kept y',
+                                                    'Cannot show a window - RuntimeError', 'atexit']
+    assert script.returncode == 0
