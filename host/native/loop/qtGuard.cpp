@@ -112,6 +112,12 @@ void QtGuard::checkSignals()
     run([hook = _hook] { hook->checkSignals(); });
 }
 
+void QtGuard::endLoops() const
+{
+    for (QtLoop* loop = _innermostLoop; loop; loop = loop->getOuter())
+        loop->end();
+}
+
 QtMoment QtGuard::getMoment() const
 {
     return {_currentCall, QThread::currentThread()->loopLevel()};

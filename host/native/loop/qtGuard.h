@@ -47,6 +47,9 @@ public:
     QtLoop* getInnermostLoop() const { return _innermostLoop; }
     void setInnermostLoop(QtLoop* loop) { _innermostLoop = loop; }
 
+    /// Ends all loops, each by its end flag.
+    void endLoops() const;
+
     QtMoment getMoment() const;
 
     /// True where neither a call from Qt nor a local loop is under way.

@@ -4,8 +4,9 @@
 #include "loop/qtWayOut.h"
 
 #include <QAbstractEventDispatcher>
-#include <QCoreApplication>
-#include <QSignalBlocker>
+#include <QEvent>
+#include <QGuiApplication>
+#include <QPointer>
 #include <QThread>
 
 #include <chrono>
@@ -19,15 +20,46 @@ namespace
 /// The time that Ctrl-C, and a flag that is set without an event, can stay unseen.
 constexpr std::chrono::milliseconds tickInterval(50);
 
-/// An exit that was asked for while no loop of the application itself ran is remembered for ever, and ends each later
-/// loop before its first event. Only the application's own loop forgets it. Nobody is told that it came and went.
-void forgetExit()
+/// Hears that the application is asked to quit. Qt does not tell where it is not the application that runs the loop.
+class QuitWatch final : public QObject
 {
-    QSignalBlocker const silent(QCoreApplication::instance());
-    auto const exit = QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::awake,
-                                       QCoreApplication::instance(), [] { QCoreApplication::exit(); });
+public:
+    QuitWatch() { QCoreApplication::instance()->installEventFilter(this); }
+
+    bool eventFilter(QObject* receiver, QEvent* event) override
+    {
+        if (receiver != QCoreApplication::instance() || event->type() != QEvent::Quit)
+            return false;
+        QtGuard::getInstance().endLoops();
+        return true;
+    }
+};
+
+/// Runs a loop in one of the application's own, which forgets an exit that was asked for before it began: remembered,
+/// it would end each loop before its first event. Nobody is told that the application's came and went, and it takes no
+/// window for its last one.
+void runInApplication(QEventLoop& loop)
+{
+    QuitWatch const watch;
+    bool const quits = QGuiApplication::quitOnLastWindowClosed();
+    QGuiApplication::setQuitOnLastWindowClosed(false);
+    QPointer<QCoreApplication> const application = QCoreApplication::instance();
+    bool const wasSilent = application->signalsBlocked();
+    QObject context;
+    auto const run = [&]
+    {
+        QObject::disconnect(QAbstractEventDispatcher::instance(), nullptr, &context, nullptr);
+        loop.exec();
+        QtWayOut::take();
+        application->blockSignals(true);
+        QCoreApplication::exit();
+    };
+    QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::awake, &context, run);
+    QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::aboutToBlock, &context, run);
     QCoreApplication::exec();
-    QObject::disconnect(exit);
+    application->blockSignals(wasSilent);
+    if (quits)
+        QGuiApplication::setQuitOnLastWindowClosed(true);
 }
 
 } // namespace
@@ -37,8 +69,8 @@ QtLoop::QtLoop(bool const volatile* until, bool volatile* end)
 {
     QtGuard::getInstance().setInnermostLoop(this);
     QAbstractEventDispatcher* const dispatcher = QAbstractEventDispatcher::instance();
-    QObject::connect(dispatcher, &QAbstractEventDispatcher::awake, &_loop, [this] { onTurn(); });
-    QObject::connect(dispatcher, &QAbstractEventDispatcher::aboutToBlock, &_loop, [this] { onTurn(); });
+    QObject::connect(dispatcher, &QAbstractEventDispatcher::awake, &_loop, [this] { endIfDone(); });
+    QObject::connect(dispatcher, &QAbstractEventDispatcher::aboutToBlock, &_loop, [this] { endIfDone(); });
     QObject::connect(&_tick, &QTimer::timeout, &_loop, [this] { onTick(); });
     _tick.start(tickInterval);
 }
@@ -50,23 +82,21 @@ QtLoop::~QtLoop()
 
 std::exception_ptr QtLoop::run()
 {
-    std::string const reason = QtWayOut().run([this] { runLoop(); });
+    bool const isInOther = QThread::currentThread()->loopLevel() > 0;
+    auto const runLoop = [&]
+    {
+        if (isInOther)
+            _loop.exec();
+        else
+            runInApplication(_loop);
+    };
+    std::string const reason = QtWayOut(isInOther ? 1 : 2).run(runLoop);
     if (!reason.empty() && !_error)
         fail(std::make_exception_ptr(ExBase(__FILE__, __LINE__, "Cannot go on: " + reason)));
     // The loop was then ended by the end of the application.
     if (!_error && !*_until && _end)
         *_end = true;
     return _error;
-}
-
-void QtLoop::runLoop()
-{
-    _loop.exec();
-    if (!_turned && QThread::currentThread()->loopLevel() == 0)
-    {
-        forgetExit();
-        _loop.exec();
-    }
 }
 
 void QtLoop::end()
@@ -103,12 +133,6 @@ void QtLoop::onTick()
     if (QtGuard::getInstance().getInnermostLoop() != this)
         return;
     QtGuard::getInstance().checkSignals();
-    endIfDone();
-}
-
-void QtLoop::onTurn()
-{
-    _turned = true;
     endIfDone();
 }
 

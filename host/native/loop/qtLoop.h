@@ -40,15 +40,12 @@ public:
     void fail(std::exception_ptr const& error) noexcept;
 
 private:
-    void runLoop();
     void onTick();
-    void onTurn();
 
     bool const volatile* _until;
     bool volatile* _end;
     QtLoop* _outer;
     std::exception_ptr _error;
-    bool _turned = false;
     QEventLoop _loop;
     QTimer _tick;
 };

@@ -74,8 +74,8 @@ void hear(QtMsgType type, QMessageLogContext const& context, QString const& mess
 
 } // namespace
 
-QtWayOut::QtWayOut()
-    : _outer(std::exchange(innermost, this)), _level(QThread::currentThread()->loopLevel() + 1),
+QtWayOut::QtWayOut(int loops)
+    : _outer(std::exchange(innermost, this)), _level(QThread::currentThread()->loopLevel() + loops),
       _depth(QtGuard::getInstance().getScriptHook().getDepth())
 {
     listen();
@@ -122,7 +122,7 @@ void QtWayOut::take()
         return;
     if (lastAct && !QtDisplayWatch::isForked())
         std::exchange(lastAct, nullptr)();
-    if (!innermost || QThread::currentThread()->loopLevel() != innermost->_level ||
+    if (!innermost || QThread::currentThread()->loopLevel() > innermost->_level ||
         QtGuard::getInstance().getScriptHook().getDepth() != innermost->_depth)
         return;
     isLeaving = true;

@@ -14,7 +14,8 @@ namespace Kv
 class QtWayOut
 {
 public:
-    QtWayOut();
+    /// `loops` is the number of loops that are going to run in one another, before the one to be left.
+    explicit QtWayOut(int loops = 1);
     QtWayOut(QtWayOut const&) = delete;
     QtWayOut& operator=(QtWayOut const&) = delete;
     ~QtWayOut();
@@ -37,7 +38,7 @@ public:
 
 private:
     QtWayOut* _outer;
-    /// The number of Qt's loops on the thread, with the one that is run.
+    /// The number of Qt's loops on the thread, with those that are run.
     int _level;
     /// How deep the stack is in the interpreter. Its frames must not be left so.
     int _depth;

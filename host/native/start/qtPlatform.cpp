@@ -244,8 +244,7 @@ void QtPlatform::interruptLoop()
 void QtPlatform::closeLoops()
 {
     _closed = true;
-    for (QtLoop* loop = QtGuard::getInstance().getInnermostLoop(); loop; loop = loop->getOuter())
-        loop->end();
+    QtGuard::getInstance().endLoops();
 }
 
 void QtPlatform::destroyWindows()

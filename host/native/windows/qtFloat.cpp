@@ -151,6 +151,9 @@ void QtFloat::pin(QWidget& widget)
 void QtFloat::askIntoView(QWidget const& widget) const
 {
     QWidget const* const room = parentWidget();
+    // A script can have taken either out of its place.
+    if (!room || !isAncestorOf(&widget))
+        return;
     // A move does not bring into sight what is scrolled away.
     QRect const seen = rect().intersected({widget.mapTo(this, QPoint(0, 0)), widget.size()}).translated(pos());
     int const right = getShift(seen.x(), seen.width(), room->width());
