@@ -421,9 +421,13 @@ def test_a_form_taller_than_the_screen_can_be_scrolled_to_its_buttons(user):
     assert values['CloseButtonClicked'] == 'CloseButton_OK' and len(values) == 101
 
 
-def test_a_run_ends_when_others_delete_what_runs(user):
+@pytest.mark.parametrize('end', [
+    pytest.param(lambda user: sip.delete(user.window()), id='delete'),
+    pytest.param(lambda user: QApplication.quit(), id='quit', marks=pytest.mark.standalone),
+    pytest.param(lambda user: QApplication.exit(3), id='exit', marks=pytest.mark.standalone)])
+def test_a_run_ends_when_others_delete_what_runs_or_quit_and_the_next_one_works(user, end):
     dialog = make('OK')
-    user.plan(lambda user: sip.delete(user.window()))
+    user.plan(end)
     assert dialog.launch() == '' and dialog.getValue('Show') == ''
     user.plan(lambda user: user.close())
     assert ui.showMessageBox('after', ['it']) == 'OK'
