@@ -9,7 +9,7 @@ from quorvane_velmora import ui
 from user import User
 from PyQt6.QtCore import QTimer
 
-SAME_SCREEN = {name: os.environ[name] for name in ('DISPLAY', 'QT_QPA_PLATFORM') if name in os.environ}
+SAME_SCREEN = {name: os.environ[name] for name in scripts.CHOOSES_DISPLAY if name in os.environ}
 
 
 class PatientUser(User):

@@ -8,7 +8,7 @@ import pytest
 from forms import UNKNOWN, listen, make_dialog
 from quorvane_velmora import ui
 from PyQt6.QtCore import QPoint, QRect, Qt
-from PyQt6.QtGui import QCursor, QTextDocument
+from PyQt6.QtGui import QTextDocument
 from PyQt6.QtTest import QTest
 from PyQt6.QtWidgets import QApplication, QProxyStyle, QStyle, QToolTip
 
@@ -198,12 +198,14 @@ def hover(name):
         widget = user.find(name)
         style = EagerTooltips()
         widget.setStyle(style)
-        QCursor.setPos(user.window().mapToGlobal(QPoint(1, 1)))
+        window = user.window().window()
+        assert QTest.qWaitForWindowActive(window)  # others show none
+        QTest.mouseMove(window.windowHandle(), user.window().mapTo(window, QPoint(1, 1)))
         for _ in range(100):
             QTest.qWait(20)
             if not QToolTip.isVisible():
                 break
-        QTest.mouseMove(widget, widget.rect().center())
+        QTest.mouseMove(window.windowHandle(), widget.mapTo(window, widget.rect().center()))
         for _ in range(250 if widget.toolTip() else 15):
             QTest.qWait(20)
             if QToolTip.isVisible():
