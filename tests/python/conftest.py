@@ -1,15 +1,16 @@
 """What the tests share: a user who types and clicks, a screen of their own, and an eye on what goes wrong unseen."""
 
+import contextlib
 import os
 import signal
-import subprocess
 import sys
 import traceback
 
 import pytest
 
+import displays
 import scripts
-from desk import Desk
+from desk import Desk, WaylandDesk
 
 # There is PyQt6 for the distribution's interpreter alone. For others the user is one of the module's own.
 if not scripts.HAS_PYQT:
@@ -70,32 +71,23 @@ def no_wait_is_endless():
     signal.signal(signal.SIGALRM, previous)
 
 
-@pytest.fixture
-def display_server():
-    """An X server that nobody else uses, without a window manager; C{display} is its name."""
-    reading, writing = os.pipe()
-    # Without the last option it starts anew, deaf for a moment, each time that its only client goes.
-    server = subprocess.Popen(['Xvfb', '-displayfd', str(writing), '-screen', '0', '1280x1024x24', '-noreset'],
-                              pass_fds=[writing], stderr=subprocess.DEVNULL)
-    os.close(writing)
-    with os.fdopen(reading) as answer:
-        number = answer.readline().strip()
-    server.display = ':' + number
-    yield server
-    server.kill()
-    server.wait()
+@pytest.fixture(params=['xcb', 'wayland'])
+def display(request):
+    """The variables that lead to a display that nobody else uses."""
+    with displays.display(request.param) as variables:
+        yield variables
 
 
-@pytest.fixture
-def screen(display_server):
-    return display_server.display
-
-
-@pytest.fixture
-def desk(screen):
-    someone = Desk(screen)
-    yield someone
-    someone.close()
+@pytest.fixture(params=['xcb', 'wayland'])
+def desk(request):
+    with displays.x_display() as keyboard, contextlib.ExitStack() as stack:
+        if request.param == 'xcb':
+            someone = Desk(keyboard, DISPLAY=keyboard)
+        else:
+            socket = stack.enter_context(displays.wayland_display(keyboard))
+            someone = WaylandDesk(keyboard, WAYLAND_DISPLAY=socket)
+        yield someone
+        someone.close()
 
 
 @pytest.fixture(autouse=True)

@@ -12,6 +12,8 @@ import tempfile
 import time
 
 SIZE = 1280, 1024
+# Below the window of the compositor.
+MARGIN = 24
 PATIENCE = 30  # seconds
 # A server ends with this process, however that ends.
 TOGETHER = 'setpriv', '--pdeathsig', 'KILL'
@@ -24,7 +26,10 @@ panel-position=none
 locking=false
 animation=none
 startup-animation=none
+close-animation=none
 focus-animation=none
+[input-method]
+path=
 '''
 
 
@@ -54,6 +59,12 @@ def x_display():
         yield ':' + number
 
 
+def read_scene(socket):
+    """What stands on that Wayland display, the uppermost first."""
+    return subprocess.run(['weston-debug', 'scene-graph'], env={**os.environ, 'WAYLAND_DISPLAY': socket}, text=True,
+                          stdout=subprocess.PIPE, stderr=subprocess.DEVNULL, timeout=PATIENCE).stdout
+
+
 @contextlib.contextmanager
 def wayland_display(display):
     """The path of its socket. It stands on that X display."""
@@ -62,14 +73,19 @@ def wayland_display(display):
         with open(settings, 'w') as file:
             file.write(SETTINGS)
         command = ['weston', '--backend=x11-backend.so', '--use-pixman', '--width=%d' % SIZE[0],
-                   '--height=%d' % SIZE[1], '--debug', '--socket=socket', '--config=' + settings, '--log=' + log]
-        with running(command, env={'DISPLAY': display, 'XDG_RUNTIME_DIR': folder}, stderr=subprocess.STDOUT) as server:
+                   '--height=%d' % (SIZE[1] - MARGIN), '--debug', '--socket=socket', '--config=' + settings, '--log=' + log]
+        variables = {'DISPLAY': display, 'XDG_RUNTIME_DIR': folder}
+        with running(command, env=variables, stderr=subprocess.STDOUT) as server:
             end = time.monotonic() + PATIENCE
-            while not os.path.exists(socket):
+            while 'background' not in read_scene(socket):
                 if server.poll() is not None or time.monotonic() > end:
                     with open(log) as file:
                         raise AssertionError('the Wayland compositor does not start:\n' + file.read())
                 time.sleep(0.02)
+            # The compositor may lose the first move, and learns where the mouse is whenever that comes into its window.
+            below = 'mousemove', '0', str(SIZE[1] - 1)
+            subprocess.run(['xdotool', *below, 'mousemove', '0', '0', 'mousemove', '9', '9', *below, 'mousemove', '0', '0'],
+                           env={**os.environ, **variables}, check=True)
             yield socket
 
 

@@ -43,7 +43,7 @@ def environment(**changes):
 def run_script(text, *arguments, **changes):
     """Runs a script to its end, which must be a good one, and gives what it printed. The tests of the application run
     it in an application of its own."""
-    if INSIDE and 'DISPLAY' not in changes:
+    if INSIDE and not changes.keys() & set(CHOOSES_DISPLAY):
         changes['QT_QPA_PLATFORM'] = 'offscreen'
     with tempfile.NamedTemporaryFile('w', suffix='.py') as file:
         file.write(text)

@@ -414,14 +414,15 @@ def test_a_dialog_is_dragged_by_its_title_filled_in_by_keys_and_closed_where_it_
         from PyQt6.QtCore import QPoint
         from PyQt6.QtWidgets import QWidget
         panel = stage.APPLICATION.findChild(QWidget, 'mainPanel')
-        place = panel.mapToGlobal(QPoint(0, 0))
+        place = panel.mapTo(stage.APPLICATION, QPoint(0, 0))
         print(place.x(), place.y(), panel.width(), panel.height(), flush=True)
         values = ui.showSimpleDialog('Form', [('TextField', 'Show', 'Show'), ('ToggleButton', 'Win', 'Win')], 400, True)
         print(sorted(values.items()))
         ''')
     application = desk.start(PROGRAM, '--exit', str(tmp_path / 'form.py'))
     left, top, width, height = map(int, application.stdout.readline().split())
-    desk.wait_for_window('Velmora')
+    window = desk.wait_for_window('Velmora')
+    left, top = window.left + left, window.top + top
     dialog_left, dialog_bottom = left + width // 2 - 200, top + height - (height // 2 - 112 // 2)
     title = dialog_left + 200, dialog_bottom - 112 - 13
     button = dialog_left + 49, dialog_bottom - 21
@@ -443,7 +444,7 @@ def test_a_box_gives_the_keyboard_back_a_drag_ends_and_a_long_form_is_scrolled_t
         from PyQt6.QtCore import QPoint, QTimer
         from PyQt6.QtWidgets import QWidget
         panel = stage.APPLICATION.findChild(QWidget, 'mainPanel')
-        place = panel.mapToGlobal(QPoint(0, 0))
+        place = panel.mapTo(stage.APPLICATION, QPoint(0, 0))
         print(place.x(), place.y(), panel.width(), panel.height(), flush=True)
         dialog = ui.createDialog('Form', ui.makeXmlFromWidgetList([('TextField', 'Show')], ['OK', 'Cancel']), 400, 200)
         dialog.addCallback('Show', ui.EventType.VALUE_CHANGED, lambda *_: print(
@@ -463,7 +464,8 @@ def test_a_box_gives_the_keyboard_back_a_drag_ends_and_a_long_form_is_scrolled_t
 
     application = desk.start(PROGRAM, '--exit', str(tmp_path / 'form.py'))
     left, top, width, height = map(int, application.stdout.readline().split())
-    desk.wait_for_window('Velmora')
+    window = desk.wait_for_window('Velmora')
+    left, top = window.left + left, window.top + top
     x, y = width // 2 - 200, height - (height // 2 - 100) - 225
     await_run()
     desk.run('type', 'Os')

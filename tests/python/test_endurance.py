@@ -58,5 +58,5 @@ def test_a_thousand_dialogs_leave_no_widgets_and_no_memory():
     run_script(SCRIPT, QT_QPA_PLATFORM='offscreen')
 
 
-def test_a_thousand_dialogs_on_a_display_leave_no_windows_either(screen):
-    run_script(SCRIPT, DISPLAY=screen)
+def test_a_thousand_dialogs_on_a_display_leave_no_windows_either(display):
+    run_script(SCRIPT, **display)
