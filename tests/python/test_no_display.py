@@ -29,6 +29,17 @@ assert dialog.getValues() == {'a': 'y', 'm': 'three'}
 '''
 REMEDY = ['there is no display', 'set DISPLAY or WAYLAND_DISPLAY', 'QT_QPA_PLATFORM=offscreen']
 
+# A socket that somebody has in the current directory, and at which no compositor answers.
+SOCKET = '''
+import os, socket, tempfile
+folder = tempfile.TemporaryDirectory()
+os.chdir(folder.name)
+listening = socket.socket(socket.AF_UNIX)
+listening.bind('wayland-0')
+listening.listen()
+'''
+WAYLAND = {'QT_QPA_PLATFORM': 'wayland'}
+
 
 @pytest.mark.parametrize('preamble, settings, words', [
     ('', {}, ['DISPLAY is not set', *REMEDY]),
@@ -36,6 +47,10 @@ REMEDY = ['there is no display', 'set DISPLAY or WAYLAND_DISPLAY', 'QT_QPA_PLATF
     ('', {'DISPLAY': ':9876'}, ['DISPLAY ":9876" cannot be opened', *REMEDY]),
     ('', {'DISPLAY': 'nonsense'}, ['DISPLAY "nonsense" cannot be opened', *REMEDY]),
     ('', {'WAYLAND_DISPLAY': 'wayland-none'}, REMEDY),
+    ('', {'WAYLAND_SOCKET': '9876', **WAYLAND}, ['WAYLAND_SOCKET is "9876", which is no connection', *REMEDY]),
+    ('', {'WAYLAND_SOCKET': '', **WAYLAND}, ['WAYLAND_SOCKET is ""', *REMEDY]),
+    (SOCKET, {'XDG_RUNTIME_DIR': '.', **WAYLAND}, ['display "wayland-0" cannot be opened', *REMEDY]),
+    (SOCKET + 'os.environ["XDG_RUNTIME_DIR"] = folder.name', WAYLAND, ['"wayland-0" cannot be opened', *REMEDY]),
     ('', {'QT_QPA_PLATFORM': 'xcb'}, ['QT_QPA_PLATFORM is "xcb"', 'DISPLAY is not set', *REMEDY]),
     ('', {'QT_QPA_PLATFORM': 'xcb', 'DISPLAY': ':9876'}, ['DISPLAY ":9876" cannot be opened', *REMEDY]),
     ('', {'QT_QPA_PLATFORM': 'nonsense'}, ['there is no platform "nonsense"', *REMEDY]),

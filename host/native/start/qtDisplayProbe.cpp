@@ -2,12 +2,15 @@
 
 #include <QCoreApplication>
 #include <QDir>
+#include <QFile>
 #include <QJsonArray>
 #include <QJsonObject>
 #include <QPluginLoader>
 #include <QStringList>
 
+#include <array>
 #include <cstring>
+#include <poll.h>
 #include <sys/socket.h>
 #include <sys/un.h>
 #include <unistd.h>
@@ -50,6 +53,37 @@ QStringList pluginFolders()
     return folders;
 }
 
+/// An open file that is closed in the end.
+class Descriptor
+{
+public:
+    explicit Descriptor(int number) : _number(number) {}
+    Descriptor(Descriptor const&) = delete;
+    Descriptor& operator=(Descriptor const&) = delete;
+    ~Descriptor() { ::close(_number); }
+
+    int get() const { return _number; }
+
+private:
+    int _number;
+};
+
+/// True if what answers there is a compositor: Qt waits for that without an end.
+bool answersSync(int connection)
+{
+    // Wayland's first object has the number 1, is asked by operation 0 to answer to another one, and takes 12 bytes for
+    // it.
+    constexpr quint32 size = 12;
+    constexpr std::array<quint32, 3> sync{1, size << 16U, 2};
+    if (::send(connection, sync.data(), size, MSG_NOSIGNAL) != size)
+        return false;
+    constexpr int patience = 5000;
+    pollfd answer{connection, POLLIN, 0};
+    quint32 object = 0;
+    return ::poll(&answer, 1, patience) == 1 && ::recv(connection, &object, sizeof object, 0) == sizeof object &&
+           object == sync.back();
+}
+
 bool connects(std::string const& socketPath)
 {
     sockaddr_un address{};
@@ -57,26 +91,34 @@ bool connects(std::string const& socketPath)
     if (socketPath.size() >= sizeof address.sun_path)
         return false;
     std::memcpy(address.sun_path, socketPath.c_str(), socketPath.size() + 1);
-    int const descriptor = ::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
-    if (descriptor < 0)
-        return false;
-    bool const connected = ::connect(descriptor, reinterpret_cast<sockaddr const*>(&address), sizeof address) == 0;
-    ::close(descriptor);
-    return connected;
+    Descriptor const socket(::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
+    return ::connect(socket.get(), reinterpret_cast<sockaddr const*>(&address), sizeof address) == 0 &&
+           answersSync(socket.get());
 }
 
+/// True if a number names a connected socket of this process. More cannot be asked: it is for one client alone.
+bool isConnection(QString const& number)
+{
+    bool isNumber = false;
+    int const descriptor = number.toInt(&isNumber);
+    sockaddr_storage peer{};
+    socklen_t size = sizeof peer;
+    return isNumber && ::getpeername(descriptor, reinterpret_cast<sockaddr*>(&peer), &size) == 0;
+}
+
+/// By the rules of Wayland's own library, which does not look further than the first that is set.
 bool answersWayland(std::string& refusal)
 {
-    // A parent that hands over an open connection has looked itself.
-    if (!environment("WAYLAND_SOCKET").isEmpty())
-        return true;
-    QString display = environment("WAYLAND_DISPLAY");
-    if (display.isEmpty())
-        display = QStringLiteral("wayland-0");
-    if (connects(QDir(environment("XDG_RUNTIME_DIR")).filePath(display).toStdString()))
-        return true;
+    if (qEnvironmentVariableIsSet("WAYLAND_SOCKET"))
+    {
+        QString const number = environment("WAYLAND_SOCKET");
+        refusal = "WAYLAND_SOCKET is " + quoted(number) + ", which is no connection";
+        return isConnection(number);
+    }
+    QString const display = qEnvironmentVariable("WAYLAND_DISPLAY", QStringLiteral("wayland-0"));
+    QString const path = QDir(environment("XDG_RUNTIME_DIR")).filePath(display);
     refusal = "the Wayland display " + quoted(display) + " cannot be opened";
-    return false;
+    return QDir::isAbsolutePath(path) && connects(QFile::encodeName(path).toStdString());
 }
 
 bool canOpen(QString const& device, std::string& refusal)
