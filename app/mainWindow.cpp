@@ -64,7 +64,9 @@ MainWindow::MainWindow(Commands commands, ScriptOutput& output) : _commands(std:
 {
     setObjectName(QStringLiteral("Velmora"));
     setWindowTitle(QStringLiteral("Velmora"));
-    resize(windowSize.boundedTo(screen()->availableGeometry().size() - windowFrame));
+    // Empty where there is no screen for now.
+    QSize const room = screen()->availableGeometry().size() - windowFrame;
+    resize(room.isEmpty() ? windowSize : windowSize.boundedTo(room));
     makePanes(output);
     makeMenus();
     _message = new QLabel;

@@ -66,27 +66,39 @@ def read_scene(socket):
 
 
 @contextlib.contextmanager
-def wayland_display(display):
-    """The path of its socket. It stands on that X display."""
+def wayland_compositor(ready, backend, *options, **variables):
+    """The path of its socket, once its scene has those words."""
     with tempfile.TemporaryDirectory() as folder:
         socket, settings, log = (os.path.join(folder, name) for name in ('socket', 'settings', 'log'))
         with open(settings, 'w') as file:
             file.write(SETTINGS)
-        command = ['weston', '--backend=x11-backend.so', '--use-pixman', '--width=%d' % SIZE[0],
-                   '--height=%d' % (SIZE[1] - MARGIN), '--debug', '--socket=socket', '--config=' + settings, '--log=' + log]
-        variables = {'DISPLAY': display, 'XDG_RUNTIME_DIR': folder}
-        with running(command, env=variables, stderr=subprocess.STDOUT) as server:
+        command = ['weston', '--backend=%s-backend.so' % backend, '--use-pixman', '--debug', '--socket=socket',
+                   '--config=' + settings, '--log=' + log, *options]
+        with running(command, env={'XDG_RUNTIME_DIR': folder, **variables}, stderr=subprocess.STDOUT) as server:
             end = time.monotonic() + PATIENCE
-            while 'background' not in read_scene(socket):
+            while ready not in read_scene(socket):
                 if server.poll() is not None or time.monotonic() > end:
                     with open(log) as file:
                         raise AssertionError('the Wayland compositor does not start:\n' + file.read())
                 time.sleep(0.02)
-            # The compositor may lose the first move, and learns where the mouse is whenever that comes into its window.
-            below = 'mousemove', '0', str(SIZE[1] - 1)
-            subprocess.run(['xdotool', *below, 'mousemove', '0', '0', 'mousemove', '9', '9', *below, 'mousemove', '0', '0'],
-                           env={**os.environ, **variables}, check=True)
             yield socket
+
+
+@contextlib.contextmanager
+def wayland_display(display):
+    """The path of its socket. It stands on that X display."""
+    size = ['--width=%d' % SIZE[0], '--height=%d' % (SIZE[1] - MARGIN)]
+    with wayland_compositor('background', 'x11', *size, DISPLAY=display) as socket:
+        # The compositor may lose the first move, and learns where the mouse is whenever that comes into its window.
+        below = 'mousemove', '0', str(SIZE[1] - 1)
+        subprocess.run(['xdotool', *below, 'mousemove', '0', '0', 'mousemove', '9', '9', *below, 'mousemove', '0', '0'],
+                       env={**os.environ, 'DISPLAY': display}, check=True)
+        yield socket
+
+
+def wayland_without_screens():
+    """The path of its socket."""
+    return wayland_compositor('scene', 'headless', '--no-outputs')
 
 
 @contextlib.contextmanager

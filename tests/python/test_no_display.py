@@ -2,6 +2,7 @@
 
 import pytest
 
+import displays
 from scripts import run_script
 
 pytestmark = pytest.mark.standalone
@@ -77,3 +78,18 @@ assert QApplication.platformName() == 'offscreen'
 QTimer.singleShot(0, lambda: QApplication.activeModalWidget().findChild(QPushButton).click())
 assert ui.showMessageBox('t', ['text']) == 'OK'
 ''', QT_QPA_PLATFORM='nonsense;xcb;offscreen')
+
+
+def test_on_a_display_without_a_screen_for_now_dialogs_have_their_size_and_take_answers():
+    with displays.wayland_without_screens() as socket:
+        run_script('''
+from quorvane_velmora import testing, ui
+from PyQt6.QtWidgets import QApplication
+def look(person):
+    window = QApplication.activeModalWidget()
+    assert (window.width(), window.height()) == (300, 224)
+with testing.person() as person:
+    person.answer('t', {'A': 'x'}, 'OK', do=look)
+    dialog = ui.createDialog('t', ui.makeXmlFromWidgetList([('TextField', 'a', 'A')]), 300, 200)
+    assert dialog.launch() == 'CloseButton_OK' and dialog.getValue('a') == 'x'
+''', WAYLAND_DISPLAY=socket)

@@ -92,7 +92,7 @@ TextLines breakIntoLines(QString const& text, QFont const& font, QSize const& ro
 QString toTooltip(QString const& text)
 {
     QScreen const* const screen = QGuiApplication::primaryScreen();
-    if (text.isEmpty() || !screen)
+    if (text.isEmpty() || !screen || screen->availableSize().isEmpty())
         return text;
     QFont const font = QToolTip::font();
     // It fits above the pointer or below it: one that lies under the pointer goes at once.

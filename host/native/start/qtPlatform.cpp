@@ -83,10 +83,17 @@ bool isQuicklyMeasured(QString const& text)
 /// The height that is left free for the window manager's frame, which is known only when it is too late.
 constexpr int titleBarRoom = 40;
 
+/// Null where there is none to see windows on. A window system that has none for now gives one without extent.
+QScreen const* findScreen()
+{
+    QScreen const* const screen = QGuiApplication::primaryScreen();
+    return screen && !screen->geometry().isEmpty() ? screen : nullptr;
+}
+
 /// Turns a frame over, makes it fit the free part of the screen and moves it there.
 QRect fitToScreen(GeRectangle<int> const& frame)
 {
-    QScreen const* const screen = QGuiApplication::primaryScreen();
+    QScreen const* const screen = findScreen();
     if (!screen)
         return {frame.xMin, 0, frame.getWidth(), frame.getHeight()};
     QRect const all = screen->geometry();
@@ -127,7 +134,7 @@ float QtPlatform::measureText(std::string const& text)
 
 GeVector2<int> QtPlatform::getScreenSize()
 {
-    QScreen const* const screen = _application.hasGui() ? QGuiApplication::primaryScreen() : nullptr;
+    QScreen const* const screen = _application.hasGui() ? findScreen() : nullptr;
     if (!screen)
         return assumedScreen;
     return {screen->size().width(), screen->size().height()};
