@@ -83,3 +83,30 @@ print(ui.showSimpleDialog('Other', [('TextField', 'b')], 300, True))
     desk.run('key', 'Escape')
     assert script.communicate()[0] == "{'CloseButtonClicked': 'CloseButton_Cancel', 'b': 'x'}\n"
     assert script.returncode == 0
+
+
+def test_a_dialog_that_failed_and_stays_leaves_the_keys_and_the_place_in_front_to_the_one_that_runs(desk):
+    script = start(desk, '''
+from quorvane_velmora import ui
+xml = ui.makeXmlFromWidgetList([('TextField', 'a'), ('PushButton', 'Ask')])
+outer, failing = ui.createDialog('Outer', xml, 300, 120), ui.createDialog('Failing', xml, 300, 120)
+def fail(*_):
+    raise ValueError('failed')
+def ask(*_):
+    try:
+        failing.launch()
+    except ValueError as error:
+        print(error)
+failing.addCallback('Ask', ui.EventType.ACTIVATE, fail)
+outer.addCallback('Ask', ui.EventType.ACTIVATE, ask)
+print(outer.launch(), outer.getValue('a'))
+''')
+    for title in 'Outer', 'Failing':
+        desk.wait_for_window(title)
+        desk.run('key', 'Tab', 'space')
+    assert script.stdout.readline() == 'failed\n'
+    window = desk.wait_for_window('Outer')
+    desk.run('key', 'shift+Tab')
+    desk.run('type', 'heard')
+    desk.click_in(window, *OK_BUTTON)
+    assert script.communicate()[0] == 'CloseButton_OK heard\n' and script.returncode == 0

@@ -84,6 +84,11 @@ void QtWindowWidget::showModal()
     setWindowModality(Qt::ApplicationModal);
     layOut();
     show();
+    comeToFront();
+}
+
+void QtWindowWidget::comeToFront()
+{
     if (hasStack())
         raise();
     else
@@ -106,8 +111,22 @@ void QtWindowWidget::letOthersIn()
     setAttribute(Qt::WA_ShowWithoutActivating);
     show();
     setAttribute(Qt::WA_ShowWithoutActivating, false);
-    if (QWidget* const modal = QApplication::activeModalWidget())
+    QWidget* const modal = QApplication::activeModalWidget();
+    if (auto* const awaited = dynamic_cast<QtWindowWidget*>(modal))
+        awaited->comeBack();
+    else if (modal)
         modal->activateWindow();
+}
+
+void QtWindowWidget::comeBack()
+{
+    // Wayland has no other way to put a window in front again.
+    if (QGuiApplication::platformName().startsWith(QLatin1String("wayland")))
+    {
+        hide();
+        show();
+    }
+    comeToFront();
 }
 
 void QtWindowWidget::setContentSize(int width, int height)

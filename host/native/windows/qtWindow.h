@@ -53,6 +53,9 @@ private:
     /// Lets input through to a window that is shown above this one now.
     void unblock(QWidget const& window);
     void letOthersIn();
+    void comeToFront();
+    /// The same for a window that others were shown above meanwhile.
+    void comeBack();
 
     QtListenerHandle<NtWindowListener> _handle;
     /// Natively a child, which others can delete.
