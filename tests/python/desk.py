@@ -63,10 +63,6 @@ class Desk:
     def _has_keyboard(self, window):
         return self.run('getwindowfocus', '-f') == [window.identity]
 
-    def ask_to_close(self, window):
-        """What a window manager does for a user who has had enough."""
-        self.run('windowquit', window.identity)
-
     def click(self, x, y):
         self.run('mousemove', x, y, 'click', 1)
 
@@ -96,9 +92,8 @@ class WaylandDesk(Desk):
 
     def _look(self):
         """All windows, the uppermost first, once all are drawn: the mouse does not meet them before."""
-        scene = ''
-        while 'repaint status: no repaint' not in scene:
-            scene = read_scene(self._environment['WAYLAND_DISPLAY'])
+        while 'repaint status: no repaint' not in (scene := read_scene(self._environment['WAYLAND_DISPLAY'])):
+            assert scene, 'the compositor is gone'
         for title, *corners in self._VIEW.findall(scene):
             left, top, right, bottom = map(int, corners)
             yield Window(title, left + self._FRAME, top + self._TITLE, right - left - 2 * self._FRAME,
@@ -110,5 +105,5 @@ class WaylandDesk(Desk):
     def _has_keyboard(self, window):
         return window == next(self._look(), None)
 
-    def ask_to_close(self, window):
+    def close_by_title(self, window):
         self.click(window.left + window.width - 14, window.top - self._TITLE // 2)

@@ -2,6 +2,7 @@
 mouse."""
 
 import sys
+import time
 
 import pytest
 
@@ -33,6 +34,35 @@ print(sorted(values.items()))
         "('Win', True)]\n")
     assert script.returncode == 0
     desk.wait_until_gone('Awards 1')
+
+
+def test_a_menu_opens_where_it_stands_and_a_click_picks_from_it(desk):
+    script = start(desk, '''
+from quorvane_velmora import ui
+print(sorted(ui.showSimpleDialog('Form', [('Menu', 'b', 'B', (['one', 'two', 'three'], 0))], 300).items()))
+''')
+    window = desk.wait_for_window('Form')
+    menu, row = (120, 57), 22
+    desk.click_in(window, *menu)
+    time.sleep(0.6)  # a click that comes sooner is taken for the second half of the one that opens it
+    desk.click_in(window, menu[0], menu[1] - row)
+    desk.click_in(window, *OK_BUTTON)
+    assert script.communicate()[0] == "[('CloseButtonClicked', 'CloseButton_OK'), ('b', 'two')]\n"
+
+
+# Without a window manager, X has no title to close a window by.
+@pytest.mark.parametrize('desk', ['wayland'], indirect=True)
+def test_a_window_that_is_closed_by_its_title_presses_cancel_or_stays_where_it_needs_an_answer(desk):
+    script = start(desk, '''
+from quorvane_velmora import ui
+print(ui.showSimpleDialog('Form', [('TextField', 'a')], 300, True))
+print(ui.showMessageBox('Box', ['Really?'], ['Yes', 'No']))
+''')
+    desk.close_by_title(desk.wait_for_window('Form'))
+    assert script.stdout.readline() == "{'CloseButtonClicked': 'CloseButton_Cancel', 'a': ''}\n"
+    desk.close_by_title(desk.wait_for_window('Box'))
+    desk.run('key', 'Tab', 'Return')
+    assert script.communicate()[0] == 'No\n' and script.returncode == 0
 
 
 # A Wayland compositor asks a window to go, and destroys none.
