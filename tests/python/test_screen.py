@@ -56,11 +56,13 @@ def test_a_window_that_is_closed_by_its_title_presses_cancel_or_stays_where_it_n
     script = start(desk, '''
 from quorvane_velmora import ui
 print(ui.showSimpleDialog('Form', [('TextField', 'a')], 300, True))
-print(ui.showMessageBox('Box', ['Really?'], ['Yes', 'No']))
+print(ui.showMessageBox('Delete the whole shot?', ['Really?'], ['Yes', 'No']))
 ''')
     desk.close_by_title(desk.wait_for_window('Form'))
     assert script.stdout.readline() == "{'CloseButtonClicked': 'CloseButton_Cancel', 'a': ''}\n"
-    desk.close_by_title(desk.wait_for_window('Box'))
+    box = desk.wait_for_window('Delete the whole shot?')
+    assert box.width > 280  # of which the buttons of the title leave room for that
+    desk.close_by_title(box)
     desk.run('key', 'Tab', 'Return')
     assert script.communicate()[0] == 'No\n' and script.returncode == 0
 

@@ -54,6 +54,28 @@ bool hasStack()
     return name != QLatin1String("offscreen") && name != QLatin1String("minimal");
 }
 
+bool isWayland()
+{
+    return QGuiApplication::platformName().startsWith(QLatin1String("wayland"));
+}
+
+/// Widens a window for its title where it is Qt that draws that, in the middle between an icon and three buttons, and
+/// cuts what has no room.
+void makeRoomForTitle(QWidget& window)
+{
+    if (!isWayland() || window.windowHandle()->frameMargins().isNull())
+        return;
+    constexpr int fontHeight = 14;
+    constexpr int buttons = 80;
+    constexpr int enough = 480;
+    QFont font = QGuiApplication::font();
+    font.setPixelSize(fontHeight);
+    int const wanted = QFontMetrics(font).horizontalAdvance(window.windowTitle()) + 2 * buttons;
+    QMargins const frame = window.windowHandle()->frameMargins();
+    int const room = window.screen()->availableGeometry().width() - frame.left() - frame.right();
+    window.resize(std::max(window.width(), std::min({wanted, room, enough})), window.height());
+}
+
 } // namespace
 
 QtWindowWidget::QtWindowWidget(QtListenerHandle<NtWindowListener> const& handle)
@@ -84,6 +106,7 @@ void QtWindowWidget::showModal()
     setWindowModality(Qt::ApplicationModal);
     layOut();
     show();
+    makeRoomForTitle(*this);
     comeToFront();
 }
 
@@ -121,7 +144,7 @@ void QtWindowWidget::letOthersIn()
 void QtWindowWidget::comeBack()
 {
     // Wayland has no other way to put a window in front again.
-    if (QGuiApplication::platformName().startsWith(QLatin1String("wayland")))
+    if (isWayland())
     {
         hide();
         show();
