@@ -199,7 +199,8 @@ def hover(name):
         style = EagerTooltips()
         widget.setStyle(style)
         window = user.window().window()
-        assert QTest.qWaitForWindowActive(window)  # others show none
+        while not window.isActiveWindow():  # others show none
+            QTest.qWait(20)
         QTest.mouseMove(window.windowHandle(), user.window().mapTo(window, QPoint(1, 1)))
         for _ in range(100):
             QTest.qWait(20)
