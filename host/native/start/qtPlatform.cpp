@@ -142,11 +142,12 @@ GeVector2<int> QtPlatform::getScreenSize()
 
 void QtPlatform::setCursor(NtCursor cursor)
 {
-    if (!_application.hasGui() || !QtApplication::isThere())
+    bool const getsBusy = cursor == NtCursor::Busy;
+    // The normal cursor needs no application: one that began for it would stand in the way of a script's next.
+    if ((getsBusy ? !_application.hasGui() : !_busyApplication) || !QtApplication::isThere())
         return;
     QCoreApplication* const application = QCoreApplication::instance();
     bool const isBusy = _busyApplication == application;
-    bool const getsBusy = cursor == NtCursor::Busy;
     if (isBusy == getsBusy)
         return;
     if (getsBusy)
