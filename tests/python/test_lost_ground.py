@@ -58,16 +58,20 @@ except End:
 
 
 @pytest.mark.parametrize('moment', ENDS_OF_THE_SERVER)
-def test_a_display_that_goes_is_an_exception_and_what_the_dialog_holds_is_kept(display_server, moment):
+def test_a_display_that_goes_is_an_exception_and_what_the_dialog_holds_is_kept(display, moment):
     printed = run_script(PREAMBLE + '''
+import socket, struct
+with socket.socket(socket.AF_UNIX) as connection:
+    connection.connect(os.environ.get('WAYLAND_DISPLAY') or '/tmp/.X11-unix/X' + os.environ['DISPLAY'].lstrip(':'))
+    server = struct.unpack('3i', connection.getsockopt(socket.SOL_SOCKET, socket.SO_PEERCRED, 12))[0]
 def kill():
-    os.kill(int(sys.argv[1]), signal.SIGKILL)
+    os.kill(server, signal.SIGKILL)
     time.sleep(0.2)
 ''' + ENDS_OF_THE_SERVER[moment] + '''
 dialog.setValue('a', 'still', False)
 print(dialog.getValue('a'), dialog.getValue('m'))
 tell(ui.showMessageBox, 'Next', ['.'])
-''', str(display_server.pid), DISPLAY=display_server.display).splitlines()
+''', **display).splitlines()
     runs = {'under two dialogs': 2, 'between two dialogs': 0}.get(moment, 1)
     refusal = 'Cannot dispatch events' if scripts.INSIDE else 'Cannot show a window'
     assert printed == ['Cannot go on - RuntimeError'] * runs + ['still y', refusal + ' - RuntimeError', 'atexit']
@@ -85,7 +89,7 @@ FORKS = {
 
 @pytest.mark.parametrize('child', FORKS)
 @pytest.mark.standalone
-def test_a_forked_process_leaves_the_windows_to_its_parent(screen, child):
+def test_a_forked_process_leaves_the_windows_to_its_parent(display, child):
     acts, printed, status = FORKS[child]
     output = run_script(PREAMBLE + '''
 atexit._clear()
@@ -114,7 +118,7 @@ try:
     ui.showMessageBox('Next', ['.'])
 except End:
     print('next')
-''' % acts, DISPLAY=screen)
+''' % acts, **display)
     assert output.split('\n') == [*filter(None, [printed]), str(status), 'goes on x', 'next', '']
 
 
@@ -131,7 +135,7 @@ application = QApplication([])
 def place():
     button = QApplication.activeModalWidget().findChild(QPushButton, 'p')
     button.setFocus()
-    middle = button.mapToGlobal(button.rect().center())
+    middle = button.mapTo(button.window(), button.rect().center())
     print(middle.x(), middle.y(), flush=True)
 
 dialog.addCallback('p', ui.EventType.ACTIVATE, lambda *_: sip.delete(application))
@@ -143,10 +147,10 @@ print(dialog.getValue('a'), dialog.getValue('m'))
 application = QApplication([])
 tell(ui.showMessageBox, 'Next', ['.'])
 ''', act)
-    desk.wait_for_window('Ground')
-    x, y = script.stdout.readline().split()
+    window = desk.wait_for_window('Ground')
+    x, y = map(int, script.stdout.readline().split())
     if act != 'slot':
-        desk.run('mousemove', x, y, *act.split())
+        desk.run('mousemove', window.left + x, window.top + y, *act.split())
     assert script.communicate()[0].splitlines() == ['Cannot go on - RuntimeError', 'kept y',
                                                     'Cannot show a window - RuntimeError', 'atexit']
     assert script.returncode == 0
