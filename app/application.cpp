@@ -94,13 +94,28 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
     _signalTimer.start(signalInterval);
     if (hasScreen())
         _watch.emplace([this] { return _scriptRuns || _interpreter.isRunning(); }, [this] { stopScript(); });
-    int const status = Kv::WsNative::getPlatform().runApplication(nullptr);
+    int const status = runLoop();
     _watch.reset();
     _signalTimer.stop();
     _window.saveLook(_settings);
     // The scripts' own acts at the end can open no dialog any more: nobody would see it.
     Kv::WsNative::getPlatform().closeLoops();
     return status;
+}
+
+int Application::runLoop()
+{
+    try
+    {
+        return Kv::WsNative::getPlatform().runApplication(nullptr);
+    }
+    catch (Kv::ExBase const&)
+    {
+        // The display is gone. What a script has come to before that counts.
+        if (!_exitStatus)
+            throw;
+        return *_exitStatus;
+    }
 }
 
 Commands Application::makeCommands()
@@ -157,8 +172,10 @@ void Application::startScript(ScriptCall const& script, bool exit)
                        [this, script, exit]
                        {
                            int const status = runScript(script);
-                           if (exit || _closing)
-                               QApplication::exit(status);
+                           if (!exit && !_closing)
+                               return;
+                           _exitStatus = status;
+                           QApplication::exit(status);
                        });
 }
 

@@ -48,6 +48,7 @@ private:
 
     /// Runs a script once the loop has come around, and then ends the application where `exit` is set.
     void startScript(ScriptCall const& script, bool exit);
+    int runLoop();
     int runScript(ScriptCall const& script);
     void checkSignals();
     /// True after Ctrl-C.
@@ -100,6 +101,8 @@ private:
     std::mutex _stopping;
     bool _stopAsked = false;
     bool _closing = false;
+    /// Of the script whose end is that of the application.
+    std::optional<int> _exitStatus;
     std::optional<BusyWatch> _watch;
 };
 

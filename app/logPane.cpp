@@ -2,6 +2,8 @@
 
 #include "theme.h"
 
+#include "wsNative.h"
+
 #include <QApplication>
 #include <QClipboard>
 #include <QDateTime>
@@ -325,7 +327,8 @@ QAbstractButton* LogPane::makeButton(QString const& text, QString const& tip, vo
 
 void LogPane::onPrinted()
 {
-    if (QThread::currentThread() == thread() && isVisible() && !isPainting(*window()) && hasCredit())
+    if (QThread::currentThread() == thread() && isVisible() && !isPainting(*window()) && hasCredit() &&
+        Kv::WsNative::getPlatform().hasDisplay())
     {
         showNew();
         repaint();

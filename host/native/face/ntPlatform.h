@@ -77,6 +77,9 @@ public:
     /// Width in pixels of a text as a widget draws it in the default font, rounded up to whole pixels.
     virtual float measureText(std::string const& text) = 0;
 
+    /// False once the display is gone: whoever paints or dispatches events then may end the process.
+    virtual bool hasDisplay() = 0;
+
     /// Size of the screen in pixels.
     virtual GeVector2<int> getScreenSize() = 0;
 

@@ -132,6 +132,11 @@ float QtPlatform::measureText(std::string const& text)
     return static_cast<float>(std::ceil(width));
 }
 
+bool QtPlatform::hasDisplay()
+{
+    return QtWayOut::findLoss().empty();
+}
+
 GeVector2<int> QtPlatform::getScreenSize()
 {
     QScreen const* const screen = _application.hasGui() ? findScreen() : nullptr;

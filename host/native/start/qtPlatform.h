@@ -20,6 +20,7 @@ public:
 
     void setScriptHook(NtScriptHook* hook) override;
     float measureText(std::string const& text) override;
+    bool hasDisplay() override;
     GeVector2<int> getScreenSize() override;
     void setCursor(NtCursor cursor) override;
 
