@@ -196,10 +196,9 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, std::strin
     native->setObjectName(toQString(name));
     NtNoListener nobody;
     _content = std::make_unique<QtContainer>(native, contentName, nobody);
-    // No screen shows more, and a window system can end the process for it.
-    constexpr int maxTitle = 4096;
-    // Doubled, what marks a changed document for Qt stands for itself.
-    native->setWindowTitle(toQString(title).left(maxTitle).replace(QLatin1String("[*]"), QLatin1String("[*][*]")));
+    // A window system can end the process for a longer one. Doubled, what marks a changed document for Qt stands for
+    // itself.
+    native->setWindowTitle(toShown(toQString(title), mostInRow).replace(QLatin1String("[*]"), QLatin1String("[*][*]")));
     // Where the application is a script's own, it has no icon as a rule.
     if (QApplication::windowIcon().isNull())
         native->setWindowIcon(getWindowIcon());
