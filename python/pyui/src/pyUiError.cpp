@@ -15,12 +15,21 @@ namespace Kv::PyextUi
 namespace
 {
 
+/// A note whose middle goes where nobody would read it to its end.
+bp::object shorten(bp::object const& note)
+{
+    constexpr long half = ExBase::mostBytes / 2;
+    if (bp::len(note) <= 2 * half)
+        return note;
+    return note.slice(0, half) + bp::str(" … ") + note.slice(-half, bp::_);
+}
+
 /// Does the work of `add_note`, which Python has from 3.11 on.
 void appendNote(bp::object error, bp::object const& note)
 {
     if (!PyObject_HasAttrString(error.ptr(), "__notes__"))
         error.attr("__notes__") = bp::list();
-    error.attr("__notes__").attr("append")(note);
+    error.attr("__notes__").attr("append")(shorten(note));
 }
 
 } // namespace
