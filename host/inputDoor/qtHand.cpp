@@ -4,6 +4,7 @@
 #include <QApplication>
 #include <QComboBox>
 #include <QKeySequence>
+#include <QLineEdit>
 #include <QPointer>
 #include <QScrollArea>
 #include <QTest>
@@ -75,6 +76,8 @@ QString QtHand::findObstacle(QWidget& widget)
         return QStringLiteral("is hidden");
     if (!widget.isEnabled())
         return QStringLiteral("is disabled");
+    if (auto const* const field = qobject_cast<QLineEdit*>(&widget); field && field->isReadOnly())
+        return QStringLiteral("is read-only");
     scrollIntoView(widget);
     if (widget.visibleRegion().isEmpty())
         return QStringLiteral("is out of sight");

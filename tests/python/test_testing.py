@@ -153,6 +153,12 @@ def test_widgets_that_take_no_input_are_not_touched(fail, change, word):
     assert dialog.getValue('Text') == 'old'
 
 
+def test_a_field_that_is_too_long_to_edit_is_not_filled(fail):
+    dialog = make_dialog('Publish')
+    dialog.setValue('Text', 'x' * 100001)
+    assert 'cannot be filled: it is read-only' in str(fail(dialog.launch, values={'Text': 'x'}))
+
+
 def test_a_wrong_value_and_an_exception_of_the_test_come_out_of_the_dialog_with_their_traceback(fail):
     assert isinstance(fail(values={'shot': 5}), TypeError)
     raised = KeyError('mine')

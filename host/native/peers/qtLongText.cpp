@@ -80,9 +80,9 @@ TextLines breakIntoLines(QString const& whole, QFont const& font, int width, int
         QString const last = paragraph.mid(breaks.back());
         start = end + 1;
         bool const isFull = lines.size() + 1 == most;
-        result.isCut = isFull && (start <= size || isLonger || !fits(metrics, last, width));
+        result.isCut = isLonger || (isFull && (start <= size || !fits(metrics, last, width)));
         lines << (result.isCut ? cut(metrics, last, width) : last);
-        if (isFull)
+        if (isFull || isLonger)
             break;
     }
     result.isCut = result.isCut || text.size() < whole.size();
