@@ -34,14 +34,19 @@ void pointAt(QWidget& widget, QPoint const& place)
 
 void clickAt(QWidget& widget, QPoint const& place, Qt::KeyboardModifiers modifiers = {})
 {
-    QPointer<QWindow> const window = widget.window()->windowHandle();
+    QPointer<QWidget> const shell(widget.window());
+    QPointer<QWindow> const window = shell->windowHandle();
     QPoint const position = widget.mapTo(widget.window(), place);
     pointAt(widget, place);
     // An open popup, such as suggestions for a path, would take the first click to go.
     QWidget* const popup = QApplication::activePopupWidget();
-    if (popup && popup != widget.window())
+    if (popup && popup != shell)
         popup->close();
-    QTest::mousePress(window, Qt::LeftButton, modifiers, position);
+    // What the window system has still to say of a window that came or went would take the button's focus between press
+    // and release, and with it the click.
+    QGuiApplication::sync();
+    if (window)
+        QTest::mousePress(window, Qt::LeftButton, modifiers, position);
     // What was pressed may have gone.
     if (window)
         QTest::mouseRelease(window, Qt::LeftButton, modifiers, position);
