@@ -1,5 +1,6 @@
 #include "qtHand.h"
 
+#include <QAbstractButton>
 #include <QAbstractItemView>
 #include <QApplication>
 #include <QComboBox>
@@ -35,6 +36,7 @@ void pointAt(QWidget& widget, QPoint const& place)
 void clickAt(QWidget& widget, QPoint const& place, Qt::KeyboardModifiers modifiers = {})
 {
     QPointer<QWidget> const shell(widget.window());
+    QPointer<QAbstractButton> const button(qobject_cast<QAbstractButton*>(&widget));
     QPointer<QWindow> const window = shell->windowHandle();
     QPoint const position = widget.mapTo(widget.window(), place);
     pointAt(widget, place);
@@ -42,14 +44,18 @@ void clickAt(QWidget& widget, QPoint const& place, Qt::KeyboardModifiers modifie
     QWidget* const popup = QApplication::activePopupWidget();
     if (popup && popup != shell)
         popup->close();
-    // What the window system has still to say of a window that came or went would take the button's focus between press
-    // and release, and with it the click.
-    QGuiApplication::sync();
-    if (window)
+    constexpr int attempts = 3;
+    bool isTaken = false;
+    for (int attempt = 0; attempt < attempts && window && !isTaken; ++attempt)
+    {
         QTest::mousePress(window, Qt::LeftButton, modifiers, position);
-    // What was pressed may have gone.
-    if (window)
-        QTest::mouseRelease(window, Qt::LeftButton, modifiers, position);
+        // What the window system had still to say of a popup that has gone takes the press away from a button: a person
+        // presses again.
+        isTaken = !button || button->isDown();
+        // What was pressed may have gone.
+        if (window)
+            QTest::mouseRelease(window, Qt::LeftButton, modifiers, position);
+    }
 }
 
 void pressKey(QWindow& window, int key, QString const& text, Qt::KeyboardModifiers modifiers = {})

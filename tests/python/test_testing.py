@@ -10,7 +10,9 @@ import scripts
 import stage
 from forms import listen, make_dialog
 from quorvane_velmora import testing, ui
-from PyQt6.QtWidgets import QDialog, QWidget
+from PyQt6.QtCore import QEvent, QObject, QTimer, Qt
+from PyQt6.QtGui import QFocusEvent
+from PyQt6.QtWidgets import QApplication, QDialog, QWidget
 
 pytestmark = pytest.mark.screen
 
@@ -118,6 +120,24 @@ def test_far_rows_and_entries_are_scrolled_to(person):
     values = ui.showSimpleDialog('Long', [*rows, ('Menu', 'Menu', '', (['entry %d' % entry for entry in range(300)], 0))],
                                  400, False)
     assert (values['field299'], values['Menu'], values['field0']) == ('z', 'entry 277', 'a')
+
+
+class Thief(QObject):
+    """Takes the keyboard's focus from a button that is pressed, as the late news of a popup does; once."""
+
+    def eventFilter(self, button, event):
+        if event.type() == QEvent.Type.MouseButtonPress:
+            button.removeEventFilter(self)
+            focusOut = QFocusEvent(QEvent.Type.FocusOut, Qt.FocusReason.ActiveWindowFocusReason)
+            QTimer.singleShot(0, lambda: QApplication.sendEvent(button, focusOut))
+        return False
+
+
+def test_a_press_that_the_window_system_takes_away_is_repeated(person):
+    thief = Thief()
+    person.answer('Publish', {'shot': 'a'}, 'OK',
+                  do=lambda _: stage.active().findChild(QWidget, 'CloseButton_OK').installEventFilter(thief))
+    assert show()['CloseButtonClicked'] == 'CloseButton_OK'
 
 
 def cover(person):
