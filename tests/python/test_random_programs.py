@@ -223,8 +223,9 @@ class Program:
             self.check()
         if self.randomly.random() < 0.1:
             self.launch()
-            if self.dialog is not None:
-                self.check()
+            if self.dialog is None:
+                return
+            self.check()
         if self.randomly.random() < 0.3:
             self.be_hostile()
 
