@@ -200,7 +200,7 @@ void WidgetListGenerator::writeCloseButton(std::string const& label, int x, int 
 
 WidgetListGenerator::WidgetEntry WidgetListGenerator::readWidgetEntry(int index) const
 {
-    bp::tuple const entry = castTo<bp::tuple>(_widgets[index]);
+    auto const entry = castTo<bp::tuple>(_widgets[index]);
     int const length = lengthOf(entry);
     if (length < 2)
         throw UiError(__FILE__, __LINE__, "Incomplete widget description");
@@ -323,8 +323,8 @@ void WidgetListGenerator::writeStateValue(bp::object const& value)
 
 void WidgetListGenerator::writeMenuValue(bp::object const& value)
 {
-    bp::tuple const form = castTo<bp::tuple>(value);
-    bp::list const items = castTo<bp::list>(form[0]);
+    auto const form = castTo<bp::tuple>(value);
+    auto const items = castTo<bp::list>(form[0]);
     int const selection = bp::extract<int>(form[1]);
     _writer->openTag("MenuString");
     int const count = lengthOf(items);
