@@ -34,6 +34,14 @@ QString describe(CompositionEntry const& entry)
     return text;
 }
 
+/// A text as a cell shows it: Qt takes seconds to draw one that is much longer than the screen is wide.
+QString toCell(std::string const& text)
+{
+    constexpr qsizetype most = 4096;
+    QString const whole = QString::fromStdString(text);
+    return whole.size() <= most ? whole : whole.left(most) + QChar(0x2026);
+}
+
 } // namespace
 
 CompositionPane::CompositionPane(QWidget* parent, std::function<void(int)> onChosen)
@@ -86,12 +94,11 @@ void CompositionPane::showNodes(Kv::RCShdPtr<const Kv::PiGraph> const& graph)
         return;
     for (auto const& node : graph->getNodes())
     {
-        auto* const item = new QTreeWidgetItem(
-            _nodes, {QString::fromStdString(node->getName()), QString::fromStdString(node->getType())});
+        auto* const item = new QTreeWidgetItem(_nodes, {toCell(node->getName()), toCell(node->getType())});
         for (auto const& [name, other] : node->getInputs())
-            new QTreeWidgetItem(item, {QString::fromStdString(name), QString::fromStdString(other)});
+            new QTreeWidgetItem(item, {toCell(name), toCell(other)});
         for (auto const& [name, text] : node->getValues())
-            new QTreeWidgetItem(item, {QString::fromStdString(name), QString::fromStdString(text)});
+            new QTreeWidgetItem(item, {toCell(name), toCell(text)});
         item->setExpanded(true);
     }
     _nodes->resizeColumnToContents(0);

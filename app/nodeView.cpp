@@ -25,6 +25,12 @@ constexpr double margin = 40;
 /// Texts that are drawn smaller than this cannot be read.
 constexpr double leastTextScale = 0.1;
 
+/// What can be seen of a text in a box: never more characters than pixels.
+QString toSeen(std::string const& text)
+{
+    return QString::fromStdString(text).left(static_cast<int>(boxWidth));
+}
+
 using Inputs = std::vector<std::vector<std::size_t>>;
 
 /// The number of steps from each node to one without inputs. Each is visited once, after its inputs; of a ring of nodes
@@ -100,8 +106,7 @@ void NodeView::show(Kv::RCShdPtr<const Kv::PiGraph> const& graph)
         auto const column = static_cast<double>(depths[i]);
         auto const row = static_cast<double>(rows[depths[i]]++);
         QRectF const place(column * (boxWidth + columnGap), row * (boxHeight + rowGap), boxWidth, boxHeight);
-        _boxes.push_back({QString::fromStdString(nodes[i]->getName()), QString::fromStdString(nodes[i]->getType()),
-                          place, inputs[i]});
+        _boxes.push_back({toSeen(nodes[i]->getName()), toSeen(nodes[i]->getType()), place, inputs[i]});
         _extent = _extent.expandedTo(QSizeF(place.right(), place.bottom()));
     }
 }

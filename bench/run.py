@@ -3,6 +3,7 @@
     ./run bench                       the table, and the plot in docs/images/cost.png
     ./run bench --against REVISION    what is slower than in another revision of the project
     ./run bench --only WORDS          the measures whose name has the words in it
+    ./run bench --size                how the cost grows with the size of texts, menus and forms
 """
 
 import argparse
@@ -24,6 +25,7 @@ if 'DISPLAY' not in os.environ:
 import plot
 import quorvane_velmora
 import sides
+import size
 import tree
 from quorvane_velmora import ui
 
@@ -313,10 +315,13 @@ def build_revision(revision):
 parser = argparse.ArgumentParser(description=__doc__, formatter_class=argparse.RawDescriptionHelpFormatter)
 parser.add_argument('--against', metavar='REVISION')
 parser.add_argument('--only', metavar='WORDS', default='')
+parser.add_argument('--size', action='store_true')
 parser.add_argument('--ours', action='store_true', help=argparse.SUPPRESS)
 arguments = parser.parse_args()
 if arguments.against:
     compare(arguments.against, arguments.only)
+elif arguments.size:
+    size.print_sizes()
 elif arguments.ours:
     measure_ours(arguments.only)
 else:

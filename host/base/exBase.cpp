@@ -11,6 +11,28 @@ namespace Kv
 namespace
 {
 
+bool isInsideCharacter(char byte)
+{
+    constexpr unsigned char mask = 0xc0;
+    constexpr unsigned char inside = 0x80;
+    return (static_cast<unsigned char>(byte) & mask) == inside;
+}
+
+/// Takes out the middle of words that nobody would read to their end. What is wrong stands at either end.
+std::string shorten(std::string text)
+{
+    constexpr std::size_t half = ExBase::mostBytes / 2;
+    if (text.size() <= ExBase::mostBytes)
+        return text;
+    std::size_t from = half;
+    std::size_t to = text.size() - half;
+    while (from > 0 && isInsideCharacter(text[from]))
+        --from;
+    while (to < text.size() && isInsideCharacter(text[to]))
+        ++to;
+    return text.replace(from, to - from, " … ");
+}
+
 std::string makeReadable(std::string text)
 {
     auto bad = utf8::find_invalid(text.begin(), text.end());
@@ -28,7 +50,7 @@ std::string makeReadable(std::string text)
 } // namespace
 
 ExBase::ExBase(char const* sourcePath, int line, std::string reason)
-    : _reason(makeReadable(std::move(reason))),
+    : _reason(makeReadable(shorten(std::move(reason)))),
       _detailedReason(_reason + " (" + sourcePath + ":" + std::to_string(line) + ")")
 {
 }

@@ -2,6 +2,7 @@
 
 #include "kvExport.h"
 
+#include <cstddef>
 #include <exception>
 #include <string>
 
@@ -12,6 +13,9 @@ namespace Kv
 class KV_API ExBase : public std::exception
 {
 public:
+    /// The bytes beyond which a reason loses its middle. There is room for the longest of paths.
+    static constexpr std::size_t mostBytes = 10'000;
+
     /// `sourcePath` and `line` tell where it is thrown, `reason` what is wrong. Bytes of the reason that are no UTF-8,
     /// as those of a path can be, stand as escapes in it.
     ExBase(char const* sourcePath, int line, std::string reason);

@@ -1,9 +1,11 @@
 #include "qtHand.h"
 
+#include <QAbstractButton>
 #include <QAbstractItemView>
 #include <QApplication>
 #include <QComboBox>
 #include <QKeySequence>
+#include <QLineEdit>
 #include <QPointer>
 #include <QScrollArea>
 #include <QTest>
@@ -33,17 +35,27 @@ void pointAt(QWidget& widget, QPoint const& place)
 
 void clickAt(QWidget& widget, QPoint const& place, Qt::KeyboardModifiers modifiers = {})
 {
-    QPointer<QWindow> const window = widget.window()->windowHandle();
+    QPointer<QWidget> const shell(widget.window());
+    QPointer<QAbstractButton> const button(qobject_cast<QAbstractButton*>(&widget));
+    QPointer<QWindow> const window = shell->windowHandle();
     QPoint const position = widget.mapTo(widget.window(), place);
     pointAt(widget, place);
     // An open popup, such as suggestions for a path, would take the first click to go.
     QWidget* const popup = QApplication::activePopupWidget();
-    if (popup && popup != widget.window())
+    if (popup && popup != shell)
         popup->close();
-    QTest::mousePress(window, Qt::LeftButton, modifiers, position);
-    // What was pressed may have gone.
-    if (window)
-        QTest::mouseRelease(window, Qt::LeftButton, modifiers, position);
+    constexpr int attempts = 3;
+    bool isTaken = false;
+    for (int attempt = 0; attempt < attempts && window && !isTaken; ++attempt)
+    {
+        QTest::mousePress(window, Qt::LeftButton, modifiers, position);
+        // What the window system had still to say of a popup that has gone takes the press away from a button: a person
+        // presses again.
+        isTaken = !button || button->isDown();
+        // What was pressed may have gone.
+        if (window)
+            QTest::mouseRelease(window, Qt::LeftButton, modifiers, position);
+    }
 }
 
 void pressKey(QWindow& window, int key, QString const& text, Qt::KeyboardModifiers modifiers = {})
@@ -75,6 +87,8 @@ QString QtHand::findObstacle(QWidget& widget)
         return QStringLiteral("is hidden");
     if (!widget.isEnabled())
         return QStringLiteral("is disabled");
+    if (auto const* const field = qobject_cast<QLineEdit*>(&widget); field && field->isReadOnly())
+        return QStringLiteral("is read-only");
     scrollIntoView(widget);
     if (widget.visibleRegion().isEmpty())
         return QStringLiteral("is out of sight");

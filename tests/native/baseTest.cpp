@@ -193,6 +193,20 @@ TEST(Exceptions, SayWhatWentWrongInPlainWords)
               "Cannot cast int* to plain text");
 }
 
+TEST(Exceptions, LoseTheMiddleOfWordsThatAreTooLong)
+{
+    std::string const bad(100'000, '\xff');
+    std::string const words = ExBase("source.cpp", 1, "begin " + bad + "\u00e4 end").getReason();
+    EXPECT_LT(words.size(), 5 * ExBase::mostBytes);
+    EXPECT_EQ(words.substr(0, 10), "begin \\xff");
+    EXPECT_EQ(words.substr(words.size() - 9), "xff\u00e4 end");
+    // Nothing of a character is left where the middle went.
+    std::string text;
+    while (text.size() < 2 * ExBase::mostBytes)
+        text += "\u20ac";
+    EXPECT_EQ(std::string(ExBase("source.cpp", 1, "x" + text).getReason()).find("\\x"), std::string::npos);
+}
+
 TEST(CbDataMethod, GoesOnWithDataThatIsReleasedWhileItRuns)
 {
     struct Owner

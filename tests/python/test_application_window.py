@@ -378,3 +378,15 @@ def test_a_key_leads_to_each_pane_and_only_the_one_that_has_the_keyboard_has_a_b
         assert not any(count(one) for one in panes.values())
         ''', '--open', 'one.vmcomposition', '--open', 'two.vmcomposition', '--exit')
     assert printed == ['Browser.list', 'compositions', 'nodes', 'log']
+
+
+def test_cells_show_a_part_of_a_huge_text(tmp_path):
+    (tmp_path / 'huge.vmcomposition').write_text(
+        '<composition version="1"><node name="%s" type="T"><value name="v" text="%s"/></node></composition>'
+        % ('n' * 5000, 'v' * 1000000))
+    printed, _ = run_with_tools(tmp_path, '''
+        node = window.findChild(QTreeWidget, 'nodes').topLevelItem(0)
+        for cell in node.text(0), node.child(0).text(1):
+            print(len(cell), cell[-2:])
+        ''', '--open', 'huge.vmcomposition', '--exit')
+    assert printed == ['4097 n…', '4097 v…']

@@ -3,7 +3,7 @@
 import pytest
 
 import stage
-from descriptions import close_button, container
+from descriptions import close_button, container, widget
 from quorvane_velmora import ui
 from PyQt6.QtCore import QPoint
 
@@ -156,3 +156,14 @@ def test_deeper_nesting_is_refused_with_its_line(depth):
         ui.createDialog('deep', description)
     line = int(str(caught.value).partition(':')[0][len('line '):])
     assert depth == 5000 or '<Container><Widget Name="level 257">' in description.split('\n')[line - 1]
+
+
+def test_errors_that_quote_a_huge_text_lose_its_middle():
+    huge = 'x' * 10000000
+    dialog = ui.createDialog('t', container('c', widget('TextField', huge)))
+    for refused in (lambda: ui.createDialog('t', '<%s/>' % huge), lambda: ui.showDialog('t', huge),
+                    lambda: ui.createDialog('t', 'x', **{huge: 1}), lambda: dialog.setValue(huge, 5)):
+        with pytest.raises(Exception) as error:
+            refused()
+        words = [str(error.value), *error.value.__dict__.get('__notes__', [])]
+        assert max(map(len, words)) < 11000 and any('xxx … xxx' in one for one in words)

@@ -4,11 +4,12 @@ import pytest
 
 import stage
 from descriptions import close_button, container, text, widget
-from quorvane_velmora import ui
+from quorvane_velmora import testing, ui
 from PyQt6.QtCore import QEvent, QPoint, QPointF, QRect, Qt
 from PyQt6.QtGui import QContextMenuEvent, QFontMetrics, QHelpEvent, QMouseEvent
 from PyQt6.QtTest import QTest
-from PyQt6.QtWidgets import QApplication, QLabel, QMenu, QPushButton, QScrollBar, QStyle, QStyleOptionButton, QToolTip
+from PyQt6.QtWidgets import (QApplication, QLabel, QLineEdit, QMenu, QPushButton, QScrollBar, QStyle, QStyleOptionButton,
+                             QToolTip, QWidget)
 
 pytestmark = pytest.mark.usefixtures('no_wait_is_endless')
 
@@ -27,6 +28,16 @@ def ask_for_tip(widget):
         QTest.qWait(10)
     QApplication.sendEvent(widget, QHelpEvent(QEvent.Type.ToolTip, place, widget.mapToGlobal(place)))
     return QToolTip.text()
+
+
+def copy_from_menu(shown):
+    QApplication.sendEvent(shown, QContextMenuEvent(QContextMenuEvent.Reason.Mouse, QPoint(5, 14),
+                                                    shown.mapToGlobal(QPoint(5, 14))))
+    menu = QApplication.activePopupWidget()
+    assert isinstance(menu, QMenu)
+    menu.actions()[0].trigger()
+    menu.close()
+    return QApplication.clipboard().text()
 
 
 def seen_in_box(user, look, messages, buttons=()):
@@ -127,14 +138,7 @@ def test_a_text_is_selected_by_the_mouse_and_copied_and_a_click_takes_no_keyboar
         assert user.focus() != 'Msg'
 
     def copy_whole(user):
-        shown = label(user)
-        QApplication.sendEvent(shown, QContextMenuEvent(QContextMenuEvent.Reason.Mouse, QPoint(5, 14),
-                                                        shown.mapToGlobal(QPoint(5, 14))))
-        menu = QApplication.activePopupWidget()
-        assert isinstance(menu, QMenu)
-        menu.actions()[0].trigger()
-        menu.close()
-        copied.append(QApplication.clipboard().text())
+        copied.append(copy_from_menu(label(user)))
 
     copied = []
     user.plan(click_and_type, select, copy_whole, lambda user: user.close())
@@ -175,3 +179,69 @@ def test_nothing_in_a_title_is_a_sign_for_qt(user):
     user.plan(lambda user: seen.append(user.window().windowHandle().title()), lambda user: user.close())
     ui.showMessageBox('take [*] & <b>', ['?'])
     assert seen == ['take [*] & <b>'] and not stage.dialogs()
+
+
+# The characters that Qt gets of a text to draw, and of one in a row that never scrolls.
+MOST, MOST_IN_ROW = 100000, 4096
+
+
+def look_at_huge_texts(user):
+    """The sizes of all texts that the native widgets have, by what they are; the title and the menu's apart."""
+    window = user.window()
+    inner = window.findChildren(QWidget)
+    whole = [getattr(one, what)() for one in inner for what in ('toolTip', 'accessibleName', 'accessibleDescription')]
+    whole += [one.text() for one in inner if hasattr(one, 'text') and one.objectName() != 'titleBar']
+    return {MOST: whole, MOST_IN_ROW: [window.windowTitle(), user.find('Menu').itemText(0)]}
+
+
+@pytest.mark.parametrize('letter', ['x', 'word ', '\u0301', '\U0001f600', '\u05d0', 'ab\n', '\t'])
+def test_of_a_huge_text_qt_gets_a_part_and_the_script_has_the_whole(user, tmp_path, letter):
+    huge = letter * (3 * MOST // len(letter))
+    tips = tmp_path / 'tips.xml'
+    tips.write_text('<Tooltips><Tooltip Widget="Field">%s</Tooltip></Tooltips>' % huge)
+    dialog = ui.createDialog(huge, container('c', widget('Label', 'Msg', content=text(huge)), widget('TextField', 'Field'),
+                                             widget('PushButton', 'Button', content=text(huge)), widget('Menu', 'Menu'),
+                                             close_button('OK', *TOP)))
+    dialog.setValues({'Field': huge, 'Menu': ([huge, 'other'], 0)})
+    dialog.setWidgetResourceName('Field', str(tips))
+    found, copied = {}, []
+    user.plan(lambda user: found.update(look_at_huge_texts(user)), lambda user: copied.append(copy_from_menu(label(user))),
+              lambda user: user.close())
+    dialog.launch()
+    for most, texts in found.items():
+        # Emoji are two units for Qt; here they are one.
+        sizes = [len(shown.encode('utf-16-le')) // 2 for shown in texts]
+        assert max(sizes) in (most, most - 1)
+        assert all(shown[:50] == huge[:50] and shown[-1] == '…' for shown, size in zip(texts, sizes) if size > 1000)
+    assert copied == [huge] and dialog.getValues() == {'Field': huge, 'Menu': huge, 'CloseButtonClicked': 'CloseButton_OK'}
+
+
+def test_a_field_whose_text_is_too_long_is_looked_at_and_takes_no_edit(user):
+    huge = 'x' * (MOST + 1)
+    dialog = ui.createDialog('t', ui.makeXmlFromWidgetList([('TextField', 'Field'), ('TextField', 'Full')], ['OK']), 400, 150)
+    dialog.setValues({'Field': huge, 'Full': huge[:MOST]})
+    tips = []
+
+    def edit(name):
+        def step(user):
+            field = user.find(name, QLineEdit)
+            field.setFocus()
+            field.selectAll()
+            tips.append(ask_for_tip(field))
+            user.press(Qt.Key.Key_Delete)
+            user.type('typed')
+            user.press(Qt.Key.Key_Z, Qt.KeyboardModifier.ControlModifier)
+            user.press(Qt.Key.Key_Return)
+        return step
+
+    def paste(user):
+        QApplication.clipboard().setText(huge + huge)
+        user.find('Full').setFocus()
+        user.press(Qt.Key.Key_V, Qt.KeyboardModifier.ControlModifier)
+
+    user.plan(edit('Field'), lambda user: tips.append(dialog.getValue('Field') == huge),
+              lambda user: dialog.setValue('Field', 'short'), edit('Field'), paste, lambda user: user.close())
+    dialog.launch()
+    assert tips == ['A text of 100001 characters is too long to be edited here.', True, '']
+    # What is pasted ends where nothing more would be shown.
+    assert dialog.getValue('Field') == 'short' and dialog.getValue('Full') == huge[:MOST]

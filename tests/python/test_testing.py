@@ -10,7 +10,9 @@ import scripts
 import stage
 from forms import listen, make_dialog
 from quorvane_velmora import testing, ui
-from PyQt6.QtWidgets import QDialog, QWidget
+from PyQt6.QtCore import QEvent, QObject, QTimer, Qt
+from PyQt6.QtGui import QFocusEvent
+from PyQt6.QtWidgets import QApplication, QDialog, QWidget
 
 pytestmark = pytest.mark.screen
 
@@ -120,6 +122,24 @@ def test_far_rows_and_entries_are_scrolled_to(person):
     assert (values['field299'], values['Menu'], values['field0']) == ('z', 'entry 277', 'a')
 
 
+class Thief(QObject):
+    """Takes the keyboard's focus from a button that is pressed, as the late news of a popup does; once."""
+
+    def eventFilter(self, button, event):
+        if event.type() == QEvent.Type.MouseButtonPress:
+            button.removeEventFilter(self)
+            focusOut = QFocusEvent(QEvent.Type.FocusOut, Qt.FocusReason.ActiveWindowFocusReason)
+            QTimer.singleShot(0, lambda: QApplication.sendEvent(button, focusOut))
+        return False
+
+
+def test_a_press_that_the_window_system_takes_away_is_repeated(person):
+    thief = Thief()
+    person.answer('Publish', {'shot': 'a'}, 'OK',
+                  do=lambda _: stage.active().findChild(QWidget, 'CloseButton_OK').installEventFilter(thief))
+    assert show()['CloseButtonClicked'] == 'CloseButton_OK'
+
+
 def cover(person):
     dialog = stage.active()
     field = dialog.findChild(QWidget, 'shot')
@@ -151,6 +171,12 @@ def test_widgets_that_take_no_input_are_not_touched(fail, change, word):
     getattr(dialog, change)(*['Text', False][:1 + (word == 'disabled')])
     assert 'cannot be filled: it is ' + word in str(fail(dialog.launch, values={'Text': 'x'}))
     assert dialog.getValue('Text') == 'old'
+
+
+def test_a_field_that_is_too_long_to_edit_is_not_filled(fail):
+    dialog = make_dialog('Publish')
+    dialog.setValue('Text', 'x' * 100001)
+    assert 'cannot be filled: it is read-only' in str(fail(dialog.launch, values={'Text': 'x'}))
 
 
 def test_a_wrong_value_and_an_exception_of_the_test_come_out_of_the_dialog_with_their_traceback(fail):

@@ -226,3 +226,27 @@ def test_the_close_button_stands_among_the_values_from_its_press_on(user):
         dialog.launch()
         assert dialog.getValues() == {'CloseButtonClicked': 'CloseButton_' + label}
     assert dialog.getValue('CloseButtonClicked') is None
+
+
+class Classless:
+    __class__ = property(lambda self: 1 / 0)
+
+
+class Pretended:
+    __slots__ = ()
+    __class__ = list
+
+
+def test_an_object_that_lies_about_its_class_is_refused_with_the_error_that_it_raises():
+    dialog = make()
+    as_list = [ui.makeXmlFromWidgetList, lambda thing: ui.showMessageBox('t', thing),
+               lambda thing: dialog.setValue('Prize', (thing, 0)),
+               lambda thing: ui.makeXmlFromWidgetList([('Menu', 'm', 'M', (thing, 0))])]
+    as_other = [dialog.setValues, lambda thing: dialog.setValue('Prize', thing),
+                lambda thing: ui.createDialog('t', '', 1, 1, thing), lambda thing: ui.makeXmlFromWidgetList([thing])]
+    for take in as_list:
+        with pytest.raises(AttributeError, match='__len__'):
+            take(Pretended())
+    for take in as_list + as_other:
+        with pytest.raises(ZeroDivisionError):
+            take(Classless())

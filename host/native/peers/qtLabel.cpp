@@ -56,9 +56,10 @@ QtLabel::QtLabel(QWidget* parent) : QLabel(parent)
 void QtLabel::setWords(QString const& words)
 {
     _words = words;
+    _shown = toShown(words);
     showWords();
     if (_isTitle)
-        parentWidget()->setAccessibleName(words);
+        parentWidget()->setAccessibleName(_shown);
     else
         nameSoon();
 }
@@ -71,7 +72,7 @@ void QtLabel::makeTitle()
     QFont bold = font();
     bold.setBold(true);
     setFont(bold);
-    parentWidget()->setAccessibleName(_words);
+    parentWidget()->setAccessibleName(_shown);
 }
 
 void QtLabel::setNamed(QWidget* widget)
@@ -79,7 +80,7 @@ void QtLabel::setNamed(QWidget* widget)
     if (widget == buddy())
         return;
     // With a buddy an ampersand marks a shortcut.
-    bool const hasAmpersand = _words.contains(QLatin1Char('&'));
+    bool const hasAmpersand = _shown.contains(QLatin1Char('&'));
     if (hasAmpersand)
         clear();
     setBuddy(widget);
@@ -99,7 +100,9 @@ bool QtLabel::event(QEvent* event)
 void QtLabel::enterEvent(QEnterEvent* event)
 {
     QLabel::enterEvent(event);
-    if (_isTitle || _words.isEmpty())
+    // Of a longer text Qt takes seconds to find what lies under the mouse. It can be copied all the same.
+    constexpr qsizetype mostSelectable = 10'000;
+    if (_isTitle || _words.isEmpty() || _words.size() > mostSelectable)
         return;
     // Only now: what makes a text selectable is costly, and few texts are ever selected in.
     setTextInteractionFlags(Qt::TextSelectableByMouse);
@@ -147,7 +150,7 @@ void QtLabel::paintEvent(QPaintEvent* event)
 
 void QtLabel::showWords()
 {
-    setText(buddy() ? withoutShortcuts(_words) : _words);
+    setText(buddy() ? withoutShortcuts(_shown) : _shown);
 }
 
 QRect QtLabel::getRoom() const

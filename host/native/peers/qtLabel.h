@@ -14,7 +14,8 @@ class QtLabel final : public QLabel
 public:
     explicit QtLabel(QWidget* parent);
 
-    QString const& getWords() const { return _words; }
+    /// The words that it shows; of too many not all.
+    QString const& getWords() const { return _shown; }
     void setWords(QString const& words);
 
     /// Makes it the title of what it stands in, which is dragged by it and called by it.
@@ -37,6 +38,7 @@ private:
     void nameSoon() const;
 
     QString _words;
+    QString _shown;
     bool _isTitle = false;
 };
 

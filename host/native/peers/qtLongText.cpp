@@ -1,5 +1,7 @@
 #include "peers/qtLongText.h"
 
+#include "peers/qtText.h"
+
 #include <QFontMetrics>
 #include <QGuiApplication>
 #include <QHelpEvent>
@@ -55,9 +57,10 @@ std::vector<int> findBreaks(QString const& paragraph, QFont const& font, int wid
 
 } // namespace
 
-TextLines breakIntoLines(QString const& text, QFont const& font, int width, int most)
+TextLines breakIntoLines(QString const& whole, QFont const& font, int width, int most)
 {
     QFontMetrics const metrics(font);
+    QString const text = toShown(whole);
     // More characters than pixels are never seen.
     qsizetype const limit = static_cast<qsizetype>(most) * std::max(width, 1);
     qsizetype size = text.size();
@@ -69,6 +72,7 @@ TextLines breakIntoLines(QString const& text, QFont const& font, int width, int 
     {
         qsizetype const next = text.indexOf(QLatin1Char('\n'), start);
         qsizetype const end = next < 0 ? size : std::min(next, size);
+        bool const isLonger = end - start > limit;
         QString const paragraph = text.mid(start, std::min(end - start, limit));
         std::vector<int> const breaks = findBreaks(paragraph, font, width, most - static_cast<int>(lines.size()));
         for (std::size_t line = 0; line + 1 < breaks.size(); ++line)
@@ -76,11 +80,12 @@ TextLines breakIntoLines(QString const& text, QFont const& font, int width, int 
         QString const last = paragraph.mid(breaks.back());
         start = end + 1;
         bool const isFull = lines.size() + 1 == most;
-        result.isCut = isFull && (start <= size || !fits(metrics, last, width));
+        result.isCut = isLonger || (isFull && (start <= size || !fits(metrics, last, width)));
         lines << (result.isCut ? cut(metrics, last, width) : last);
-        if (isFull)
+        if (isFull || isLonger)
             break;
     }
+    result.isCut = result.isCut || text.size() < whole.size();
     return result;
 }
 

@@ -15,9 +15,9 @@ struct TextLines
     bool isCut = false;
 };
 
-/// Breaks a text into lines, at its line ends and where a line would be wider than `width`, in pixels. It gives at most
-/// `most` of them, and one at least.
-TextLines breakIntoLines(QString const& text, QFont const& font, int width, int most);
+/// Breaks what is shown of a text into lines, at its line ends and where a line would be wider than `width`, in pixels.
+/// It gives at most `most` of them, and one at least.
+TextLines breakIntoLines(QString const& whole, QFont const& font, int width, int most);
 
 /// Breaks a text into as many lines as fit into the room.
 TextLines breakIntoLines(QString const& text, QFont const& font, QSize const& room);

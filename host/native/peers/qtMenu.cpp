@@ -154,7 +154,7 @@ public:
             return;
         // The first entry would select itself.
         int const selected = box->currentIndex();
-        box->addItem(toQString(entry));
+        box->addItem(toShown(toQString(entry), mostInRow));
         box->setCurrentIndex(selected);
     }
 

@@ -149,7 +149,7 @@ void QtPeer::setTooltip(std::string const& text)
         return;
     QString const tip = toQString(text);
     widget->setToolTip(toTooltip(tip));
-    widget->setAccessibleDescription(tip);
+    widget->setAccessibleDescription(toShown(tip));
 }
 
 void QtPeer::raise()

@@ -28,7 +28,7 @@ public:
     void setWords(QString const& words)
     {
         _words = words;
-        setText(withoutShortcuts(words));
+        setText(withoutShortcuts(toShown(words)));
     }
 
     void setAlign(NtAlign align)

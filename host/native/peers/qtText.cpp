@@ -11,6 +11,16 @@ QString toQString(std::string const& text)
     return decoder(QByteArrayView(text));
 }
 
+QString toShown(QString const& text, qsizetype most)
+{
+    if (text.size() <= most)
+        return text;
+    constexpr QChar ellipsis(0x2026);
+    qsizetype const end = most - 1;
+    // Half a character is none.
+    return text.left(text[end - 1].isHighSurrogate() ? end - 1 : end) + ellipsis;
+}
+
 QString withoutShortcuts(QString text)
 {
     return text.replace(QLatin1Char('&'), QLatin1String("&&"));

@@ -13,6 +13,16 @@ namespace Kv
 /// order mark where it stands first.
 QString toQString(std::string const& text);
 
+/// The most characters of a text that Qt gets to draw: for more it takes a second.
+inline constexpr qsizetype mostShown = 100'000;
+
+/// The same for a text in one row that never scrolls: no screen shows more.
+inline constexpr qsizetype mostInRow = 4096;
+
+/// What Qt gets of a text to draw, and what is measured of it: the whole, or as many characters with an ellipsis at the
+/// end. Who has to tell whether something is missing compares the sizes.
+QString toShown(QString const& text, qsizetype most = mostShown);
+
 /// A text for where Qt takes a lone ampersand for the mark of a shortcut: each stands for itself.
 QString withoutShortcuts(QString text);
 

@@ -1,4 +1,5 @@
 #include "ntTextField.h"
+#include "peers/qtLongText.h"
 #include "peers/qtPeer.h"
 #include "peers/qtText.h"
 #include "windows/qtFocusOrder.h"
@@ -6,8 +7,6 @@
 #include <QKeyEvent>
 #include <QLineEdit>
 #include <QMouseEvent>
-
-#include <limits>
 
 namespace Kv
 {
@@ -20,12 +19,34 @@ class LineEdit final : public QLineEdit, public QtValueWidget
 public:
     LineEdit(QWidget* parent, QtListenerHandle<NtTextFieldListener> const& handle) : QLineEdit(parent), _handle(handle)
     {
-        setMaxLength(std::numeric_limits<int>::max());
+        // What the user adds beyond would be cut off the next time.
+        setMaxLength(mostShown);
         connect(this, &QLineEdit::textEdited, this, [this] { tellEdited(); });
         connect(this, &QLineEdit::returnPressed, this, [this] { tellEnded(); });
     }
 
+    /// Shows a text. One that is too long for Qt is only looked at: an edit of what is shown would lose the rest.
+    void showText(QString const& text, bool cursorAtEnd)
+    {
+        QString const shown = toShown(text);
+        _size = text.size();
+        setReadOnly(shown.size() < _size);
+        // The same text again would lose the user's selection and undo steps.
+        if (shown == this->text())
+            return;
+        setText(shown);
+        setCursorPosition(cursorAtEnd ? static_cast<int>(shown.size()) : 0);
+    }
+
 protected:
+    bool event(QEvent* event) override
+    {
+        if (event->type() == QEvent::ToolTip && isReadOnly())
+            return showWhole(*this, *event,
+                             QStringLiteral("A text of %1 characters is too long to be edited here.").arg(_size));
+        return QLineEdit::event(event);
+    }
+
     void keyPressEvent(QKeyEvent* event) override
     {
         QLineEdit::keyPressEvent(event);
@@ -61,6 +82,7 @@ private:
     }
 
     QtListenerHandle<NtTextFieldListener> _handle;
+    qsizetype _size = 0;
 };
 
 /// A line edit.
@@ -74,13 +96,8 @@ public:
 
     void setText(std::string const& text, bool cursorAtEnd) override
     {
-        LineEdit* const field = getNative();
-        QString const newText = toQString(text);
-        // The same text again would lose the user's selection and undo steps.
-        if (!field || field->text() == newText)
-            return;
-        field->setText(newText);
-        field->setCursorPosition(cursorAtEnd ? static_cast<int>(newText.size()) : 0);
+        if (LineEdit* const field = getNative())
+            field->showText(toQString(text), cursorAtEnd);
     }
 
     void setAlign(NtAlign align) override

@@ -68,18 +68,6 @@ double measure(QString const& text)
     return buttonFont == labelFont ? width : std::max(width, measureIn(buttonFont, text));
 }
 
-/// False for a text with a line far wider than any screen, and for one of a thousand pages: Qt takes seconds for them.
-bool isQuicklyMeasured(QString const& text)
-{
-    constexpr qsizetype longest = 20000;
-    constexpr qsizetype largest = 1000000;
-    if (text.size() <= longest)
-        return true;
-    QVector<QStringView> const lines = QStringView(text).split(QLatin1Char('\n'));
-    return text.size() <= largest &&
-           std::all_of(lines.begin(), lines.end(), [](QStringView line) { return line.size() <= longest; });
-}
-
 /// The height that is left free for the window manager's frame, which is known only when it is too late.
 constexpr int titleBarRoom = 40;
 
@@ -127,8 +115,7 @@ void QtPlatform::setScriptHook(NtScriptHook* hook)
 float QtPlatform::measureText(std::string const& text)
 {
     QString const string = toQString(text);
-    bool const isMeasured = _application.hasGui() && isQuicklyMeasured(string);
-    double const width = isMeasured ? measure(string) : estimateTextWidth(string);
+    double const width = _application.hasGui() ? measure(toShown(string)) : estimateTextWidth(string);
     return static_cast<float>(std::ceil(width));
 }
 

@@ -242,7 +242,7 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, std::strin
     // No screen shows more, and a window system can end the process for it.
     constexpr int maxTitle = 1024;
     // Doubled, what marks a changed document for Qt stands for itself.
-    native->setWindowTitle(toQString(title).left(maxTitle).replace(QLatin1String("[*]"), QLatin1String("[*][*]")));
+    native->setWindowTitle(toShown(toQString(title), maxTitle).replace(QLatin1String("[*]"), QLatin1String("[*][*]")));
     // Where the application is a script's own, it has no icon as a rule.
     if (QApplication::windowIcon().isNull())
         native->setWindowIcon(getWindowIcon());

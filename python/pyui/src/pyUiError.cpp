@@ -15,12 +15,21 @@ namespace Kv::PyextUi
 namespace
 {
 
+/// A note whose middle goes where nobody would read it to its end.
+bp::object shorten(bp::object const& note)
+{
+    constexpr long half = ExBase::mostBytes / 2;
+    if (bp::len(note) <= 2 * half)
+        return note;
+    return note.slice(0, half) + bp::str(" … ") + note.slice(-half, bp::_);
+}
+
 /// Does the work of `add_note`, which Python has from 3.11 on.
 void appendNote(bp::object error, bp::object const& note)
 {
     if (!PyObject_HasAttrString(error.ptr(), "__notes__"))
         error.attr("__notes__") = bp::list();
-    error.attr("__notes__").attr("append")(note);
+    error.attr("__notes__").attr("append")(shorten(note));
 }
 
 } // namespace
@@ -117,8 +126,34 @@ bp::object describeFault(PyObject* function, PyObject* arguments, PyObject* keyw
     return fault.empty() ? bp::object() : bp::object(fault);
 }
 
+/// False, with the error set, for an argument whose `__class__` raises. Boost.Python would take it for a list or a
+/// dict, and make the call with the error set.
+bool hasClass(PyObject* argument)
+{
+    if (!PyType_HasFeature(Py_TYPE(argument), Py_TPFLAGS_HEAPTYPE))
+        return true;
+    static PyObject* const name = PyUnicode_InternFromString("__class__");
+    PyObject* const type = PyObject_GetAttr(argument, name);
+    Py_XDECREF(type);
+    return type;
+}
+
+bool haveClasses(PyObject* arguments, PyObject* keywords)
+{
+    for (Py_ssize_t i = 0; i < PyTuple_GET_SIZE(arguments); ++i)
+        if (!hasClass(PyTuple_GET_ITEM(arguments, i)))
+            return false;
+    PyObject* value = nullptr;
+    for (Py_ssize_t place = 0; keywords && PyDict_Next(keywords, &place, nullptr, &value);)
+        if (!hasClass(value))
+            return false;
+    return true;
+}
+
 PyObject* callAndExplain(PyObject* function, PyObject* arguments, PyObject* keywords)
 {
+    if (!haveClasses(arguments, keywords))
+        return nullptr;
     PyObject* const result = Py_TYPE(function)->tp_base->tp_call(function, arguments, keywords);
     if (!result && keywords)
         addErrorNote([&] { return describeFault(function, arguments, keywords); });

@@ -106,7 +106,8 @@ WidgetListGenerator::~WidgetListGenerator() = default;
 
 std::string WidgetListGenerator::generate()
 {
-    TextBuffer buffer(PyList_GET_SIZE(_widgets.ptr()));
+    // What says of itself that it is a list need not be one.
+    TextBuffer buffer(PyList_Check(_widgets.ptr()) ? PyList_GET_SIZE(_widgets.ptr()) : 0);
     std::ostream stream(&buffer);
     _writer = std::make_unique<XmlWriter>(stream, 2);
     writeContainerHead("MainContainer", {1, "u", "l"}, {1, "u", "b"}, {-1, "uu", "r"}, {-4, "uu", "t"});
@@ -199,7 +200,7 @@ void WidgetListGenerator::writeCloseButton(std::string const& label, int x, int 
 
 WidgetListGenerator::WidgetEntry WidgetListGenerator::readWidgetEntry(int index) const
 {
-    bp::tuple const entry = bp::extract<bp::tuple>(_widgets[index]);
+    auto const entry = castTo<bp::tuple>(_widgets[index]);
     int const length = lengthOf(entry);
     if (length < 2)
         throw UiError(__FILE__, __LINE__, "Incomplete widget description");
@@ -322,8 +323,8 @@ void WidgetListGenerator::writeStateValue(bp::object const& value)
 
 void WidgetListGenerator::writeMenuValue(bp::object const& value)
 {
-    bp::tuple const form = bp::extract<bp::tuple>(value);
-    bp::list const items = bp::extract<bp::list>(form[0]);
+    auto const form = castTo<bp::tuple>(value);
+    auto const items = castTo<bp::list>(form[0]);
     int const selection = bp::extract<int>(form[1]);
     _writer->openTag("MenuString");
     int const count = lengthOf(items);

@@ -41,8 +41,8 @@ char const* readText(bp::object const& value)
 /// Gives the index that the value selects.
 int fillMenu(UiMenu& menu, bp::object const& value, MenuEntries mode)
 {
-    bp::tuple const form = bp::extract<bp::tuple>(value);
-    bp::list const entries = bp::extract<bp::list>(form[0]);
+    auto const form = castTo<bp::tuple>(value);
+    auto const entries = castTo<bp::list>(form[0]);
     int const count = lengthOf(entries);
     if (mode == MenuEntries::Replace)
         menu.removeAll();
