@@ -99,7 +99,7 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
     _signalTimer.start(signalInterval);
     if (hasScreen())
         _watch.emplace([this] { return _scriptRuns || _interpreter.isRunning(); }, [this] { stopScript(); });
-    int const status = QApplication::exec();
+    int const status = Kv::WsNative::getPlatform().runApplicationLoop();
     _watch.reset();
     _signalTimer.stop();
     _recovery->discard();
@@ -245,7 +245,8 @@ int Application::runScript(ScriptCall const& script)
     _window.tell(QObject::tr("%1 is running").arg(name));
     _window.note(QObject::tr("%1 is running").arg(name));
     _window.paintNow();
-    int const status = _interpreter.run(script);
+    int status = 0;
+    Kv::WsNative::getPlatform().callScript([&] { status = _interpreter.run(script); });
     _scriptRuns = false;
     checkSignals();
     _window.setRunning(false);

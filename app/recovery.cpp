@@ -126,7 +126,10 @@ void Recovery::follow()
         return;
     }
     std::string const failure = write();
-    if (!failure.empty() && !std::exchange(_isTold, true))
+    if (failure.empty())
+        return;
+    _timer.start(static_cast<int>(_pause));
+    if (!std::exchange(_isTold, true))
         _tell(QObject::tr("Changes that are not saved cannot be kept for the case of a crash: %1")
                   .arg(QString::fromStdString(failure)));
 }

@@ -14,7 +14,7 @@ import time
 import pytest
 
 from quorvane_velmora import graph
-from scripts import environment
+from scripts import TREE, environment, needs_pyqt, run_script
 
 pytestmark = pytest.mark.standalone
 
@@ -138,3 +138,129 @@ def test_a_save_that_cannot_be_done_is_refused_with_words_and_leaves_all_as_it_w
         assert left in ([], [path.name]) and (not left or read_mark(path) == 'old')
     shot.save()
     assert 'x' * 200000 in path.read_text() and os.listdir(path.parent) == [path.name]
+
+
+NO_HANDLES = '''
+import contextlib, os, resource, sys
+from quorvane_velmora import graph, testing, ui
+
+@contextlib.contextmanager
+def no_handles(left=0):
+    limits = resource.getrlimit(resource.RLIMIT_NOFILE)
+    resource.setrlimit(resource.RLIMIT_NOFILE, (max(map(int, os.listdir('/proc/self/fd'))) + 20, limits[1]))
+    taken = []
+    try:
+        while True:
+            taken.append(os.open('/dev/null', os.O_RDONLY))
+    except OSError:
+        pass
+    for _ in range(left):
+        os.close(taken.pop())
+    yield
+    for one in taken:
+        os.close(one)
+    resource.setrlimit(resource.RLIMIT_NOFILE, limits)
+
+def refused(words, call, *arguments):
+    try:
+        call(*arguments)
+    except (RuntimeError, graph.GraphError, ui.UiError) as refusal:
+        assert words in str(refusal), refusal
+    else:
+        raise AssertionError('not refused: ' + words)
+
+def make(title='Form', rows=1):
+    form = [('TextField', 'Show', 'Show'), ('PushButton', 'Go')] + [('TextField', str(row)) for row in range(rows)]
+    return ui.createDialog(title, ui.makeXmlFromWidgetList(form, ['OK']), 300 + rows, 112 + 28 * rows)
+
+def run(title, rows=1):
+    dialog = make(title, rows)
+    dialog.launch()
+    assert dialog.getValue('Show') == 'x'
+
+def fill(person, rows):
+    person.answer('Form', {'Show': 'x'}, 'OK')
+    run('Form', rows)
+
+def lose_in_callback(person):
+    with contextlib.ExitStack() as lost:
+        dialog = make()
+        dialog.addCallback('Go', ui.EventType.ACTIVATE, lambda *_: lost.enter_context(no_handles()) or run('Inner', 18))
+        person.answer('Form', press='Go')
+        person.answer('Inner', {'Show': 'x'}, 'OK')
+        person.answer('Form', {'Show': 'y'}, 'OK')
+        dialog.launch()
+        assert dialog.getValue('Show') == 'y'
+
+path = sys.argv[1]
+os.chdir(os.path.dirname(path))
+shot = graph.readComposition(path)
+for name, text in ('dialog.xml', ui.makeXmlFromWidgetList([], ['OK'])), ('tips.xml', '<Tooltips/>'):
+    with open(name, 'w') as file:
+        file.write(text)
+
+def refuse_files():
+    refused('Too many open files', graph.readComposition, path)
+    refused('Too many open files', shot.save)
+    refused('Error opening file', ui.showDialog, 'Form', 'dialog.xml')
+'''
+
+
+@pytest.mark.parametrize('left', [0, 1, 3, 8])
+@pytest.mark.parametrize('platform', ['offscreen', 'xcb'])
+def test_without_file_handles_all_is_refused_with_words_or_works_and_works_again_with_them(path, request, platform, left):
+    shown = {'DISPLAY': request.getfixturevalue('screen')} if platform == 'xcb' else {}
+    run_script(NO_HANDLES + '''
+left = int(sys.argv[2])
+with no_handles(left):
+    refused('too few file handles', make)  # the first that needs Qt
+    if left == 0:
+        refuse_files()
+with testing.person() as person:
+    fill(person, 1)
+    dialog = make()
+    with no_handles():
+        refuse_files()
+        refused('Too many open files', dialog.setWidgetResourceName, 'Show', './tips.xml')
+        fill(person, 10)
+    dialog.setWidgetResourceName('Show', './tips.xml')
+    lose_in_callback(person)
+    fill(person, 20)
+shot.save()
+graph.readComposition(path)
+''', str(path), str(left), QT_QPA_PLATFORM=platform, **shown)
+
+
+
+@needs_pyqt
+def test_the_application_goes_on_where_a_script_leaves_no_file_handles(path, desk):
+    (path.parent / 'lose.py').write_text(NO_HANDLES + '''
+lost = contextlib.ExitStack()
+lost.enter_context(no_handles())
+with testing.person() as person:
+    person.answer('Pick', do=lambda person: lost.close())
+    person.answer('Pick', {'Files': 'lose.py'}, 'OK')
+    assert ui.showBrowser('Pick', os.getcwd()).endswith('lose.py')
+lost.enter_context(no_handles())
+shot, = ui.Workspace.getCompositions()
+shot.setNodeValue('n0', 'file', 'new')
+shot.setNodeValue('n%d', 'file', 'new')
+refuse_files()
+print('lost', flush=True)
+''' % (ROWS - 1))
+    state = path.parent.parent / 'state'
+    application = desk.start('env', 'XDG_STATE_HOME=%s' % state, str(TREE / 'bin' / 'velmora'), '--open', str(path),
+                             str(path.parent / 'lose.py'), str(path))
+    assert application.stdout.readline() == 'lost\n'
+    window = desk.find_window('shot.*Velmora')
+    for _ in range(200):
+        if list(state.rglob('shot.1.vmrecovery')):
+            break
+        time.sleep(0.05)
+    assert 'new' in (state / 'velmora' / 'recovery' / 'shot.1.vmrecovery').read_text()
+    desk.run('windowsize', window, 1270, 1000, 'key', 'alt+h', 'Down', 'Return')
+    desk.wait_for_window('Build Information')
+    desk.run('key', 'Escape')
+    desk.wait_for_window('shot.*Velmora')
+    desk.run('key', 'ctrl+s', 'ctrl+q')
+    assert application.wait() == 0 and read_mark(path) == 'new'

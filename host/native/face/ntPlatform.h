@@ -111,6 +111,12 @@ public:
     /// thrown on from here. When the application is asked to quit, `*end` is set to true. Loops nest.
     virtual void runLoop(bool const volatile* until, bool volatile* end) = 0;
 
+    /// Runs the application's own loop, in which those of dialogs nest. Gives the status that it was ended with.
+    virtual int runApplicationLoop() = 0;
+
+    /// Calls what runs a script in that loop.
+    virtual void callScript(std::function<void()> const& call) = 0;
+
     /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.
     virtual void endLoop() = 0;
 

@@ -1,6 +1,7 @@
 #include "loop/qtGuard.h"
 
 #include "loop/qtLoop.h"
+#include "loop/qtSpareHandles.h"
 
 #include <QThread>
 
@@ -83,6 +84,7 @@ void QtGuard::run(std::function<void()> const& call) noexcept
 {
     {
         InterpreterHold const hold(*_hook);
+        QtSpareHandles::Pause const pause;
         ++_depth;
         quint64 const outerCall = std::exchange(_currentCall, ++_calls);
         try

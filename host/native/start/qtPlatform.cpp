@@ -2,6 +2,7 @@
 
 #include "loop/qtDisposal.h"
 #include "loop/qtLoop.h"
+#include "loop/qtSpareHandles.h"
 #include "peers/qtPeer.h"
 #include "peers/qtText.h"
 #include "start/qtTextEstimate.h"
@@ -109,6 +110,7 @@ QRect fitToScreen(GeRectangle<int> const& frame)
 QtPlatform::QtPlatform()
 {
     QtContentArea::noticeReaders();
+    QtSpareHandles::reserve();
 }
 
 void QtPlatform::setScriptHook(NtScriptHook* hook)
@@ -194,6 +196,8 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     QWidget const* const stage = window ? window.data() : static_cast<QWidget*>(QtFrontOrder::getInstance().getFront());
     std::exception_ptr error;
     {
+        QtSpareHandles::Turn const turn;
+        QtSpareHandles::require();
         QtLoop loop(until, end);
         // Where somebody destroys what runs, nobody could end it any more.
         if (stage)
@@ -206,6 +210,18 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     if (window)
         window->stopWaiting();
     QtGuard::getInstance().getScriptHook().rethrow(error);
+}
+
+int QtPlatform::runApplicationLoop()
+{
+    QtSpareHandles::Turn const turn;
+    return QApplication::exec();
+}
+
+void QtPlatform::callScript(std::function<void()> const& call)
+{
+    QtSpareHandles::Pause const pause;
+    call();
 }
 
 void QtPlatform::refuseLoop()

@@ -32,6 +32,8 @@ public:
 
     void callNextTurn(std::function<void()> call) override;
     void runLoop(bool const volatile* until, bool volatile* end) override;
+    int runApplicationLoop() override;
+    void callScript(std::function<void()> const& call) override;
     void endLoop() override;
     void interruptLoop() override;
     void closeLoops() override;

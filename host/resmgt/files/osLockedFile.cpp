@@ -1,5 +1,6 @@
 #include "files/osLockedFile.h"
 
+#include "files/osPlace.h"
 #include "files/osTemporaryFile.h"
 
 #include <cerrno>
@@ -30,7 +31,7 @@ OsLockedFile OsLockedFile::create(OsFilePath const& folder, std::string const& b
 {
     for (int number = 1;; ++number)
     {
-        OsFilePath const path(folder.toString() + "/" + begin + std::to_string(number) + end);
+        OsFilePath const path(OsPlace::join(folder.toString(), begin + std::to_string(number) + end));
         OsFileDescriptor file(::open(path.getChars(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, forUserAlone));
         require(file.isOpen() || errno == EEXIST);
         if (!file.isOpen())
