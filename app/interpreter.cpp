@@ -106,21 +106,26 @@ void onStop(int, bp::object const&)
     bp::throw_error_already_set();
 }
 
+/// Lets others alone, such as what the parent has the process ignore.
+void replaceKillHandler(sighandler_t former, sighandler_t handler)
+{
+    for (int const number : {SIGTERM, SIGHUP})
+    {
+        struct sigaction action = {};
+        sigaction(number, nullptr, &action);
+        if (action.sa_handler != former)
+            continue;
+        action.sa_handler = handler;
+        sigaction(number, &action, nullptr);
+    }
+}
+
 /// Scripts are told that nobody hears of these signals, and can hear of them themselves.
 void hearOfKills()
 {
     process = getpid();
     mainThread = pthread_self();
-    for (int const number : {SIGTERM, SIGHUP})
-    {
-        struct sigaction action = {};
-        sigaction(number, nullptr, &action);
-        // What the parent has ignored stays so.
-        if (action.sa_handler != SIG_DFL)
-            continue;
-        action.sa_handler = &onKill;
-        sigaction(number, &action, nullptr);
-    }
+    replaceKillHandler(SIG_DFL, &onKill);
 }
 
 } // namespace
@@ -260,6 +265,7 @@ int Interpreter::finish(int status)
     PyEval_RestoreThread(static_cast<PyThreadState*>(_threadState));
     _threadState = nullptr;
     _runner.reset();
+    replaceKillHandler(&onKill, SIG_DFL);
     constexpr int lostOutput = 120;
     return Py_FinalizeEx() < 0 && status == 0 ? lostOutput : status;
 }

@@ -31,7 +31,9 @@ OsLockedFile OsLockedFile::create(OsFilePath const& folder, std::string const& b
 {
     for (int number = 1;; ++number)
     {
-        OsFilePath const path(OsPlace::join(folder.toString(), begin + std::to_string(number) + end));
+        std::string name = begin;
+        name.append(std::to_string(number)).append(end);
+        OsFilePath const path(OsPlace::join(folder.toString(), name));
         OsFileDescriptor file(::open(path.getChars(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, forUserAlone));
         require(file.isOpen() || errno == EEXIST);
         if (!file.isOpen())
