@@ -62,7 +62,7 @@ def test_a_process_that_is_killed_at_any_moment_of_its_saves_leaves_the_old_file
     print('seed', seed)
     chance = random.Random(seed)
     saves = 0
-    for _ in range(25):
+    while saves < 100:
         process = subprocess.Popen([sys.executable, '-c', SAVING, str(path)], env=environment(), text=True,
                                    stdout=subprocess.PIPE)
         assert process.stdout.readline() == 'reads\n'
@@ -73,7 +73,6 @@ def test_a_process_that_is_killed_at_any_moment_of_its_saves_leaves_the_old_file
         saves += len(told)
         assert read_mark(path) in ((told[-1], str(int(told[-1]) + 1)) if told else (before, '0'))
         assert len(os.listdir(path.parent)) <= 2, 'what one leaves goes with the next save'
-    assert saves > 100
     graph.readComposition(path).save()
     assert os.listdir(path.parent) == [path.name]
 
@@ -253,11 +252,10 @@ print('lost', flush=True)
                              str(path.parent / 'lose.py'), str(path))
     assert application.stdout.readline() == 'lost\n'
     window = desk.find_window('shot.*Velmora')
-    for _ in range(200):
-        if list(state.rglob('shot.1.vmrecovery')):
-            break
+    end = time.monotonic() + 30
+    while not any('"new"' in kept.read_text() for kept in state.rglob('*.vmrecovery')):
+        assert time.monotonic() < end
         time.sleep(0.05)
-    assert 'new' in (state / 'velmora' / 'recovery' / 'shot.1.vmrecovery').read_text()
     desk.run('windowsize', window, 1270, 1000, 'key', 'alt+h', 'Down', 'Return')
     desk.wait_for_window('Build Information')
     desk.run('key', 'Escape')
