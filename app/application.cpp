@@ -2,6 +2,7 @@
 
 #include "buildInfo.h"
 #include "pathQuestion.h"
+#include "recoveryQuestion.h"
 
 #include "exBase.h"
 #include "pointers/rcWeakPtr.h"
@@ -60,7 +61,7 @@ Kv::UiConstraint makeFilling()
 } // namespace
 
 Application::Application(Interpreter& interpreter, ScriptOutput& output, bool remembers)
-    : _settings(remembers), _interpreter(interpreter), _window(makeCommands(), output),
+    : _remembers(remembers), _settings(remembers), _interpreter(interpreter), _window(makeCommands(), output),
       _loadCb(this, &Application::loadFocused), _fileCb(this, &Application::runFocused)
 {
     _interpreter.attempt([&output] { output.tapStreams(); });
@@ -89,14 +90,21 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
 {
     _hostWindow->show();
     _hostWindow->getRootContainer()->setFocusWidget(_browser);
-    if (script)
-        startScript(*script, exit);
+    QTimer::singleShot(0, &_window,
+                       [this, script, exit]
+                       {
+                           if (_remembers && hasScreen())
+                               offerLeft();
+                           if (script)
+                               startScript(*script, exit);
+                       });
     _signalTimer.start(signalInterval);
     if (hasScreen())
         _watch.emplace([this] { return _scriptRuns || _interpreter.isRunning(); }, [this] { stopScript(); });
     int const status = runLoop();
     _watch.reset();
     _signalTimer.stop();
+    _recovery->discard();
     _window.saveLook(_settings);
     // The scripts' own acts at the end can open no dialog any more: nobody would see it.
     Kv::WsNative::getPlatform().closeLoops();
@@ -107,10 +115,11 @@ int Application::runLoop()
 {
     try
     {
-        return Kv::WsNative::getPlatform().runApplication(nullptr);
+        return Kv::WsNative::getPlatform().runApplication([this] { keepUnsaved(); });
     }
     catch (Kv::ExBase const&)
     {
+        _recovery->leave();
         // The display is gone. What a script has come to before that counts.
         if (!_exitStatus)
             throw;
@@ -160,9 +169,68 @@ void Application::makeHost()
     std::error_code nowhere;
     _browser->setURL(std::filesystem::current_path(nowhere).string(), HistoryEnum(0), UpdateEnum(0));
     _workspace = makeShd<UiCompositionWorkspace>([this] { return _hostWindow->findWidgetWithKeyboard(); });
-    _workspace->setChangeCallback([this] { showCompositionsLater(); });
+    _recovery.emplace(*_workspace,
+                      [this](QString const& words)
+                      {
+                          _window.note(words);
+                          _window.tell(words);
+                      });
+    _workspace->setChangeCallback(
+        [this]
+        {
+            _recovery->follow();
+            showCompositionsLater();
+        });
     UiWorkspace::setCurrentWorkspace(_workspace);
     UiAppMgr::getInstance().setApplication(_hostWindow, panel, _browser->getView());
+}
+
+void Application::offerLeft()
+{
+    Recovery::Findings findings = _recovery->find();
+    if (!findings.refusals.empty())
+        tellRefusals(findings.refusals);
+    while (!findings.left.empty() && askAboutLeft(findings.left))
+        ;
+}
+
+void Application::tellRefusals(std::vector<std::string> const& refusals)
+{
+    QString words;
+    for (std::string const& refusal : refusals)
+    {
+        _window.note(QObject::tr("Changes that were not saved cannot be read: %1").arg(toText(refusal)));
+        words += QStringLiteral("\n\n") + toText(refusal);
+    }
+    QMessageBox box(QMessageBox::Warning, QObject::tr("Changes That Cannot Be Read"),
+                    QObject::tr("Changes that were not saved cannot be read. Their files are kept:") + words,
+                    QMessageBox::Close, &_window);
+    box.setTextFormat(Qt::PlainText);
+    box.exec();
+    _window.activateWindow();
+}
+
+bool Application::askAboutLeft(std::vector<Recovery::Left>& left)
+{
+    RecoveryQuestion question(&_window, left);
+    int const answer = question.exec();
+    _window.activateWindow();
+    if (answer == RecoveryQuestion::Later)
+        return false;
+    std::vector<std::size_t> const selected = question.getSelected();
+    std::vector<Recovery::Left> rest;
+    for (std::size_t place = 0; place < left.size(); ++place)
+    {
+        bool isDone = std::binary_search(selected.begin(), selected.end(), place);
+        if (isDone && answer == RecoveryQuestion::ThrowAway)
+            left[place].file.remove();
+        else if (isDone)
+            isDone = attempt([&] { _recovery->restore(left[place]); });
+        if (!isDone)
+            rest.push_back(std::move(left[place]));
+    }
+    left = std::move(rest);
+    return true;
 }
 
 void Application::startScript(ScriptCall const& script, bool exit)
@@ -198,7 +266,8 @@ int Application::runScript(ScriptCall const& script)
     _window.note(QObject::tr("%1 is running").arg(name));
     _window.paintNow();
     pid_t const self = getpid();
-    int const status = _interpreter.run(script);
+    int status = 0;
+    Kv::WsNative::getPlatform().callScript([&] { status = _interpreter.run(script); });
     // The window and all else is the other one's.
     if (getpid() != self)
         std::exit(status); // NOLINT(concurrency-mt-unsafe): a forked process has one thread
@@ -254,7 +323,10 @@ std::string Application::askPath(QString const& title, std::string const& place)
 void Application::interrupt()
 {
     // A second Ctrl-C, while the user is asked about changes, is meant.
-    if (QApplication::activeModalWidget() || confirmLoss(getCompositions()))
+    bool const isAsking = QApplication::activeModalWidget();
+    if (isAsking)
+        _recovery->leave();
+    if (isAsking || confirmLoss(getCompositions()))
         QApplication::exit(interruptedStatus);
 }
 

@@ -4,6 +4,7 @@
 #include "commandLine.h"
 #include "interpreter.h"
 #include "mainWindow.h"
+#include "recovery.h"
 #include "scriptOutput.h"
 #include "settings.h"
 
@@ -40,11 +41,20 @@ public:
     /// exit status.
     int run(std::optional<ScriptCall> const& script, bool exit);
 
+    /// Writes the changes that are not saved at once, for the next start to offer: the process may end at any moment.
+    void keepUnsaved() noexcept { _recovery->keepNow(); }
+
 private:
     using Composition = Kv::RCWeakPtr<const Kv::PiCompositionGraphInterface>;
 
     Commands makeCommands();
     void makeHost();
+
+    /// Asks what is to become of the changes that former runs have left.
+    void offerLeft();
+    void tellRefusals(std::vector<std::string> const& refusals);
+    /// True unless the user wants to be asked another time.
+    bool askAboutLeft(std::vector<Recovery::Left>& left);
 
     /// Runs a script once the loop has come around, and then ends the application where `exit` is set.
     void startScript(ScriptCall const& script, bool exit);
@@ -86,6 +96,7 @@ private:
     void showCompositions();
     void showCompositionsLater();
 
+    bool _remembers;
     Settings _settings;
     Interpreter& _interpreter;
     MainWindow _window;
@@ -94,6 +105,7 @@ private:
     Kv::UiEventCallback<Application> _loadCb;
     Kv::UiEventCallback<Application> _fileCb;
     Kv::RCShdPtr<Kv::UiCompositionWorkspace> _workspace;
+    std::optional<Recovery> _recovery;
     QTimer _signalTimer;
     QTimer _showTimer;
     std::optional<ScriptCall> _lastScript;

@@ -176,6 +176,9 @@ void BusyWatch::offerStop()
 {
     int const offer = _offers;
     Connection connection;
+    // For want of file handles: another time.
+    if (connection.getOwn() < 0)
+        return;
     start(connection);
     pollfd answer{connection.getOwn(), POLLIN, 0};
     while (!waitFor(milliseconds(0)) && isWanted(offer))

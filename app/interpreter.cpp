@@ -7,6 +7,7 @@
 
 #include <csignal>
 #include <filesystem>
+#include <unistd.h>
 #include <utility>
 
 namespace bp = boost::python;
@@ -60,12 +61,71 @@ int getStopSignal()
 }
 
 /// Borrowed from the one interpreter.
-std::function<void()> const* lastAct = nullptr;
+Interpreter::Acts const* acts = nullptr;
 
 void runLastAct()
 {
-    if (*lastAct)
-        (*lastAct)();
+    if (acts->atEnd)
+        acts->atEnd();
+}
+
+pid_t process = 0;
+pthread_t mainThread;
+volatile std::sig_atomic_t killSignal = 0;
+
+/// Ends the process, if need be when the handler of that signal is over.
+void die(int number)
+{
+    static_cast<void>(std::signal(number, SIG_DFL));
+    static_cast<void>(std::raise(number));
+}
+
+/// Has the interpreter come around to `onStop`. A child of a script dies at once, and so does a process that
+/// cannot come around, by the second signal.
+void onKill(int number)
+{
+    if (getpid() != process || killSignal != 0)
+        die(number);
+    else
+    {
+        killSignal = number;
+        pthread_kill(mainThread, getStopSignal());
+    }
+}
+
+/// What the interpreter calls for the stop signal.
+void onStop(int, bp::object const&)
+{
+    if (killSignal != 0)
+    {
+        if (acts->beforeKill)
+            acts->beforeKill();
+        die(killSignal);
+    }
+    PyErr_SetNone(PyExc_KeyboardInterrupt);
+    bp::throw_error_already_set();
+}
+
+/// Lets others alone, such as what the parent has the process ignore.
+void replaceKillHandler(sighandler_t former, sighandler_t handler)
+{
+    for (int const number : {SIGTERM, SIGHUP})
+    {
+        struct sigaction action = {};
+        sigaction(number, nullptr, &action);
+        if (action.sa_handler != former)
+            continue;
+        action.sa_handler = handler;
+        sigaction(number, &action, nullptr);
+    }
+}
+
+/// Scripts are told that nobody hears of these signals, and can hear of them themselves.
+void hearOfKills()
+{
+    process = getpid();
+    mainThread = pthread_self();
+    replaceKillHandler(SIG_DFL, &onKill);
 }
 
 } // namespace
@@ -88,14 +148,15 @@ struct Interpreter::Runner
     bp::dict names;
 };
 
-Interpreter::Interpreter(std::function<void()> atEnd) : _atEnd(std::move(atEnd)), _thread(pthread_self())
+Interpreter::Interpreter(Acts itsActs) : _acts(std::move(itsActs)), _thread(pthread_self())
 {
     start();
-    lastAct = &_atEnd;
+    acts = &_acts;
     // The function that is registered first is called last.
     bp::import("atexit").attr("register")(bp::make_function(&runLastAct));
     _runner = std::make_unique<Runner>();
-    _runner->get("start")(toBytes(getModuleFolder()), getStopSignal());
+    _runner->get("start")(toBytes(getModuleFolder()), getStopSignal(), bp::make_function(&onStop));
+    hearOfKills();
     loadModules();
     _threadState = PyEval_SaveThread();
 }
@@ -204,6 +265,7 @@ int Interpreter::finish(int status)
     PyEval_RestoreThread(static_cast<PyThreadState*>(_threadState));
     _threadState = nullptr;
     _runner.reset();
+    replaceKillHandler(&onKill, SIG_DFL);
     constexpr int lostOutput = 120;
     return Py_FinalizeEx() < 0 && status == 0 ? lostOutput : status;
 }

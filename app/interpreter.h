@@ -16,9 +16,18 @@ namespace Velmora
 class Interpreter
 {
 public:
-    /// Starts Python and loads the module `ui`. `atEnd` is called after all that scripts have registered for the end,
-    /// with the lock held and their variables in place. Throws `std::runtime_error`.
-    explicit Interpreter(std::function<void()> atEnd = {});
+    /// What is called with the lock held; it throws nothing.
+    struct Acts
+    {
+        /// After all that scripts have registered for the end, with their variables in place.
+        std::function<void()> atEnd;
+        /// When a signal has come by which the process is to end at once, unless scripts hear of that signal
+        /// themselves.
+        std::function<void()> beforeKill;
+    };
+
+    /// Starts Python and loads the module `ui`. Throws `std::runtime_error`.
+    explicit Interpreter(Acts acts = {});
     Interpreter(Interpreter const&) = delete;
     Interpreter& operator=(Interpreter const&) = delete;
     ~Interpreter();
@@ -56,7 +65,7 @@ private:
     /// Takes the error that is set, prints it, and gives the exit status that it stands for.
     int takeError();
 
-    std::function<void()> _atEnd;
+    Acts _acts;
     std::string _failure;
     pthread_t _thread;
     std::unique_ptr<Runner> _runner;

@@ -52,7 +52,12 @@ int run(CommandLine const& line)
     ScriptOutput output;
     std::optional<Application> application;
     // The window goes while scripts can still hear of it.
-    Interpreter interpreter([&application] { application.reset(); });
+    Interpreter interpreter({[&application] { application.reset(); },
+                             [&application]
+                             {
+                                 if (application)
+                                     application->keepUnsaved();
+                             }});
     // A script that has the application to itself finds it as it is for everybody.
     application.emplace(interpreter, output, !line.exit);
     for (std::string const& path : line.compositions)

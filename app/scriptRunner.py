@@ -19,10 +19,10 @@ show_error = sys.__excepthook__
 first_path = None
 
 
-def start(module_folder, stop_signal):
-    """Makes the modules importable, and `stop_signal` interrupt a script."""
+def start(module_folder, stop_signal, stop):
+    """Makes the modules importable, and `stop_signal` call `stop`."""
     sys.path.append(os.fsdecode(module_folder))
-    signal.signal(stop_signal, signal.default_int_handler)
+    signal.signal(stop_signal, stop)
     # Not the interpreter's own hook: with that, PyQt6 ends the process for an exception in a slot.
     sys.excepthook = functools.partial(show_error)
 

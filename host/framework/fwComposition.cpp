@@ -29,23 +29,43 @@ RCStrongPtr<FwComposition> FwComposition::open(OsFilePath const& path)
     OsFilePath const canonical = path.getCanonical();
     // Before it is read: what comes in between counts as a change.
     std::string const version = OsFile(canonical).getVersion();
-    std::vector<FwNode::Description> nodes = FwCompositionReader::read(canonical);
-    RCStrongPtr<FwComposition> composition(std::shared_ptr<FwComposition>(new FwComposition(canonical)));
-    composition->_version = version;
-    std::string const name = getCompositionName(canonical);
+    return make(canonical, version, FwCompositionReader::read(canonical));
+}
+
+FwComposition::Keeper FwComposition::openApart(OsFilePath const& path)
+{
+    return keepApart(open(path));
+}
+
+FwComposition::Keeper FwComposition::restoreApart(PiUnsavedComposition const& unsaved)
+{
+    RCStrongPtr<FwComposition> const composition =
+        make(unsaved.path, unsaved.version, FwCompositionReader::parse(unsaved.text));
+    composition->setModified(true);
+    return keepApart(composition);
+}
+
+FwComposition::FwComposition(OsFilePath path, std::string version)
+    : _path(std::move(path)), _version(std::move(version))
+{
+}
+
+RCStrongPtr<FwComposition> FwComposition::make(OsFilePath const& path, std::string const& version,
+                                               std::vector<FwNode::Description> nodes)
+{
+    RCStrongPtr<FwComposition> composition(std::shared_ptr<FwComposition>(new FwComposition(path, version)));
+    std::string const name = getCompositionName(path);
     composition->_node = makeShd<FwNode>(composition, FwNode::Description{name, "composition", {}, {}});
     composition->_graph = makeShd<FwGraph>(composition, name, std::move(nodes));
     return composition;
 }
 
-FwComposition::Keeper FwComposition::openApart(OsFilePath const& path)
+FwComposition::Keeper FwComposition::keepApart(RCStrongPtr<FwComposition> const& composition)
 {
-    Keeper keeper = std::make_shared<RCStrongPtr<FwComposition>>(open(path));
-    (*keeper)->_keeper = keeper;
+    Keeper keeper = std::make_shared<RCStrongPtr<FwComposition>>(composition);
+    composition->_keeper = keeper;
     return keeper;
 }
-
-FwComposition::FwComposition(OsFilePath path) : _path(std::move(path)) {}
 
 FwComposition::~FwComposition() = default;
 
@@ -91,6 +111,16 @@ bool FwComposition::isModified() const
     return _isModified;
 }
 
+std::uint64_t FwComposition::getChangeCount() const
+{
+    return _changeCount;
+}
+
+PiUnsavedComposition FwComposition::getUnsaved() const
+{
+    return {_path, _version, FwCompositionWriter::write(*_graph)};
+}
+
 bool FwComposition::isChangedOnDisk() const
 {
     std::string const version = OsFile(_path).getVersion();
@@ -122,6 +152,8 @@ void FwComposition::setChangeCallback(std::function<void()> callback)
 void FwComposition::setModified(bool isModified)
 {
     _isModified = isModified;
+    if (isModified)
+        ++_changeCount;
     if (_changeCallback)
         _changeCallback();
 }

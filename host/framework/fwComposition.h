@@ -1,18 +1,20 @@
 #pragma once
 
 #include "files/osFilePath.h"
+#include "fwNode.h"
 #include "kvExport.h"
 #include "piCompositionGraphInterface.h"
 #include "pointers/rcWeakPtr.h"
 
 #include <functional>
 #include <memory>
+#include <string>
+#include <vector>
 
 namespace Kv
 {
 
 class FwGraph;
-class FwNode;
 
 /// A composition that has been read from its file. It has one owner, and is closed by that letting it go; what is left
 /// of its graph then no longer changes.
@@ -32,6 +34,10 @@ public:
     /// Reads the file as `open` does, for somebody who is no workspace.
     static Keeper openApart(OsFilePath const& path);
 
+    /// Makes a composition with changes that are not saved, without a look at its file. Throws `ExBase`, naming the
+    /// line of the text, for what is wrong with that.
+    static Keeper restoreApart(PiUnsavedComposition const& unsaved);
+
     ~FwComposition() override;
 
     /// True while a keeper owns it.
@@ -48,6 +54,8 @@ public:
     OsFilePath const& getPath() const override;
     bool isEditable() const override;
     bool isModified() const override;
+    std::uint64_t getChangeCount() const override;
+    PiUnsavedComposition getUnsaved() const override;
     bool isChangedOnDisk() const override;
     void save() override;
     void saveOver() override;
@@ -58,7 +66,12 @@ public:
 private:
     friend class FwGraph;
 
-    explicit FwComposition(OsFilePath path);
+    FwComposition(OsFilePath path, std::string version);
+
+    /// `path` is canonical.
+    static RCStrongPtr<FwComposition> make(OsFilePath const& path, std::string const& version,
+                                           std::vector<FwNode::Description> nodes);
+    static Keeper keepApart(RCStrongPtr<FwComposition> const& composition);
 
     void setModified(bool isModified);
 
@@ -68,6 +81,7 @@ private:
     RCShdPtr<FwNode> _node;
     RCShdPtr<FwGraph> _graph;
     bool _isModified = false;
+    std::uint64_t _changeCount = 0;
     Keeper::weak_type _keeper;
     std::function<void()> _changeCallback;
 };

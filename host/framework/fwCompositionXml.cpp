@@ -116,7 +116,7 @@ std::vector<FwNode::Description> FwCompositionReader::read(OsFilePath const& pat
     std::string const text = OsFile(path).read(maxSize);
     try
     {
-        return FwCompositionReader(text)._nodes;
+        return parse(text);
     }
     catch (XmlError const& error)
     {
@@ -124,6 +124,11 @@ std::vector<FwNode::Description> FwCompositionReader::read(OsFilePath const& pat
                      "Cannot read the composition " + LiStringUtil::getPrintablePath(path.toString()) + ": " +
                          error.getReason());
     }
+}
+
+std::vector<FwNode::Description> FwCompositionReader::parse(std::string const& text)
+{
+    return FwCompositionReader(text)._nodes;
 }
 
 FwCompositionReader::FwCompositionReader(std::string const& text)

@@ -19,6 +19,9 @@ public:
     /// The nodes in their order. Throws `ExBase`, naming the file and the line, for whatever is wrong with it.
     static std::vector<FwNode::Description> read(OsFilePath const& path);
 
+    /// The same for the content of a file. The words name the line alone.
+    static std::vector<FwNode::Description> parse(std::string const& text);
+
 private:
     struct Reference
     {

@@ -4,8 +4,22 @@
 #include "kvExport.h"
 #include "piGraph.h"
 
+#include <cstdint>
+#include <string>
+
 namespace Kv
 {
+
+/// All that it takes to have a composition again with its changes that are not saved.
+struct PiUnsavedComposition
+{
+    /// That of the composition's file.
+    OsFilePath path;
+    /// That of the file as the composition knows it, by `OsFile::getVersion`.
+    std::string version;
+    /// The file as a save would write it.
+    std::string text;
+};
 
 /// A composition as the application sees it: the controller of a graph that is kept in a file.
 class KV_API PiCompositionGraphInterface : public virtual PiNodeController
@@ -22,6 +36,11 @@ public:
 
     /// True if there are changes that have not been saved.
     virtual bool isModified() const = 0;
+
+    /// Grows with each change.
+    virtual std::uint64_t getChangeCount() const = 0;
+
+    virtual PiUnsavedComposition getUnsaved() const = 0;
 
     /// True if somebody else has written the file since it was opened or saved.
     virtual bool isChangedOnDisk() const = 0;

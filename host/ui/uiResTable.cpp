@@ -1,12 +1,12 @@
 #include "uiResTable.h"
 
+#include "files/osFile.h"
 #include "xml/xmlDocument.h"
 #include "xml/xmlError.h"
 
+#include <cstdint>
 #include <dlfcn.h>
 #include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <utility>
 #include <vector>
 
@@ -61,10 +61,8 @@ std::optional<fs::path> findFile(std::string const& resourceName)
 
 std::unordered_map<std::string, std::string> readTooltips(fs::path const& file)
 {
-    std::ifstream stream(file, std::ios::binary);
-    std::string const text{std::istreambuf_iterator<char>(stream), {}};
-    if (!stream)
-        throw XmlError(__FILE__, __LINE__, 0, "the file cannot be read");
+    constexpr std::uint64_t maxSize = std::uint64_t(16) << 20;
+    std::string const text = OsFile(OsFilePath(file.native())).read(maxSize);
     RCShdPtr<XmlElement> const root = XmlDocument(text).getRoot();
     if (!root || root->getName() != "Tooltips")
         throw XmlError(__FILE__, __LINE__, root ? root->getLine() : 1, "the root element is not \"Tooltips\"");

@@ -35,7 +35,7 @@ def environment(**changes):
     """This process's environment without what chooses a display, but with `changes`, and the tests' own modules. The
     application remembers nothing in it."""
     result = {name: value for name, value in os.environ.items() if name not in CHOOSES_DISPLAY}
-    result['XDG_CONFIG_HOME'] = '/dev/null'
+    result['XDG_CONFIG_HOME'] = result['XDG_STATE_HOME'] = '/dev/null'
     result['PYTHONPATH'] = os.pathsep.join([HERE, result.get('PYTHONPATH', '')])
     return {**result, **changes}
 

@@ -118,10 +118,13 @@ public:
     /// thrown on from here. When the application is asked to quit, `*end` is set to true. Loops nest.
     virtual void runLoop(bool const volatile* until, bool volatile* end) = 0;
 
-    /// Runs the application to its end, and gives its exit status. `lastAct`, which throws nothing and can be null, is
-    /// called as soon as the display is gone; then an `ExBase` comes out of here and of the loops of this platform.
-    /// Where a loop of somebody else's runs in them, the process ends.
+    /// Runs the application's own loop, in which those of dialogs nest, and gives its exit status. `lastAct`, which
+    /// throws nothing and can be null, is called as soon as the display is gone; then an `ExBase` comes out of here and
+    /// of the loops of this platform. Where a loop of somebody else's runs in them, the process ends.
     virtual int runApplication(std::function<void()> lastAct) = 0;
+
+    /// Calls what runs a script in that loop.
+    virtual void callScript(std::function<void()> const& call) = 0;
 
     /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.
     virtual void endLoop() = 0;

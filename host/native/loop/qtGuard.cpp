@@ -1,6 +1,7 @@
 #include "loop/qtGuard.h"
 
 #include "loop/qtLoop.h"
+#include "loop/qtSpareHandles.h"
 #include "loop/qtWayOut.h"
 
 #include <QThread>
@@ -88,6 +89,7 @@ void QtGuard::run(std::function<void()> const& call)
 {
     {
         InterpreterHold const hold(*_hook);
+        QtSpareHandles::Pause const pause;
         ++_depth;
         quint64 const outerCall = std::exchange(_currentCall, ++_calls);
         try

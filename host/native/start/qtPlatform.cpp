@@ -2,6 +2,7 @@
 
 #include "loop/qtDisposal.h"
 #include "loop/qtLoop.h"
+#include "loop/qtSpareHandles.h"
 #include "loop/qtWayOut.h"
 #include "peers/qtPeer.h"
 #include "peers/qtText.h"
@@ -105,6 +106,7 @@ QRect fitToScreen(GeRectangle<int> const& frame)
 QtPlatform::QtPlatform()
 {
     QtContentArea::noticeReaders();
+    QtSpareHandles::reserve();
 }
 
 void QtPlatform::setScriptHook(NtScriptHook* hook)
@@ -195,6 +197,8 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     QWidget const* const stage = window ? window.data() : static_cast<QWidget*>(QtFrontOrder::getInstance().getFront());
     std::exception_ptr error;
     {
+        QtSpareHandles::Turn const turn;
+        QtSpareHandles::require();
         QtLoop loop(until, end);
         // Where somebody destroys what runs, nobody could end it any more.
         if (stage)
@@ -209,6 +213,12 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     QtGuard::getInstance().getScriptHook().rethrow(error);
 }
 
+void QtPlatform::callScript(std::function<void()> const& call)
+{
+    QtSpareHandles::Pause const pause;
+    call();
+}
+
 void QtPlatform::refuseLoop()
 {
     // A script that asks until it gets an answer would go on for ever, with no window to end it by.
@@ -220,6 +230,7 @@ void QtPlatform::refuseLoop()
 
 int QtPlatform::runApplication(std::function<void()> lastAct)
 {
+    QtSpareHandles::Turn const turn;
     int status = 0;
     QtWayOut::setLastAct(std::move(lastAct));
     std::string const loss = QtWayOut().run([&status] { status = QApplication::exec(); });

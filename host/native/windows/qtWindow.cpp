@@ -2,6 +2,7 @@
 
 #include "loop/qtDisposal.h"
 #include "loop/qtInputDrop.h"
+#include "loop/qtSpareHandles.h"
 #include "peers/qtText.h"
 #include "start/qtApplication.h"
 #include "windows/qtFocusOrder.h"
@@ -276,6 +277,7 @@ void QtWindow::setContentSize(int width, int height)
 
 void QtWindow::show()
 {
+    QtSpareHandles::Turn const turn;
     QtWindowWidget* const native = getNative();
     if (!native)
         throw ExBase(__FILE__, __LINE__, "Cannot show a window: it is gone with the application that it belonged to");
@@ -288,6 +290,7 @@ void QtWindow::show()
 
 void QtWindow::hide()
 {
+    QtSpareHandles::Turn const turn;
     QtErrorAside const aside;
     QWidget* const native = getNative();
     if (!native || native->isHidden())
@@ -301,12 +304,14 @@ void QtWindow::hide()
 
 void QtWindow::redraw()
 {
+    QtSpareHandles::Turn const turn;
     if (QWidget* const native = getNative())
         native->repaint();
 }
 
 void QtWindow::flushInput()
 {
+    QtSpareHandles::Turn const turn;
     QWidget* const native = getNative();
     if (!native)
         return;

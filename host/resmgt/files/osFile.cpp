@@ -9,6 +9,7 @@
 #include <fcntl.h>
 #include <filesystem>
 #include <optional>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <system_error>
 #include <unistd.h>
@@ -127,9 +128,10 @@ std::string OsFile::getVersion() const
     if (!status || !S_ISREG(status->st_mode))
         return {};
     std::string version;
-    for (auto const part : {static_cast<long long>(status->st_dev), static_cast<long long>(status->st_ino),
-                            static_cast<long long>(status->st_size), static_cast<long long>(status->st_mtim.tv_sec),
-                            static_cast<long long>(status->st_mtim.tv_nsec)})
+    // Not the number of the device, which can be another one when the same disk is mounted the next time.
+    for (auto const part :
+         {static_cast<long long>(status->st_ino), static_cast<long long>(status->st_size),
+          static_cast<long long>(status->st_mtim.tv_sec), static_cast<long long>(status->st_mtim.tv_nsec)})
         version += std::to_string(part) + ' ';
     return version;
 }
@@ -158,6 +160,19 @@ void OsFile::replace(std::string const& content) const
     {
         fail("write", target, error.code().message());
     }
+}
+
+bool OsFileDescriptor::lock() const
+{
+    return ::flock(_descriptor, LOCK_EX | LOCK_NB) == 0;
+}
+
+bool OsFileDescriptor::isFileAt(std::string const& path) const
+{
+    struct stat own = {};
+    struct stat found = {};
+    return ::fstat(_descriptor, &own) == 0 && ::lstat(path.c_str(), &found) == 0 && own.st_dev == found.st_dev &&
+           own.st_ino == found.st_ino;
 }
 
 bool OsFsUtils::fileExists(OsFilePath const& path)

@@ -7,6 +7,7 @@
 #include <mutex>
 #include <string>
 #include <unistd.h>
+#include <utility>
 
 namespace Kv
 {
@@ -60,13 +61,17 @@ private:
 };
 
 /// Owns a descriptor of the system and closes it.
-class OsFileDescriptor
+class KV_API OsFileDescriptor
 {
 public:
     /// A negative descriptor stands for none.
     explicit OsFileDescriptor(int descriptor) : _descriptor(descriptor) {}
-    OsFileDescriptor(OsFileDescriptor const&) = delete;
-    OsFileDescriptor& operator=(OsFileDescriptor const&) = delete;
+    OsFileDescriptor(OsFileDescriptor&& other) noexcept : _descriptor(std::exchange(other._descriptor, -1)) {}
+    OsFileDescriptor& operator=(OsFileDescriptor&& other) noexcept
+    {
+        std::swap(_descriptor, other._descriptor);
+        return *this;
+    }
     ~OsFileDescriptor()
     {
         if (isOpen())
@@ -75,6 +80,13 @@ public:
 
     bool isOpen() const { return _descriptor >= 0; }
     int get() const { return _descriptor; }
+
+    /// Locks the file against others who lock it, until the descriptor is closed, if only by the end of the process.
+    /// False with `errno` where that is refused; it is `EWOULDBLOCK` where another descriptor has the lock.
+    bool lock() const;
+
+    /// True if the path leads to the file of this descriptor, and not to one that has come into its place.
+    bool isFileAt(std::string const& path) const;
 
 private:
     int _descriptor;

@@ -1,11 +1,14 @@
 #include "files/osTemporaryFile.h"
 
+#include <array>
 #include <cerrno>
+#include <climits>
 #include <cstdio>
 #include <fcntl.h>
 #include <string_view>
 #include <system_error>
 #include <unistd.h>
+#include <utility>
 
 namespace Kv
 {
@@ -19,10 +22,27 @@ void require(bool success)
         throw std::system_error(errno, std::generic_category());
 }
 
+/// Files are known as left on the machine that made them alone: what another one has locked is not seen here on every
+/// file system.
+std::string getMachineName()
+{
+    std::array<char, HOST_NAME_MAX + 1> name{};
+    require(::gethostname(name.data(), name.size()) == 0);
+    return name.data();
+}
+
+/// Removes a file whose process has been killed.
+void removeLeft(std::string const& path)
+{
+    OsFileDescriptor const file(::open(path.c_str(), O_WRONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
+    if (file.isOpen() && file.lock() && file.isFileAt(path))
+        ::unlink(path.c_str());
+}
+
 } // namespace
 
-OsTemporaryFile::OsTemporaryFile(OsFilePath const& folder)
-    : _path(folder.toString() + "/.saving-" + std::to_string(getpid())), _descriptor(create(_path))
+OsTemporaryFile::OsTemporaryFile(OsFilePath const& folder, mode_t permissions)
+    : _path(folder.toString() + "/.saving-" + getMachineName() + "-"), _descriptor(create(_path, permissions))
 {
     require(_descriptor.isOpen());
 }
@@ -54,25 +74,36 @@ void OsTemporaryFile::takeOwnerAndPermissions(struct stat const& other)
     require(::fchmod(_descriptor.get(), other.st_mode & allPermissions) == 0);
 }
 
-void OsTemporaryFile::moveTo(OsFilePath const& target)
+OsFileDescriptor OsTemporaryFile::moveTo(OsFilePath const& target)
 {
     require(::fsync(_descriptor.get()) == 0);
+    OsFileDescriptor const folder(::open(target.getFolder().getChars(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     require(std::rename(_path.c_str(), target.getChars()) == 0);
     _path.clear();
+    // Without it a power cut can bring the old file back. It is whole then too: no reason to fail where a folder cannot
+    // be read or put on the disk.
+    if (folder.isOpen())
+        static_cast<void>(::fsync(folder.get()));
+    return std::move(_descriptor);
 }
 
-/// Adds to `path` what makes it the path of a file that was not there. Negative where the system refuses; no file is
+/// Adds to `path` what makes it the path of a file that was not there. Not open where the system refuses; no file is
 /// left then.
-int OsTemporaryFile::create(std::string& path)
+OsFileDescriptor OsTemporaryFile::create(std::string& path, mode_t permissions)
 {
     std::string const begin = std::move(path);
-    constexpr mode_t newFile = S_IRUSR | S_IWUSR | S_IRGRP | S_IWGRP | S_IROTH | S_IWOTH;
     for (int number = 0;; ++number)
     {
-        path = begin + "-" + std::to_string(number);
-        int const descriptor = ::open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, newFile);
-        if (descriptor >= 0 || errno != EEXIST)
-            return descriptor;
+        path = begin + std::to_string(number);
+        removeLeft(path);
+        OsFileDescriptor file(::open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, permissions));
+        if (!file.isOpen() && errno != EEXIST)
+            return file;
+        // Before it was locked, another process may have held it for one that was left. Where nothing can be locked,
+        // nothing is held for that.
+        bool const isLost = !file.isOpen() || (!file.lock() && errno == EWOULDBLOCK) || !file.isFileAt(path);
+        if (!isLost)
+            return file;
     }
 }
 
