@@ -1,5 +1,5 @@
-"""Reads what the sanitizers wrote during a test run, and fails for every error and for each leak that was allocated by
-one of the project's own libraries. The interpreter and Qt keep much until the end of the process; that is
+"""Reads what the sanitizers wrote during a test run, and fails for every error, for each race, and for each leak that was
+allocated by one of the project's own libraries. The interpreter and Qt keep much until the end of the process; that is
 theirs."""
 
 import pathlib
@@ -19,6 +19,8 @@ def allocated_by_us(leak):
 
 
 def findings(report):
+    if 'WARNING: ThreadSanitizer' in report:
+        return [race for race in re.split(r'={18}\n', report) if 'WARNING: ThreadSanitizer' in race]
     if 'runtime error:' in report or re.search(r'ERROR: AddressSanitizer', report):
         return [report]
     return [leak for leak in re.split(r'\n\n', report) if 'leak of' in leak and allocated_by_us(leak)]

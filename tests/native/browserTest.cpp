@@ -1,11 +1,13 @@
 #include "brBrowsable.h"
 #include "brBrowser.h"
 #include "browser/qtDirListing.h"
+#include "browser/qtDirWorker.h"
 #include "exBase.h"
 #include "files/osPlace.h"
 #include "piWidget.h"
 #include "uiTopLevel.h"
 #include "uiWorkspace.h"
+#include "wsNative.h"
 
 #include <QApplication>
 #include <QLabel>
@@ -15,13 +17,18 @@
 #include <QTreeView>
 
 #include <algorithm>
+#include <atomic>
+#include <chrono>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <functional>
 #include <gtest/gtest.h>
+#include <memory>
+#include <random>
 #include <set>
 #include <string>
+#include <thread>
 #include <unistd.h>
 #include <vector>
 
@@ -66,6 +73,8 @@ protected:
             titles.push_back(listing.getEntries().at(static_cast<std::size_t>(index)).title);
         return titles;
     }
+
+    static void wait(std::function<bool()> const& condition) { EXPECT_TRUE(QTest::qWaitFor(condition, 5000)); }
 
     fs::path folder;
 };
@@ -128,8 +137,6 @@ protected:
         if (enter)
             press({Qt::Key_Return});
     }
-
-    static void wait(std::function<bool()> const& condition) { EXPECT_TRUE(QTest::qWaitFor(condition, 5000)); }
 
     /// True if what is typed leads somewhere.
     bool takeTypedPath() const
@@ -225,6 +232,56 @@ TEST_F(Folder, IsFoundByPathsAsPeopleWriteThem)
     for (char const* const path : {"../file", ".", "none/new", "new/", "../file/new"})
         EXPECT_THROW(OsPlace::findNew(OsPlace::complete(path, root + "/sub")), ExBase) << path;
     EXPECT_EQ(OsPlace::findNearest(root + "/sub/a/b"), root + "/sub");
+}
+
+TEST_F(Folder, IsReadInAThreadThatIsCancelledAndLeftAtAnyMoment)
+{
+    WsNative::getPlatform();
+    for (int number = 0; number < 300; ++number)
+        make({"file" + std::to_string(number)});
+    std::minstd_rand random(1); // NOLINT(cert-msc32-c,cert-msc51-cpp): the same each time
+    auto worker = std::make_unique<QtDirWorker>();
+    int started = 0;
+    int seen = 0;
+    auto const makeReading = [&]() -> QtDirWorker::Work
+    {
+        return [&, number = ++started](std::atomic<bool> const& cancelled)
+        {
+            auto const listing = std::make_shared<QtDirListing const>(folder, QtDirListing::Options(), cancelled);
+            return [&, listing, number]
+            {
+                EXPECT_EQ(number, started);
+                EXPECT_EQ(listing->getEntries().size(), 300U);
+                ++seen;
+            };
+        };
+    };
+    for (int step = 0; step < 3000; ++step)
+    {
+        std::this_thread::sleep_for(std::chrono::microseconds(random() % 300));
+        std::string const path = folder / std::to_string(random() % 3);
+        switch (random() % 8)
+        {
+        case 0:
+            worker = std::make_unique<QtDirWorker>();
+            break;
+        case 1:
+            worker->cancel();
+            break;
+        case 2:
+            worker->startAndWait(path, makeReading());
+            break;
+        case 3:
+        case 4:
+            worker->start(path, makeReading());
+            break;
+        default:
+            QCoreApplication::processEvents();
+        }
+    }
+    wait([&] { return !worker->isBusy(); });
+    EXPECT_GT(seen, 100);
+    EXPECT_LE(seen, started);
 }
 
 TEST_F(Browser, GoesAndSelectsWithoutAWindow)

@@ -48,9 +48,9 @@ std::string findNewPath(std::string const& path)
     }
 }
 
-std::string tellSilence(std::string const& path)
+std::string tellSilence(std::string const& who)
 {
-    return OsPlace::quote(path) + " has not answered yet";
+    return who + " has not answered yet";
 }
 
 /// Lets a path be wrapped at its slashes.
@@ -222,7 +222,7 @@ void QtBrowserPane::seek(std::string const& path, std::function<void(Found const
     };
     _seeker.startAndWait(path, work);
     if (_seeker.isBusy())
-        say(tellSilence(path));
+        say(tellSilence(OsPlace::quote(path)));
 }
 
 void QtBrowserPane::seekTyped(std::function<void(Found const&)> const& next)
@@ -403,7 +403,8 @@ void QtBrowserPane::showState()
 {
     std::string const& error = _model->getError();
     bool const isSilent = _missedLooks >= toldLooks && (_model->isReading() || _looker.isBusy());
-    std::string const silence = isSilent && _notice.empty() ? tellSilence(_directory) : "";
+    std::string const who = (_model->hasNamesOnly() ? "Something in " : "") + OsPlace::quote(_directory);
+    std::string const silence = isSilent && _notice.empty() ? tellSilence(who) : "";
     _message->setText(makeWrappable(toShownPath(!error.empty() ? error : _notice + silence)));
     _message->setVisible(!_message->text().isEmpty());
     bool const isLate = _model->isReading() && !_patience.isActive();

@@ -62,7 +62,7 @@ void QtDirModel::reread()
 
 void QtDirModel::showNames()
 {
-    if (!isReading() || (_listing && _listing->hasDetails()))
+    if (!isReading() || (_listing && !hasNamesOnly()))
         return;
     QtDirListing::Options options = _options;
     options.asksEntries = false;
@@ -224,7 +224,7 @@ QVariant QtDirModel::getText(QtDirEntry const& entry, int column) const
 {
     if (column == NameColumn)
         return toShownPath(entry.title);
-    if (!_listing->hasDetails())
+    if (hasNamesOnly())
         return {};
     if (column == ModifiedColumn)
         return QDateTime::fromSecsSinceEpoch(entry.modified).toString(QStringLiteral("yyyy-MM-dd hh:mm"));

@@ -50,6 +50,9 @@ public:
 
     bool isReading() const { return _reader.isBusy(); }
 
+    /// True while the rows have neither a size nor a time.
+    bool hasNamesOnly() const { return _listing && !_listing->hasDetails(); }
+
     /// The reason why the directory could not be read, in words; else empty.
     std::string const& getError() const { return _error; }
 
