@@ -39,10 +39,12 @@ QString toText(std::string const& bytes)
 /// Throws for a file that would keep the window from answering, since its file system does not.
 void requireAnswer(std::string const& path)
 {
-    auto const look = [path] { return Kv::OsFileDescriptor(open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC)).isOpen(); };
+    auto const look = [path]
+    { return Kv::OsFileDescriptor(open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC)).isOpen(); };
     if (!Kv::OsAsync::ask(path, look))
         throw Kv::ExBase(__FILE__, __LINE__,
-                         "The file system of " + Kv::LiStringUtil::getPrintablePath(path) + " does not answer. Try it later");
+                         "The file system of " + Kv::LiStringUtil::getPrintablePath(path) +
+                             " does not answer. Try it later");
 }
 
 /// True if somebody can look at the windows.

@@ -245,15 +245,24 @@ TEST_F(Folder, IsReadInAThreadThatIsCancelledAndLeftAtAnyMoment)
     int seen = 0;
     auto const makeReading = [&]() -> QtDirWorker::Work
     {
-        return [&, number = ++started](std::atomic<bool> const& cancelled)
+        auto const see = [&, number = ++started](std::size_t count)
         {
-            auto const listing = std::make_shared<QtDirListing const>(folder, QtDirListing::Options(), cancelled);
-            return [&, listing, number]
+            EXPECT_EQ(number, started);
+            EXPECT_EQ(count, 300U);
+            ++seen;
+        };
+        return [see, directory = folder.native()](std::atomic<bool> const& cancelled) -> std::function<void()>
+        {
+            try
             {
-                EXPECT_EQ(number, started);
-                EXPECT_EQ(listing->getEntries().size(), 300U);
-                ++seen;
-            };
+                QtDirListing const listing(directory, QtDirListing::Options(), cancelled);
+                return [see, count = listing.getEntries().size()] { see(count); };
+            }
+            catch (ExBase const&)
+            {
+                // The test is over, and the directory is gone.
+                return [] {};
+            }
         };
     };
     for (int step = 0; step < 3000; ++step)

@@ -92,117 +92,117 @@ template <typename Function> Function* next(char const* name)
 extern "C"
 {
 
-int stat(char const* path, struct stat* status)
-{
-    KV_NEXT(stat);
-    wait(AT_FDCWD, path);
-    return real(path, status);
-}
+    int stat(char const* path, struct stat* status)
+    {
+        KV_NEXT(stat);
+        wait(AT_FDCWD, path);
+        return real(path, status);
+    }
 
-int stat64(char const* path, struct stat64* status)
-{
-    KV_NEXT(stat64);
-    wait(AT_FDCWD, path);
-    return real(path, status);
-}
+    int stat64(char const* path, struct stat64* status)
+    {
+        KV_NEXT(stat64);
+        wait(AT_FDCWD, path);
+        return real(path, status);
+    }
 
-int lstat(char const* path, struct stat* status)
-{
-    KV_NEXT(lstat);
-    wait(AT_FDCWD, path, O_NOFOLLOW);
-    return real(path, status);
-}
+    int lstat(char const* path, struct stat* status)
+    {
+        KV_NEXT(lstat);
+        wait(AT_FDCWD, path, O_NOFOLLOW);
+        return real(path, status);
+    }
 
-int lstat64(char const* path, struct stat64* status)
-{
-    KV_NEXT(lstat64);
-    wait(AT_FDCWD, path, O_NOFOLLOW);
-    return real(path, status);
-}
+    int lstat64(char const* path, struct stat64* status)
+    {
+        KV_NEXT(lstat64);
+        wait(AT_FDCWD, path, O_NOFOLLOW);
+        return real(path, status);
+    }
 
-int fstatat(int folder, char const* path, struct stat* status, int flags)
-{
-    KV_NEXT(fstatat);
-    wait(folder, path, noFollow(flags));
-    return real(folder, path, status, flags);
-}
+    int fstatat(int folder, char const* path, struct stat* status, int flags)
+    {
+        KV_NEXT(fstatat);
+        wait(folder, path, noFollow(flags));
+        return real(folder, path, status, flags);
+    }
 
-int fstatat64(int folder, char const* path, struct stat64* status, int flags)
-{
-    KV_NEXT(fstatat64);
-    wait(folder, path, noFollow(flags));
-    return real(folder, path, status, flags);
-}
+    int fstatat64(int folder, char const* path, struct stat64* status, int flags)
+    {
+        KV_NEXT(fstatat64);
+        wait(folder, path, noFollow(flags));
+        return real(folder, path, status, flags);
+    }
 
-int statx(int folder, char const* path, int flags, unsigned mask, struct statx* status)
-{
-    KV_NEXT(statx);
-    wait(folder, path, noFollow(flags));
-    return real(folder, path, flags, mask, status);
-}
+    int statx(int folder, char const* path, int flags, unsigned mask, struct statx* status)
+    {
+        KV_NEXT(statx);
+        wait(folder, path, noFollow(flags));
+        return real(folder, path, flags, mask, status);
+    }
 
-int access(char const* path, int mode)
-{
-    KV_NEXT(access);
-    wait(AT_FDCWD, path);
-    return real(path, mode);
-}
+    int access(char const* path, int mode)
+    {
+        KV_NEXT(access);
+        wait(AT_FDCWD, path);
+        return real(path, mode);
+    }
 
-int faccessat(int folder, char const* path, int mode, int flags)
-{
-    KV_NEXT(faccessat);
-    wait(folder, path);
-    return real(folder, path, mode, flags);
-}
+    int faccessat(int folder, char const* path, int mode, int flags)
+    {
+        KV_NEXT(faccessat);
+        wait(folder, path);
+        return real(folder, path, mode, flags);
+    }
 
-ssize_t readlink(char const* path, char* target, size_t size)
-{
-    KV_NEXT(readlink);
-    wait(AT_FDCWD, path, O_NOFOLLOW);
-    return real(path, target, size);
-}
+    ssize_t readlink(char const* path, char* target, size_t size)
+    {
+        KV_NEXT(readlink);
+        wait(AT_FDCWD, path, O_NOFOLLOW);
+        return real(path, target, size);
+    }
 
-char* realpath(char const* path, char* resolved)
-{
-    KV_NEXT(realpath);
-    wait(AT_FDCWD, path);
-    return real(path, resolved);
-}
+    char* realpath(char const* path, char* resolved)
+    {
+        KV_NEXT(realpath);
+        wait(AT_FDCWD, path);
+        return real(path, resolved);
+    }
 
-DIR* opendir(char const* path)
-{
-    KV_NEXT(opendir);
-    wait(AT_FDCWD, path);
-    return real(path);
-}
+    DIR* opendir(char const* path)
+    {
+        KV_NEXT(opendir);
+        wait(AT_FDCWD, path);
+        return real(path);
+    }
 
-dirent* readdir(DIR* stream)
-{
-    KV_NEXT(readdir);
-    wait(dirfd(stream), "");
-    return real(stream);
-}
+    dirent* readdir(DIR* stream)
+    {
+        KV_NEXT(readdir);
+        wait(dirfd(stream), "");
+        return real(stream);
+    }
 
-dirent64* readdir64(DIR* stream)
-{
-    KV_NEXT(readdir64);
-    wait(dirfd(stream), "");
-    return real(stream);
-}
+    dirent64* readdir64(DIR* stream)
+    {
+        KV_NEXT(readdir64);
+        wait(dirfd(stream), "");
+        return real(stream);
+    }
 
-FILE* fopen(char const* path, char const* mode)
-{
-    KV_NEXT(fopen);
-    wait(AT_FDCWD, path);
-    return real(path, mode);
-}
+    FILE* fopen(char const* path, char const* mode)
+    {
+        KV_NEXT(fopen);
+        wait(AT_FDCWD, path);
+        return real(path, mode);
+    }
 
-FILE* fopen64(char const* path, char const* mode)
-{
-    KV_NEXT(fopen64);
-    wait(AT_FDCWD, path);
-    return real(path, mode);
-}
+    FILE* fopen64(char const* path, char const* mode)
+    {
+        KV_NEXT(fopen64);
+        wait(AT_FDCWD, path);
+        return real(path, mode);
+    }
 
 #define KV_OPEN(name)                                                                                                  \
     int name(char const* path, int flags, ...)                                                                         \
@@ -212,11 +212,11 @@ FILE* fopen64(char const* path, char const* mode)
         va_start(arguments, flags);                                                                                    \
         mode_t const mode = va_arg(arguments, mode_t);                                                                 \
         va_end(arguments);                                                                                             \
-        wait(AT_FDCWD, path, flags & O_NOFOLLOW);                                                                      \
+        wait(AT_FDCWD, path, flags& O_NOFOLLOW);                                                                       \
         return real(path, flags, mode);                                                                                \
     }
 
-KV_OPEN(open)
-KV_OPEN(open64)
+    KV_OPEN(open)
+    KV_OPEN(open64)
 
 } // extern "C"

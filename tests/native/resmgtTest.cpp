@@ -405,7 +405,10 @@ TEST(OsFile, TellsSizesAndNamesWhatHasNone)
 TEST(OsAsync, LeavesFewThreadsBehindWhatIsSilentAndDoesAllOnceThereIsAnAnswer)
 {
     auto const countThreads = []
-    { return std::distance(std::filesystem::directory_iterator("/proc/self/task"), std::filesystem::directory_iterator()); };
+    {
+        return std::distance(std::filesystem::directory_iterator("/proc/self/task"),
+                             std::filesystem::directory_iterator());
+    };
     auto const waitUntil = [](auto const& condition)
     {
         while (!condition())

@@ -63,8 +63,7 @@ QString makeWrappable(QString text)
 
 QtBrowserPane::QtBrowserPane(QWidget* parent, QtListenerHandle<NtBrowserListener> const& handle)
     : QWidget(parent), _handle(handle), _up(new QToolButton(this)),
-      _path(new QtPathField(this, [this] { goToTyped(); })),
-      _model(new QtDirModel(this, [this] { onRead(); })),
+      _path(new QtPathField(this, [this] { goToTyped(); })), _model(new QtDirModel(this, [this] { onRead(); })),
       _list(new QtBrowserList(this, {[this] { activate(); }, [this] { goUp(); }})), _message(new QLabel(this))
 {
     _up->setIcon(style()->standardIcon(QStyle::SP_FileDialogToParent));

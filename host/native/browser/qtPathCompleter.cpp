@@ -69,17 +69,16 @@ void QtPathCompleter::propose(QString const& text, std::string const& path)
         _names.clear();
         _worker.cancel();
         if (!wanted.empty())
-            _worker.start(
-                OsAsync::getEntries(wanted),
-                [this, wanted](std::atomic<bool> const& cancelled)
-                {
-                    return [this, names = readNames(wanted, cancelled)]
-                    {
-                        _names = names;
-                        filter();
-                        _onReady();
-                    };
-                });
+            _worker.start(OsAsync::getEntries(wanted),
+                          [this, wanted](std::atomic<bool> const& cancelled)
+                          {
+                              return [this, names = readNames(wanted, cancelled)]
+                              {
+                                  _names = names;
+                                  filter();
+                                  _onReady();
+                              };
+                          });
     }
     filter();
 }

@@ -20,8 +20,8 @@ public:
     /// `onReady` is called when proposals that had to be waited for are there.
     QtPathCompleter(QObject* parent, std::function<void()> onReady);
 
-    /// The proposals from now on. `path` is what the part of `text` up to its last slash stands for; it need not be that
-    /// of a directory.
+    /// The proposals from now on. `path` is what the part of `text` up to its last slash stands for; it need not be
+    /// that of a directory.
     void propose(QString const& text, std::string const& path);
 
     QString pathFromIndex(QModelIndex const& index) const override;

@@ -147,8 +147,8 @@ std::vector<Errands::iterator> Desk::takeReady()
 
 bool Desk::hasToWait(Errand const& errand) const
 {
-    return std::any_of(_underWay.begin(), _underWay.end(), [&errand](Errand const& one)
-                       { return one.path == errand.path || one.silences(errand.path); });
+    return std::any_of(_underWay.begin(), _underWay.end(),
+                       [&errand](Errand const& one) { return one.path == errand.path || one.silences(errand.path); });
 }
 
 } // namespace

@@ -15,8 +15,8 @@ namespace Kv
 
 /// Asks the file system in threads that nobody waits for longer than a moment, not even the end of the process: a
 /// network's in its bad hour answers minutes later. Of two works on one path the second waits for the first, what is
-/// below a path that is silent waits for that, and no more than a few dozen are under way at once: however often somebody
-/// asks, few threads hang.
+/// below a path that is silent waits for that, and no more than a few dozen are under way at once: however often
+/// somebody asks, few threads hang.
 class KV_API OsAsync
 {
 public:
@@ -46,7 +46,8 @@ public:
         auto const task = std::make_shared<Task>(std::move(question));
         auto const cancelled = std::make_shared<std::atomic<bool>>(false);
         auto answer = task->get_future();
-        start(path, [task] { (*task)(); }, cancelled);
+        start(
+            path, [task] { (*task)(); }, cancelled);
         if (answer.wait_for(patience) == std::future_status::ready)
             return answer.get();
         *cancelled = true;
