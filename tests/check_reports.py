@@ -1,5 +1,5 @@
-"""Reads what the sanitizers wrote during a test run, and fails for every error, for each leak that was allocated by one of
-the project's own libraries, and for each race in which one of the two accesses is made there. The interpreter and Qt
+"""Reads what the sanitizers wrote during a test run, and fails for every error, for each leak that was allocated by one
+of the project's own libraries, and for each race in which one of the two accesses is made there. The interpreter and Qt
 keep much until the end of the process, and Qt's locks are not seen; that is theirs."""
 
 import pathlib
@@ -8,7 +8,7 @@ import sys
 
 RUNTIMES = re.compile(r'lib(asan|tsan|ubsan|stdc\+\+)\.so')
 OURS = re.compile(r'[/(]libKV\w+\.so|\((velmora|\w+Test)\+')
-ACCESS = re.compile(r'^  (?:previous )?(?:atomic )?(?:read|write) of .*\n((?:    #.*\n)*)', re.MULTILINE | re.IGNORECASE)
+ACCESS = re.compile(r'^  (?:previous )?(?:atomic )?(?:read|write) of .*\n((?:    #.*\n)*)', re.M | re.I)
 FRAME = re.compile(r'^\s+#\d+ .*$', re.MULTILINE)
 
 
