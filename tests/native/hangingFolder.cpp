@@ -2,7 +2,9 @@
 // KV_HANGING_FOLDER names, at anything in it, or at a link to that, waits for as long as the file KV_HANGING_WHILE is
 // there.
 
+#include <algorithm>
 #include <cerrno>
+#include <climits>
 #include <cstdarg>
 #include <cstdlib>
 #include <cstring>
@@ -28,9 +30,10 @@ bool isOn()
 
 std::string readLink(std::string const& link)
 {
-    char target[4096];
-    long const length = syscall(SYS_readlink, link.c_str(), target, sizeof target);
-    return length < 0 ? std::string() : std::string(target, static_cast<std::size_t>(length));
+    std::string target(PATH_MAX, '\0');
+    long const length = syscall(SYS_readlink, link.c_str(), target.data(), target.size());
+    target.resize(static_cast<std::size_t>(std::max(length, 0L)));
+    return target;
 }
 
 std::string nameDescriptor(int descriptor)
@@ -46,7 +49,7 @@ std::string resolve(int folder, char const* path, int flags)
     long const descriptor = syscall(SYS_openat, folder, path, O_PATH | O_CLOEXEC | flags);
     if (descriptor >= 0)
     {
-        std::string const real = nameDescriptor(static_cast<int>(descriptor));
+        std::string real = nameDescriptor(static_cast<int>(descriptor));
         syscall(SYS_close, descriptor);
         return real;
     }
@@ -67,7 +70,7 @@ void waitFor(std::string const& path)
     }
 }
 
-void wait(int folder, char const* path, int flags = 0)
+void wait(int folder, char const* path, int flags)
 {
     int const before = errno;
     if (isOn())
@@ -87,127 +90,41 @@ template <typename Function> Function* next(char const* name)
 
 } // namespace
 
-#define KV_NEXT(name) static auto* const real = next<decltype(name)>(#name)
-
-extern "C"
-{
-
-    int stat(char const* path, struct stat* status)
-    {
-        KV_NEXT(stat);
-        wait(AT_FDCWD, path);
-        return real(path, status);
-    }
-
-    int stat64(char const* path, struct stat64* status)
-    {
-        KV_NEXT(stat64);
-        wait(AT_FDCWD, path);
-        return real(path, status);
-    }
-
-    int lstat(char const* path, struct stat* status)
-    {
-        KV_NEXT(lstat);
-        wait(AT_FDCWD, path, O_NOFOLLOW);
-        return real(path, status);
-    }
-
-    int lstat64(char const* path, struct stat64* status)
-    {
-        KV_NEXT(lstat64);
-        wait(AT_FDCWD, path, O_NOFOLLOW);
-        return real(path, status);
-    }
-
-    int fstatat(int folder, char const* path, struct stat* status, int flags)
-    {
-        KV_NEXT(fstatat);
-        wait(folder, path, noFollow(flags));
-        return real(folder, path, status, flags);
-    }
-
-    int fstatat64(int folder, char const* path, struct stat64* status, int flags)
-    {
-        KV_NEXT(fstatat64);
-        wait(folder, path, noFollow(flags));
-        return real(folder, path, status, flags);
-    }
-
-    int statx(int folder, char const* path, int flags, unsigned mask, struct statx* status)
-    {
-        KV_NEXT(statx);
-        wait(folder, path, noFollow(flags));
-        return real(folder, path, flags, mask, status);
-    }
-
-    int access(char const* path, int mode)
-    {
-        KV_NEXT(access);
-        wait(AT_FDCWD, path);
-        return real(path, mode);
-    }
-
-    int faccessat(int folder, char const* path, int mode, int flags)
-    {
-        KV_NEXT(faccessat);
-        wait(folder, path);
-        return real(folder, path, mode, flags);
-    }
-
-    ssize_t readlink(char const* path, char* target, size_t size)
-    {
-        KV_NEXT(readlink);
-        wait(AT_FDCWD, path, O_NOFOLLOW);
-        return real(path, target, size);
-    }
-
-    char* realpath(char const* path, char* resolved)
-    {
-        KV_NEXT(realpath);
-        wait(AT_FDCWD, path);
-        return real(path, resolved);
-    }
-
-    DIR* opendir(char const* path)
-    {
-        KV_NEXT(opendir);
-        wait(AT_FDCWD, path);
-        return real(path);
-    }
-
-    dirent* readdir(DIR* stream)
-    {
-        KV_NEXT(readdir);
-        wait(dirfd(stream), "");
-        return real(stream);
-    }
-
-    dirent64* readdir64(DIR* stream)
-    {
-        KV_NEXT(readdir64);
-        wait(dirfd(stream), "");
-        return real(stream);
-    }
-
-    FILE* fopen(char const* path, char const* mode)
-    {
-        KV_NEXT(fopen);
-        wait(AT_FDCWD, path);
-        return real(path, mode);
-    }
-
-    FILE* fopen64(char const* path, char const* mode)
-    {
-        KV_NEXT(fopen64);
-        wait(AT_FDCWD, path);
-        return real(path, mode);
-    }
-
-#define KV_OPEN(name)                                                                                                  \
-    int name(char const* path, int flags, ...)                                                                         \
+// A call of the system's library that waits for what it asks for.
+#define KV_HANGS(result, name, parameters, folder, path, flags, arguments)                                             \
+    extern "C" result name parameters                                                                                  \
     {                                                                                                                  \
-        KV_NEXT(name);                                                                                                 \
+        static auto* const real = next<decltype(name)>(#name);                                                         \
+        wait(folder, path, flags);                                                                                     \
+        return real arguments;                                                                                         \
+    }
+
+KV_HANGS(int, stat, (char const* path, struct stat* status), AT_FDCWD, path, 0, (path, status))
+KV_HANGS(int, stat64, (char const* path, struct stat64* status), AT_FDCWD, path, 0, (path, status))
+KV_HANGS(int, lstat, (char const* path, struct stat* status), AT_FDCWD, path, O_NOFOLLOW, (path, status))
+KV_HANGS(int, lstat64, (char const* path, struct stat64* status), AT_FDCWD, path, O_NOFOLLOW, (path, status))
+KV_HANGS(int, fstatat, (int folder, char const* path, struct stat* status, int flags), folder, path, noFollow(flags),
+         (folder, path, status, flags))
+KV_HANGS(int, fstatat64, (int folder, char const* path, struct stat64* status, int flags), folder, path,
+         noFollow(flags), (folder, path, status, flags))
+KV_HANGS(int, statx, (int folder, char const* path, int flags, unsigned mask, struct statx* status), folder, path,
+         noFollow(flags), (folder, path, flags, mask, status))
+KV_HANGS(int, access, (char const* path, int mode), AT_FDCWD, path, 0, (path, mode))
+KV_HANGS(int, faccessat, (int folder, char const* path, int mode, int flags), folder, path, 0,
+         (folder, path, mode, flags))
+KV_HANGS(ssize_t, readlink, (char const* path, char* target, size_t size), AT_FDCWD, path, O_NOFOLLOW,
+         (path, target, size))
+KV_HANGS(char*, realpath, (char const* path, char* resolved), AT_FDCWD, path, 0, (path, resolved))
+KV_HANGS(DIR*, opendir, (char const* path), AT_FDCWD, path, 0, (path))
+KV_HANGS(dirent*, readdir, (DIR * stream), dirfd(stream), "", 0, (stream))
+KV_HANGS(dirent64*, readdir64, (DIR * stream), dirfd(stream), "", 0, (stream))
+KV_HANGS(FILE*, fopen, (char const* path, char const* mode), AT_FDCWD, path, 0, (path, mode))
+KV_HANGS(FILE*, fopen64, (char const* path, char const* mode), AT_FDCWD, path, 0, (path, mode))
+
+#define KV_OPENS(name)                                                                                                 \
+    extern "C" int name(char const* path, int flags, ...)                                                              \
+    {                                                                                                                  \
+        static auto* const real = next<decltype(name)>(#name);                                                         \
         va_list arguments;                                                                                             \
         va_start(arguments, flags);                                                                                    \
         mode_t const mode = va_arg(arguments, mode_t);                                                                 \
@@ -216,7 +133,5 @@ extern "C"
         return real(path, flags, mode);                                                                                \
     }
 
-    KV_OPEN(open)
-    KV_OPEN(open64)
-
-} // extern "C"
+KV_OPENS(open)
+KV_OPENS(open64)
