@@ -5,7 +5,10 @@
 #include "recoveryQuestion.h"
 
 #include "exBase.h"
+#include "files/osAsync.h"
+#include "files/osFile.h"
 #include "pointers/rcWeakPtr.h"
+#include "text/liString.h"
 #include "uiAppMgr.h"
 #include "wsNative.h"
 
@@ -15,6 +18,7 @@
 
 #include <algorithm>
 #include <cstdlib>
+#include <fcntl.h>
 #include <filesystem>
 #include <sstream>
 #include <unistd.h>
@@ -33,6 +37,17 @@ constexpr int interruptedStatus = 130;
 QString toText(std::string const& bytes)
 {
     return QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()));
+}
+
+/// Throws for a file that would keep the window from answering, since its file system does not.
+void requireAnswer(std::string const& path)
+{
+    auto const look = [path]
+    { return Kv::OsFileDescriptor(open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC)).isOpen(); };
+    if (!Kv::OsAsync::ask(path, look))
+        throw Kv::ExBase(__FILE__, __LINE__,
+                         "The file system of " + Kv::LiStringUtil::getPrintablePath(path) +
+                             " does not answer. Try it later");
 }
 
 /// True if somebody can look at the windows.
@@ -134,7 +149,7 @@ Commands Application::makeCommands()
     commands.saveComposition = [this] { saveComposition(); };
     commands.closeComposition = [this] { closeComposition(); };
     commands.runScript = [this] { askScript(); };
-    commands.runScriptAgain = [this] { startScript(*_lastScript, false); };
+    commands.runScriptAgain = [this] { startChosen(*_lastScript); };
     commands.getRecentScripts = [this] { return _settings.getScripts(); };
     commands.runRecentScript = [this](std::string const& path) { runRecentScript(path); };
     commands.forgetRecentScripts = [this] { _settings.clearScripts(); };
@@ -335,14 +350,14 @@ void Application::loadFocused(Kv::EvEvent&)
     // Later: what goes wrong is told in a box, for which nobody shall wait.
     std::string const path = _browser->getInputFocusPath().toString();
     QMetaObject::invokeMethod(
-        &_window, [this, path] { attempt([&] { openComposition(path); }); }, Qt::QueuedConnection);
+        &_window, [this, path] { openChosen(path); }, Qt::QueuedConnection);
 }
 
 void Application::runFocused(Kv::EvEvent&)
 {
     std::filesystem::path const path = _browser->getInputFocusPath().toString();
     if (Kv::BrBrowser::isScript(path.filename()))
-        startScript(ScriptCall::makeFile(path, {}), false);
+        startChosen(ScriptCall::makeFile(path, {}));
     else
         _window.tell(QObject::tr("%1 is neither a composition nor a script").arg(toText(path.filename())));
 }
@@ -351,26 +366,45 @@ void Application::askComposition()
 {
     std::string const path = askPath(QObject::tr("Open Composition"), _browser->getPath().toString());
     if (!path.empty())
-        attempt([&] { openComposition(path); });
+        openChosen(path);
+}
+
+void Application::openChosen(std::string const& path)
+{
+    attempt(
+        [&]
+        {
+            requireAnswer(path);
+            openComposition(path);
+        });
 }
 
 void Application::askScript()
 {
     std::vector<std::string> const recent = _settings.getScripts();
     std::string const last = recent.empty() ? "" : std::filesystem::path(recent.front()).parent_path();
-    std::error_code error;
-    bool const isThere = std::filesystem::is_directory(last, error);
+    bool const isThere = Kv::OsFsUtils::findKind(Kv::OsFilePath(last)) == std::filesystem::file_type::directory;
     std::string const path = askPath(QObject::tr("Run Script"), isThere ? last : _browser->getPath().toString());
     if (!path.empty())
-        startScript(ScriptCall::makeFile(path, {}), false);
+        startChosen(ScriptCall::makeFile(path, {}));
+}
+
+void Application::startChosen(ScriptCall const& script)
+{
+    attempt(
+        [&]
+        {
+            if (script.kind == ScriptCall::Kind::File)
+                requireAnswer(script.target);
+            startScript(script, false);
+        });
 }
 
 void Application::runRecentScript(std::string const& path)
 {
-    std::error_code error;
-    if (std::filesystem::exists(path, error))
+    if (Kv::OsFsUtils::fileExists(Kv::OsFilePath(path)))
     {
-        startScript(ScriptCall::makeFile(path, {}), false);
+        startChosen(ScriptCall::makeFile(path, {}));
         return;
     }
     _settings.removeScript(path);
@@ -393,6 +427,8 @@ void Application::saveComposition()
 bool Application::save(Composition const& composition)
 {
     Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const accessor(composition);
+    if (!attempt([&] { requireAnswer(accessor->getPath().toString()); }))
+        return false;
     if (!accessor->isChangedOnDisk())
         return attempt([&] { _workspace->save(composition); });
     QMessageBox box(QMessageBox::Warning, QObject::tr("Velmora"),
@@ -508,8 +544,11 @@ void Application::showCompositions()
         Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const accessor(composition);
         if (accessor.isNull())
             continue;
-        entries.push_back({toText(accessor->getGraph()->getName()), toText(accessor->getPath().toString()),
-                           composition == current, accessor->isEditable(), accessor->isModified()});
+        // One whose file system does not answer cannot be written now.
+        std::string const path = accessor->getPath().toString();
+        auto const look = [path] { return Kv::OsFile(Kv::OsFilePath(path)).isWritable(); };
+        entries.push_back({toText(accessor->getGraph()->getName()), toText(path), composition == current,
+                           Kv::OsAsync::ask(path, look).value_or(false), accessor->isModified()});
     }
     _window.showCompositions(entries);
     Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const accessor(current);

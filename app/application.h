@@ -66,6 +66,9 @@ private:
     /// Ctrl-C: the application ends, unless the user wants to keep changes.
     void interrupt();
 
+    /// Both throw nothing, but tell the user what is in the way.
+    void openChosen(std::string const& path);
+    void startChosen(ScriptCall const& script);
     void runRecentScript(std::string const& path);
     /// For any thread.
     void stopScript();

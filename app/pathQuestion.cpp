@@ -1,5 +1,6 @@
 #include "pathQuestion.h"
 
+#include "files/osFile.h"
 #include "piBrowserSchemes.h"
 #include "uiAppMgr.h"
 #include "uiApplication.h"
@@ -32,8 +33,11 @@ std::string PathQuestion::ask()
 void PathQuestion::onOk(Kv::EvEvent&)
 {
     std::string const path = _handler.getBrowser()->getInputFocusPath().toString();
-    std::error_code error;
-    if (path.empty() || std::filesystem::is_directory(path, error))
+    if (path.empty())
+        return;
+    auto const kind = Kv::OsFsUtils::findKind(Kv::OsFilePath(path));
+    // What does not answer is no file to be opened either.
+    if (!kind || kind == std::filesystem::file_type::directory)
         return;
     _path = path;
     _handler.hide();

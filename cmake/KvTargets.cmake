@@ -5,7 +5,10 @@ target_compile_definitions(kv_options INTERFACE BOOST_ALLOW_DEPRECATED_HEADERS B
 target_compile_options(kv_options INTERFACE -Wall -Wextra -Wpedantic -Wshadow)
 # A library calls its own functions straight, also those that it exports, and the compiler may inline them.
 target_compile_options(kv_options INTERFACE -fno-semantic-interposition)
-if(KV_SANITIZE)
+if(KV_SANITIZE STREQUAL thread)
+  target_compile_options(kv_options INTERFACE -fsanitize=thread)
+  target_link_options(kv_options INTERFACE -fsanitize=thread)
+elseif(KV_SANITIZE)
   # Boost.Python asks the holder of an instance for its type when it has destroyed it, which the check of virtual tables
   # does not survive.
   target_compile_options(kv_options INTERFACE -fsanitize=address,undefined -fno-sanitize=vptr

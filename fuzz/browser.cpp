@@ -89,7 +89,7 @@ void requirePlace(std::string const& path, std::string const& base)
     for (auto const find : {&OsPlace::find, &OsPlace::findNew})
         try
         {
-            OsPlace const place = find(path, base);
+            OsPlace const place = find(OsPlace::complete(path, base));
             Fuzz::require(fs::is_directory(place.directory), "a place is in a directory");
             Fuzz::require(place.name.find('/') == std::string::npos, "a name is one component");
         }

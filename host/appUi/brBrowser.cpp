@@ -2,12 +2,12 @@
 
 #include "brBrowsable.h"
 #include "exBase.h"
+#include "files/osAsync.h"
 #include "files/osPlace.h"
 #include "fwComposition.h"
 #include "uiContainer.h"
 
 #include <filesystem>
-#include <optional>
 #include <system_error>
 #include <utility>
 
@@ -17,11 +17,19 @@ namespace Kv
 namespace
 {
 
-/// True also for a link that leads nowhere.
-bool isThere(std::string const& path)
+/// Those entries of a directory that are there, also links that lead nowhere; all, if it does not answer in time.
+std::vector<std::string> findThere(std::string const& directory, std::vector<std::string> const& names)
 {
-    std::error_code error;
-    return std::filesystem::exists(std::filesystem::symlink_status(path, error));
+    auto const look = [directory, names]
+    {
+        std::vector<std::string> found;
+        for (std::string const& name : names)
+            if (std::error_code error;
+                std::filesystem::exists(std::filesystem::symlink_status(OsPlace::join(directory, name), error)))
+                found.push_back(name);
+        return found;
+    };
+    return OsAsync::ask(OsAsync::getEntries(directory), look).value_or(names);
 }
 
 } // namespace
@@ -113,7 +121,7 @@ bool BrBrowser::setURL(LiString const& url, HistoryEnum, UpdateEnum)
     OsPlace place;
     try
     {
-        place = OsPlace::find(url.toString(), "");
+        place = OsPlace::findInTime(OsPlace::complete(url.toString(), ""));
     }
     catch (ExBase const&)
     {
@@ -154,8 +162,9 @@ LiString BrBrowser::getInputFocusPath() const
 {
     if (!_newPath.empty())
         return _newPath;
-    std::string const path = OsPlace::join(_directory, _focus);
-    return _focus.empty() || !isThere(path) ? LiString() : LiString(path);
+    if (_focus.empty() || findThere(_directory, {_focus}).empty())
+        return {};
+    return OsPlace::join(_directory, _focus);
 }
 
 LiString BrBrowser::getPath() const
@@ -174,13 +183,16 @@ void BrBrowser::setTakesNew(bool takesNew)
     _takesNew = takesNew;
 }
 
-bool BrBrowser::takeTypedPath()
+void BrBrowser::takeTypedPath(std::function<void()> taken)
 {
     RCShdPtr<BrBrowser> const self(this);
     requireUiThread();
-    std::optional<std::string> const typed = getPeer() ? getPeer()->takeTypedPath(_takesNew) : std::string();
-    _newPath = typed.value_or("");
-    return typed.has_value();
+    _newPath.clear();
+    _taken = std::move(taken);
+    if (NtBrowser* const peer = getPeer())
+        peer->takeTypedPath(_takesNew);
+    else
+        onTypedPathTaken("");
 }
 
 void BrBrowser::showState(NtBrowser& peer)
@@ -215,6 +227,14 @@ void BrBrowser::onActivated()
         fire(PiWidget::Activate);
 }
 
+void BrBrowser::onTypedPathTaken(std::string const& newPath)
+{
+    RCShdPtr<BrBrowser> const self(this);
+    _newPath = newPath;
+    if (auto const taken = std::exchange(_taken, nullptr))
+        taken();
+}
+
 void BrBrowser::showCollapsing(NtBrowser& peer) const
 {
     peer.setCollapsing([sequences = _sequencesCollapsed, compositions = _compositionsCollapsed](std::string const& name)
@@ -224,9 +244,9 @@ void BrBrowser::showCollapsing(NtBrowser& peer) const
 RCShdPtr<SnSelection> BrBrowser::makeSelection() const
 {
     SnSelection::Items items;
-    for (std::string const& name : _newPath.empty() ? _selected : std::vector<std::string>())
-        if (std::string const path = OsPlace::join(_directory, name); isThere(path))
-            items.push_back(makeShd<BrBrowsableItem>(makeShd<BrBrowsable>(path)));
+    if (_newPath.empty() && !_selected.empty())
+        for (std::string const& name : findThere(_directory, _selected))
+            items.push_back(makeShd<BrBrowsableItem>(makeShd<BrBrowsable>(OsPlace::join(_directory, name))));
     return makeShd<SnSelection>(std::move(items));
 }
 

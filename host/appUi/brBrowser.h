@@ -9,6 +9,7 @@
 #include "uiPeeredWidget.h"
 #include "uiWorkspace.h"
 
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -59,7 +60,8 @@ public:
     void setMultiple(bool multiple);
 
     /// Goes to a directory, or to that of a file, which then is in focus. `url` is a path; one that is relative begins
-    /// in the current directory of the process. False, with everything as it was, if nothing is there.
+    /// in the current directory of the process. False, with everything as it was, if nothing is there. Where the file
+    /// system does not answer in time, it goes there as to a directory, which it shows once there is an answer.
     bool setURL(LiString const& url, HistoryEnum, UpdateEnum);
 
     /// Selects the browsables of the selection that are in the current directory. Where none is, or the selection is
@@ -67,7 +69,7 @@ public:
     void select(RCShdPtr<SnSelection> const& selection);
 
     /// The path of the entry that has the keyboard in it, or the one that `takeTypedPath` took; empty if none is
-    /// selected, or it is gone.
+    /// selected, or it is gone. Where the file system does not answer in time, what was there is.
     LiString getInputFocusPath() const;
 
     /// The current directory.
@@ -79,9 +81,10 @@ public:
     /// Lets the user type the path of an entry that is not there yet, as at first, or keeps the user from it.
     void setTakesNew(bool takesNew);
 
-    /// Goes where the user has typed in its field without pressing Enter. What is not there yet, in a directory that
-    /// is, is in focus then, and nothing is selected. False, which the user is told, if nothing can be there.
-    bool takeTypedPath();
+    /// Goes where the user has typed in its field without pressing Enter, if the user has, and calls `taken` then: at
+    /// once, or when the file system has answered, unless the user has done something else by then. What is not there
+    /// yet, in a directory that is, is in focus, and nothing is selected. Where nothing can be there the user is told.
+    void takeTypedPath(std::function<void()> taken);
 
 protected:
     explicit BrBrowser(std::string name);
@@ -93,6 +96,7 @@ private:
     void onDirectoryChanged(std::string const& directory) override;
     void onSelectionChanged(std::string const& focus, std::vector<std::string> const& selected) override;
     void onActivated() override;
+    void onTypedPathTaken(std::string const& newPath) override;
 
     void showCollapsing(NtBrowser& peer) const;
     RCShdPtr<SnSelection> makeSelection() const;
@@ -103,6 +107,7 @@ private:
     std::vector<std::string> _selected;
     /// The whole path of what is not there yet.
     std::string _newPath;
+    std::function<void()> _taken;
     bool _takesNew = true;
     bool _sequencesCollapsed = true;
     bool _compositionsCollapsed = false;

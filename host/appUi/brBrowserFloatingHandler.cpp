@@ -103,10 +103,15 @@ void BrBrowserFloatingHandler::onFileActivated(EvEvent&)
     _ok->press();
 }
 
-void BrBrowserFloatingHandler::onOk(EvEvent& event)
+void BrBrowserFloatingHandler::onOk(EvEvent&)
 {
-    if (_browser->takeTypedPath() && _activateCb)
-        _activateCb->call(event);
+    _browser->takeTypedPath(
+        [this]
+        {
+            EvEvent event(PiWidget::Activate);
+            if (_activateCb)
+                _activateCb->call(event);
+        });
 }
 
 void BrBrowserFloatingHandler::onCancel(EvEvent&)

@@ -1,11 +1,13 @@
 #include "brBrowsable.h"
 #include "brBrowser.h"
 #include "browser/qtDirListing.h"
+#include "browser/qtDirWorker.h"
 #include "exBase.h"
 #include "files/osPlace.h"
 #include "piWidget.h"
 #include "uiTopLevel.h"
 #include "uiWorkspace.h"
+#include "wsNative.h"
 
 #include <QApplication>
 #include <QLabel>
@@ -15,13 +17,18 @@
 #include <QTreeView>
 
 #include <algorithm>
+#include <atomic>
+#include <chrono>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <functional>
 #include <gtest/gtest.h>
+#include <memory>
+#include <random>
 #include <set>
 #include <string>
+#include <thread>
 #include <unistd.h>
 #include <vector>
 
@@ -66,6 +73,8 @@ protected:
             titles.push_back(listing.getEntries().at(static_cast<std::size_t>(index)).title);
         return titles;
     }
+
+    static void wait(std::function<bool()> const& condition) { EXPECT_TRUE(QTest::qWaitFor(condition, 5000)); }
 
     fs::path folder;
 };
@@ -129,7 +138,13 @@ protected:
             press({Qt::Key_Return});
     }
 
-    static void wait(std::function<bool()> const& condition) { EXPECT_TRUE(QTest::qWaitFor(condition, 5000)); }
+    /// True if what is typed leads somewhere.
+    bool takeTypedPath() const
+    {
+        bool taken = false;
+        browser->takeTypedPath([&] { taken = true; });
+        return taken;
+    }
 
     std::string focus() const { return browser->getInputFocusPath().toString(); }
     std::string place() const { return browser->getPath().toString(); }
@@ -197,7 +212,7 @@ TEST_F(Folder, IsFoundByPathsAsPeopleWriteThem)
     setenv("HOME", root.c_str(), 1); // NOLINT(concurrency-mt-unsafe)
     auto const find = [&](std::string const& path)
     {
-        OsPlace const place = OsPlace::find(path, root + "/sub");
+        OsPlace const place = OsPlace::find(OsPlace::complete(path, root + "/sub"));
         return place.directory + "|" + place.name;
     };
     EXPECT_EQ(find("../file"), root + "|file");
@@ -212,11 +227,70 @@ TEST_F(Folder, IsFoundByPathsAsPeopleWriteThem)
     EXPECT_EQ(find("link"), root + "/sub/link|");
     EXPECT_EQ(find("link/.."), root + "/far|");
     EXPECT_EQ(find("link/./../../file"), root + "|file");
-    OsPlace const added = OsPlace::findNew("link/../new", root + "/sub");
+    OsPlace const added = OsPlace::findNew(root + "/sub/link/../new");
     EXPECT_EQ(added.directory + "|" + added.name, root + "/far|new");
     for (char const* const path : {"../file", ".", "none/new", "new/", "../file/new"})
-        EXPECT_THROW(OsPlace::findNew(path, root + "/sub"), ExBase) << path;
+        EXPECT_THROW(OsPlace::findNew(OsPlace::complete(path, root + "/sub")), ExBase) << path;
     EXPECT_EQ(OsPlace::findNearest(root + "/sub/a/b"), root + "/sub");
+}
+
+TEST_F(Folder, IsReadInAThreadThatIsCancelledAndLeftAtAnyMoment)
+{
+    WsNative::getPlatform();
+    for (int number = 0; number < 300; ++number)
+        make({"file" + std::to_string(number)});
+    std::minstd_rand random(1); // NOLINT(cert-msc32-c,cert-msc51-cpp): the same each time
+    auto worker = std::make_unique<QtDirWorker>();
+    int started = 0;
+    int seen = 0;
+    auto const makeReading = [&]() -> QtDirWorker::Work
+    {
+        auto const see = [&, number = ++started](std::size_t count)
+        {
+            EXPECT_EQ(number, started);
+            EXPECT_EQ(count, 300U);
+            ++seen;
+        };
+        return [see, directory = folder.native()](std::atomic<bool> const& cancelled) -> std::function<void()>
+        {
+            try
+            {
+                QtDirListing const listing(directory, QtDirListing::Options(), cancelled);
+                return [see, count = listing.getEntries().size()] { see(count); };
+            }
+            catch (ExBase const&)
+            {
+                // The test is over, and the directory is gone.
+                return [] {};
+            }
+        };
+    };
+    for (int step = 0; step < 3000; ++step)
+    {
+        std::this_thread::sleep_for(std::chrono::microseconds(random() % 300));
+        std::string const path = folder / std::to_string(random() % 3);
+        switch (random() % 8)
+        {
+        case 0:
+            worker = std::make_unique<QtDirWorker>();
+            break;
+        case 1:
+            worker->cancel();
+            break;
+        case 2:
+            worker->startAndWait(path, makeReading());
+            break;
+        case 3:
+        case 4:
+            worker->start(path, makeReading());
+            break;
+        default:
+            QCoreApplication::processEvents();
+        }
+    }
+    wait([&] { return !worker->isBusy(); });
+    EXPECT_GT(seen, 100);
+    EXPECT_LE(seen, started);
 }
 
 TEST_F(Browser, GoesAndSelectsWithoutAWindow)
@@ -273,13 +347,13 @@ TEST_F(Browser, GoesWhereThePathIsTyped)
     EXPECT_EQ(place(), folder);
     EXPECT_NE(words().find((folder / "none").string()), std::string::npos);
     browser->setTakesNew(false);
-    EXPECT_FALSE(browser->takeTypedPath());
+    EXPECT_FALSE(takeTypedPath());
     browser->setTakesNew(true);
-    EXPECT_TRUE(browser->takeTypedPath());
+    EXPECT_TRUE(takeTypedPath());
     EXPECT_EQ(focus(), folder / "none");
     EXPECT_EQ(place(), folder);
     type("none/none", false);
-    EXPECT_FALSE(browser->takeTypedPath());
+    EXPECT_FALSE(takeTypedPath());
     EXPECT_EQ(focus(), "");
     press({Qt::Key_Escape});
     type("sub/f", true);
@@ -288,7 +362,7 @@ TEST_F(Browser, GoesWhereThePathIsTyped)
     wait([] { return view()->currentIndex().isValid(); });
     EXPECT_EQ(QApplication::focusWidget(), view());
     type("../.secret", false);
-    EXPECT_TRUE(browser->takeTypedPath());
+    EXPECT_TRUE(takeTypedPath());
     EXPECT_EQ(focus(), folder / ".secret");
     wait([] { return rows() == 3; });
     EXPECT_EQ(view()->currentIndex().data().toString(), QLatin1String(".secret"));

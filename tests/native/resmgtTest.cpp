@@ -1,3 +1,4 @@
+#include "files/osAsync.h"
 #include "files/osFile.h"
 #include "text/liString.h"
 #include "text/liStringSubstituter.h"
@@ -5,13 +6,20 @@
 #include "xml/xmlError.h"
 #include "xml/xmlWriter.h"
 
+#include <atomic>
+#include <chrono>
 #include <cstdio>
+#include <filesystem>
 #include <fstream>
 #include <functional>
+#include <future>
 #include <gtest/gtest.h>
+#include <iterator>
+#include <memory>
 #include <optional>
 #include <sstream>
 #include <string>
+#include <thread>
 #include <vector>
 
 using namespace Kv;
@@ -392,4 +400,51 @@ TEST(OsFile, TellsSizesAndNamesWhatHasNone)
     expectContains(wordsOf<ExBase>([&] { OsFile(OsFilePath(path)).getSize(); }), path);
     expectContains(wordsOf<ExBase>([&] { OsFile(OsFilePath(folder)).getSize(); }), folder);
     EXPECT_THROW(OsFile(OsFilePath()).getSize(), ExBase);
+}
+
+TEST(OsAsync, LeavesFewThreadsBehindWhatIsSilentAndDoesAllOnceThereIsAnAnswer)
+{
+    auto const countThreads = []
+    {
+        return std::distance(std::filesystem::directory_iterator("/proc/self/task"),
+                             std::filesystem::directory_iterator());
+    };
+    auto const waitUntil = [](auto const& condition)
+    {
+        while (!condition())
+            std::this_thread::sleep_for(std::chrono::milliseconds(1));
+    };
+    std::promise<void> answer;
+    std::shared_future<void> const answered = answer.get_future().share();
+    std::atomic<int> done = 0;
+    auto const ask = [&](std::string const& path, bool isCancelled)
+    {
+        auto const work = [&]
+        {
+            answered.wait();
+            ++done;
+        };
+        OsAsync::start(path, work, std::make_shared<std::atomic<bool>>(isCancelled));
+    };
+    auto const before = countThreads();
+    ask("/dead", false);
+    waitUntil([] { return OsAsync::isSilent("/dead/deep"); });
+    EXPECT_FALSE(OsAsync::isSilent("/deadly"));
+    for (int number = 0; number < 100; ++number)
+    {
+        ask("/dead", number % 2);
+        ask("/dead/" + std::to_string(number), number % 2);
+    }
+    EXPECT_LT(countThreads(), before + 5);
+    EXPECT_FALSE(OsAsync::ask("/dead/deep", [] { return 1; }));
+    EXPECT_EQ(OsAsync::ask("/alive", [] { return 2; }), 2);
+    EXPECT_THROW(OsAsync::ask("/alive", []() -> int { throw ExBase(__FILE__, __LINE__, "none"); }), ExBase);
+
+    for (int number = 0; number < 100; ++number)
+        ask("/other" + std::to_string(number), false);
+    EXPECT_LT(countThreads(), before + 40);
+    EXPECT_FALSE(OsAsync::ask("/alive", [] { return 3; }));
+    answer.set_value();
+    waitUntil([&] { return done == 201; });
+    waitUntil([&] { return countThreads() < before + 5; });
 }

@@ -38,10 +38,10 @@ public:
             pane->setMultiple(multiple);
     }
 
-    std::optional<std::string> takeTypedPath(bool takesNew) override
+    void takeTypedPath(bool takesNew) override
     {
-        QtBrowserPane* const pane = getNative();
-        return pane ? pane->takeTypedPath(takesNew) : std::string();
+        if (QtBrowserPane* const pane = getNative())
+            pane->takeTypedPath(takesNew);
     }
 };
 

@@ -31,33 +31,26 @@ constexpr std::chrono::seconds lookInterval(1);
 /// The time that a reading may take before the list says so.
 constexpr std::chrono::milliseconds patience(250);
 
-/// The reason why a directory cannot be shown any more, in words; empty if it can.
-std::string findFault(std::string const& directory)
-{
-    try
-    {
-        if (OsPlace::find(directory, "").name.empty())
-            return "";
-        return OsPlace::quote(directory) + " is no folder any more";
-    }
-    catch (ExBase const& error)
-    {
-        return error.getReason();
-    }
-}
+/// The looks that have to be left out before the user is told.
+constexpr int toldLooks = 3;
 
 /// The path of an entry that is not there yet, in a directory that is; empty for any other.
-std::string findNewPath(std::string const& typed, std::string const& base)
+std::string findNewPath(std::string const& path)
 {
     try
     {
-        OsPlace const place = OsPlace::findNew(typed, base);
+        OsPlace const place = OsPlace::findNew(path);
         return OsPlace::join(place.directory, place.name);
     }
     catch (ExBase const&)
     {
         return "";
     }
+}
+
+std::string tellSilence(std::string const& who)
+{
+    return who + " has not answered yet";
 }
 
 /// Lets a path be wrapped at its slashes.
@@ -70,8 +63,7 @@ QString makeWrappable(QString text)
 
 QtBrowserPane::QtBrowserPane(QWidget* parent, QtListenerHandle<NtBrowserListener> const& handle)
     : QWidget(parent), _handle(handle), _up(new QToolButton(this)),
-      _path(new QtPathField(this, [this] { takeTypedPath(false); })),
-      _model(new QtDirModel(this, [this] { onRead(); })),
+      _path(new QtPathField(this, [this] { goToTyped(); })), _model(new QtDirModel(this, [this] { onRead(); })),
       _list(new QtBrowserList(this, {[this] { activate(); }, [this] { goUp(); }})), _message(new QLabel(this))
 {
     _up->setIcon(style()->standardIcon(QStyle::SP_FileDialogToParent));
@@ -93,7 +85,12 @@ QtBrowserPane::QtBrowserPane(QWidget* parent, QtListenerHandle<NtBrowserListener
     connect(_up, &QToolButton::clicked, this, [this] { goUp(); });
     connect(&_looking, &QTimer::timeout, this, [this] { look(); });
     _patience.setSingleShot(true);
-    connect(&_patience, &QTimer::timeout, this, [this] { showState(); });
+    connect(&_patience, &QTimer::timeout, this,
+            [this]
+            {
+                _model->showNames();
+                showState();
+            });
 }
 
 void QtBrowserPane::nameParts()
@@ -124,6 +121,9 @@ void QtBrowserPane::goTo(std::string const& directory, QtBrowserChoice const& ch
 {
     _directory = directory;
     _notice.clear();
+    _missedLooks = 0;
+    _looker.cancel();
+    _seeker.cancel();
     _selection->await(choice);
     _told = choice;
     _path->setDirectory(directory);
@@ -137,7 +137,7 @@ void QtBrowserPane::setCollapsing(std::function<bool(std::string const&)> collap
 {
     _model->setCollapsing(std::move(collapses));
     if (!_directory.empty())
-        _model->reread();
+        reread();
 }
 
 void QtBrowserPane::setMultiple(bool multiple)
@@ -145,27 +145,24 @@ void QtBrowserPane::setMultiple(bool multiple)
     _list->setSelectionMode(multiple ? QAbstractItemView::ExtendedSelection : QAbstractItemView::SingleSelection);
 }
 
-std::optional<std::string> QtBrowserPane::takeTypedPath(bool takesNew)
+void QtBrowserPane::takeTypedPath(bool takesNew)
 {
     if (!_path->isEdited() || !isVisible())
-        return "";
-    std::string const typed = _path->getTypedPath();
-    try
     {
-        OsPlace const place = OsPlace::find(typed.empty() ? _directory : typed, _directory);
-        if (_path->hasFocus())
-            _list->setFocus(Qt::OtherFocusReason);
-        walkTo(place.directory, {place.name, {}});
-        return "";
+        _handle.tell(&NtBrowserListener::onTypedPathTaken, std::string());
+        return;
     }
-    catch (ExBase const& error)
-    {
-        if (takesNew)
-            if (std::string path = findNewPath(typed, _directory); !path.empty())
-                return path;
-        say(error.getReason());
-        return std::nullopt;
-    }
+    seekTyped(
+        [this, takesNew](Found const& found)
+        {
+            bool const isNew = takesNew && !found.newPath.empty();
+            if (found.fault.empty())
+                walkToTyped(found.place);
+            else if (!isNew)
+                say(found.fault);
+            if (found.fault.empty() || isNew)
+                _handle.tell(&NtBrowserListener::onTypedPathTaken, found.newPath);
+        });
 }
 
 void QtBrowserPane::showEvent(QShowEvent* event)
@@ -179,6 +176,7 @@ void QtBrowserPane::hideEvent(QHideEvent* event)
 {
     QWidget::hideEvent(event);
     _looking.stop();
+    _seeker.cancel();
 }
 
 void QtBrowserPane::keyPressEvent(QKeyEvent* event)
@@ -186,7 +184,7 @@ void QtBrowserPane::keyPressEvent(QKeyEvent* event)
     if (event->key() == Qt::Key_Up && event->modifiers() & Qt::AltModifier)
         goUp();
     else if (event->key() == Qt::Key_F5)
-        _model->reread();
+        reread();
     else if (event->key() == Qt::Key_H && event->modifiers() & Qt::ControlModifier)
         toggleHidden();
     else if (event->key() == Qt::Key_L && event->modifiers() & Qt::ControlModifier)
@@ -195,26 +193,89 @@ void QtBrowserPane::keyPressEvent(QKeyEvent* event)
         QWidget::keyPressEvent(event);
 }
 
-void QtBrowserPane::activate()
+QtBrowserPane::Found QtBrowserPane::find(std::string const& path)
 {
-    QModelIndex const current = _list->currentIndex();
-    if (!current.isValid() || !isVisible())
-        return;
     try
     {
-        OsPlace const place = OsPlace::find(OsPlace::join(_directory, _model->getEntry(current.row()).name), "");
-        if (place.name.empty())
-        {
-            walkTo(place.directory, {});
-            return;
-        }
+        return {OsPlace::find(path), "", ""};
     }
     catch (ExBase const& error)
     {
-        say(error.getReason());
-        _model->reread();
+        return {{}, error.getReason(), findNewPath(path)};
+    }
+    catch (std::exception const& error)
+    {
+        return {{}, error.what(), ""};
+    }
+}
+
+void QtBrowserPane::seek(std::string const& path, std::function<void(Found const&)> next)
+{
+    auto const work = [this, path, next = std::move(next)](std::atomic<bool> const&)
+    {
+        return [this, next, found = find(path)]
+        {
+            say("");
+            next(found);
+        };
+    };
+    _seeker.startAndWait(path, work);
+    if (_seeker.isBusy())
+        say(tellSilence(OsPlace::quote(path)));
+}
+
+void QtBrowserPane::seekTyped(std::function<void(Found const&)> const& next)
+{
+    std::string const typed = _path->getTypedPath();
+    seek(typed.empty() ? _directory : OsPlace::complete(typed, _directory), next);
+}
+
+void QtBrowserPane::goToTyped()
+{
+    if (!_path->isEdited() || !isVisible())
+        return;
+    seekTyped(
+        [this](Found const& found)
+        {
+            if (found.fault.empty())
+                walkToTyped(found.place);
+            else
+                say(found.fault);
+        });
+}
+
+void QtBrowserPane::walkToTyped(OsPlace const& place)
+{
+    if (_path->hasFocus())
+        _list->setFocus(Qt::OtherFocusReason);
+    walkTo(place.directory, {place.name, {}});
+}
+
+void QtBrowserPane::activate()
+{
+    QModelIndex const current = _list->currentIndex();
+    if (current.isValid() && isVisible())
+        seek(OsPlace::join(_directory, _model->getEntry(current.row()).name),
+             [this](Found const& found) { onActivated(found); });
+}
+
+void QtBrowserPane::onActivated(Found const& found)
+{
+    if (!found.fault.empty())
+    {
+        say(found.fault);
+        reread();
         return;
     }
+    if (found.place.name.empty())
+    {
+        walkTo(found.place.directory, {});
+        return;
+    }
+    // The rows can be others meanwhile.
+    QModelIndex const current = _list->currentIndex();
+    if (!current.isValid() || _model->getEntry(current.row()).name != found.place.name)
+        return;
     _list->selectionModel()->select(current, QItemSelectionModel::Select | QItemSelectionModel::Rows);
     forgetTyped();
     _handle.tell(&NtBrowserListener::onActivated);
@@ -225,7 +286,7 @@ void QtBrowserPane::goUp()
     std::filesystem::path const path = _directory;
     if (!path.has_relative_path() || !isVisible())
         return;
-    walkTo(OsPlace::findNearest(path.parent_path().native()), {});
+    walkTo(path.parent_path().native(), {});
     _selection->awaitCurrent(path.filename().native());
 }
 
@@ -240,6 +301,12 @@ void QtBrowserPane::walkTo(std::string const& directory, QtBrowserChoice const& 
 void QtBrowserPane::toggleHidden()
 {
     _model->setShowsHidden(!_model->showsHidden());
+    reread();
+}
+
+void QtBrowserPane::reread()
+{
+    _patience.start(patience);
     _model->reread();
 }
 
@@ -248,27 +315,45 @@ void QtBrowserPane::look()
     // Rows that change between two clicks would be missed by the second.
     if (QApplication::mouseButtons() != Qt::NoButton)
         return;
-    std::string const fault = findFault(_directory);
-    if (!fault.empty())
+    if (_model->isReading() || _looker.isBusy())
     {
-        leave(fault);
+        if (++_missedLooks == toldLooks)
+            showState();
         return;
     }
-    try
-    {
-        _model->rereadIfChanged();
-    }
-    catch (ExBase const&)
-    {
-        // It went this very moment; the next look finds it gone.
-    }
+    _missedLooks = 0;
+    _looker.start(_directory,
+                  [this, directory = _directory](std::atomic<bool> const&) -> std::function<void()>
+                  {
+                      Found const found = find(directory);
+                      if (!found.fault.empty() || !found.place.name.empty())
+                          return [this, found, nearest = OsPlace::findNearest(directory)] { leave(found, nearest); };
+                      try
+                      {
+                          return [this, now = QtDirStamp::take(directory)] { onLooked(now); };
+                      }
+                      catch (ExBase const&)
+                      {
+                          // It went this very moment; the next look finds it gone.
+                          return [] {};
+                      }
+                  });
 }
 
-void QtBrowserPane::leave(std::string const& reason)
+void QtBrowserPane::onLooked(QtDirStamp const& now)
 {
-    std::string const nearest = OsPlace::findNearest(_directory);
-    walkTo(nearest, {});
-    say(reason + ". This is " + OsPlace::quote(nearest));
+    _missedLooks = 0;
+    showState();
+    if (QApplication::mouseButtons() == Qt::NoButton)
+        _model->rereadIfChanged(now);
+}
+
+void QtBrowserPane::leave(Found const& found, std::string const& nearest)
+{
+    std::string const directory = _directory;
+    walkTo(nearest, {found.place.name, {}});
+    say((found.fault.empty() ? OsPlace::quote(directory) + " is no folder" : found.fault) + ". This is " +
+        OsPlace::quote(nearest));
 }
 
 void QtBrowserPane::onRead()
@@ -283,6 +368,7 @@ void QtBrowserPane::onRead()
 
 void QtBrowserPane::onChosen()
 {
+    _seeker.cancel();
     forgetTyped();
     tellChoice();
 }
@@ -315,7 +401,10 @@ void QtBrowserPane::say(std::string const& words)
 void QtBrowserPane::showState()
 {
     std::string const& error = _model->getError();
-    _message->setText(makeWrappable(toShownPath(error.empty() ? _notice : error)));
+    bool const isSilent = _missedLooks >= toldLooks && (_model->isReading() || _looker.isBusy());
+    std::string const who = (_model->hasNamesOnly() ? "Something in " : "") + OsPlace::quote(_directory);
+    std::string const silence = isSilent && _notice.empty() ? tellSilence(who) : "";
+    _message->setText(makeWrappable(toShownPath(!error.empty() ? error : _notice + silence)));
     _message->setVisible(!_message->text().isEmpty());
     bool const isLate = _model->isReading() && !_patience.isActive();
     bool const isEmpty = !_model->isReading() && error.empty();

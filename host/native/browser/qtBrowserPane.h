@@ -1,6 +1,8 @@
 #pragma once
 
 #include "browser/qtBrowserSelection.h"
+#include "browser/qtDirWorker.h"
+#include "files/osPlace.h"
 #include "ntBrowser.h"
 #include "peers/qtListenerHandle.h"
 
@@ -17,6 +19,7 @@ namespace Kv
 {
 
 class QtBrowserList;
+struct QtDirStamp;
 class QtDirModel;
 class QtPathField;
 
@@ -36,9 +39,10 @@ public:
     void setCollapsing(std::function<bool(std::string const&)> collapses);
     void setMultiple(bool multiple);
 
-    /// Goes where the user has typed, and tells the listener; gives an empty path. With `takesNew`, where nothing is
-    /// there but its directory, stays and gives the typed path. Nothing in all other cases, which the user is told.
-    std::optional<std::string> takeTypedPath(bool takesNew);
+    /// Goes where the user has typed, if the user has, and tells the listener that the path is taken. With `takesNew`,
+    /// where nothing is there but its directory, stays and hands the path to the listener. In all other cases the user
+    /// is told.
+    void takeTypedPath(bool takesNew);
 
 protected:
     void showEvent(QShowEvent* event) override;
@@ -46,14 +50,36 @@ protected:
     void keyPressEvent(QKeyEvent* event) override;
 
 private:
+    /// What a path leads to.
+    struct Found
+    {
+        OsPlace place;
+        /// The reason why there is no such place, in words; else empty.
+        std::string fault;
+        /// The path of what is not there yet, in a directory that is; else empty.
+        std::string newPath;
+    };
+
+    static Found find(std::string const& path);
+
     void layOut();
 
+    /// Has a place looked up, and goes on once it is: at once, if the file system answers within a moment. What was
+    /// sought before, or the user has turned away from, is forgotten.
+    void seek(std::string const& path, std::function<void(Found const&)> next);
+    void seekTyped(std::function<void(Found const&)> const& next);
+    void goToTyped();
+    void walkToTyped(OsPlace const& place);
+
     void activate();
+    void onActivated(Found const& found);
     void goUp();
     void walkTo(std::string const& directory, QtBrowserChoice const& choice);
     void toggleHidden();
+    void reread();
     void look();
-    void leave(std::string const& reason);
+    void onLooked(QtDirStamp const& now);
+    void leave(Found const& found, std::string const& nearest);
 
     void onRead();
     void onChosen();
@@ -81,6 +107,10 @@ private:
     QLabel* _message;
     QTimer _looking;
     QTimer _patience;
+    QtDirWorker _looker;
+    QtDirWorker _seeker;
+    /// The number of looks at the directory that had to be left out, since the last one or a reading is under way.
+    int _missedLooks = 0;
 };
 
 } // namespace Kv

@@ -145,7 +145,9 @@ private:
 
     /// False at the end of the directory.
     bool readName();
-    void take(char const* name);
+    void take(dirent const& found);
+    /// Nothing for an entry that has gone meanwhile.
+    std::optional<struct stat> findStatus(dirent const& found) const;
     /// True if the file went into the entry of a sequence that is there already.
     bool joinSequence(QtDirEntry const& file);
     void finishSequence(Sequence& sequence);
@@ -163,33 +165,42 @@ bool Reader::readName()
     errno = 0;
     dirent const* const next = readdir(_stream.get()); // NOLINT(concurrency-mt-unsafe): each reader has its own stream
     if (next)
-        take(static_cast<char const*>(next->d_name));
+        take(*next);
     else if (errno != 0)
         throwCannotRead(_directory);
     return next;
 }
 
-void Reader::take(char const* name)
+void Reader::take(dirent const& found)
 {
     QtDirEntry entry;
-    entry.name = name;
+    entry.name = static_cast<char const*>(found.d_name);
     bool const isHidden = entry.name.front() == '.';
     bool const isDots = entry.name == "." || entry.name == "..";
     if (isDots || (isHidden && !_options.showsHidden && entry.name != _options.hiddenName))
         return;
-    // A link counts as what it leads to; one that leads nowhere as itself.
-    struct stat status = {};
-    int const folder = dirfd(_stream.get());
-    if (fstatat(folder, name, &status, 0) != 0 && fstatat(folder, name, &status, AT_SYMLINK_NOFOLLOW) != 0)
+    auto const status = findStatus(found);
+    if (!status)
         return;
-    entry.isDirectory = S_ISDIR(status.st_mode);
-    entry.size = static_cast<std::uint64_t>(status.st_size);
-    entry.modified = status.st_mtim.tv_sec;
-    if (S_ISREG(status.st_mode) && joinSequence(entry))
+    entry.isDirectory = S_ISDIR(status->st_mode);
+    entry.size = static_cast<std::uint64_t>(status->st_size);
+    entry.modified = status->st_mtim.tv_sec;
+    if (S_ISREG(status->st_mode) && joinSequence(entry))
         return;
     entry.title = entry.name;
     entry.sortKey = makeSortKey(entry.name);
     _entries.push_back(std::move(entry));
+}
+
+std::optional<struct stat> Reader::findStatus(dirent const& found) const
+{
+    struct stat status = {};
+    status.st_mode = DTTOIF(found.d_type);
+    // A link counts as what it leads to; one that leads nowhere as itself.
+    if (_options.asksEntries && fstatat(dirfd(_stream.get()), found.d_name, &status, 0) != 0 &&
+        fstatat(dirfd(_stream.get()), found.d_name, &status, AT_SYMLINK_NOFOLLOW) != 0)
+        return std::nullopt;
+    return status;
 }
 
 bool Reader::joinSequence(QtDirEntry const& file)
@@ -245,7 +256,8 @@ bool QtDirStamp::isUnchangedIn(QtDirStamp const& later) const
 }
 
 QtDirListing::QtDirListing(std::string const& directory, Options const& options, std::atomic<bool> const& cancelled)
-    : _stamp(QtDirStamp::take(directory)), _entries(Reader(directory, options).read(cancelled))
+    : _stamp(QtDirStamp::take(directory)), _hasDetails(options.asksEntries),
+      _entries(Reader(directory, options).read(cancelled))
 {
 }
 

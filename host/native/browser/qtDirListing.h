@@ -54,6 +54,9 @@ public:
         /// Names that begin with a dot, all of them or this one.
         bool showsHidden = false;
         std::string hiddenName;
+        /// Whether an entry is a directory, its size and its time are asked for, which one that hangs keeps from its
+        /// neighbours too. Without that directories are known, but those that a link leads to.
+        bool asksEntries = true;
         /// True for the name of a file that may become part of a sequence; none may where there is no function. Called
         /// on the thread that reads.
         std::function<bool(std::string const&)> collapses;
@@ -74,6 +77,9 @@ public:
 
     QtDirStamp const& getStamp() const { return _stamp; }
 
+    /// False if the entries have neither a size nor a time.
+    bool hasDetails() const { return _hasDetails; }
+
     /// In no order.
     std::vector<QtDirEntry> const& getEntries() const { return _entries; }
 
@@ -82,6 +88,7 @@ public:
 
 private:
     QtDirStamp _stamp;
+    bool _hasDetails = true;
     std::vector<QtDirEntry> _entries;
 };
 

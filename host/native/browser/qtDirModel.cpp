@@ -2,6 +2,7 @@
 
 #include "browser/qtNumberedName.h"
 #include "exBase.h"
+#include "files/osAsync.h"
 #include "peers/qtText.h"
 
 #include <QApplication>
@@ -55,8 +56,23 @@ void QtDirModel::open(std::string const& directory, std::string const& hiddenNam
 
 void QtDirModel::reread()
 {
-    auto const read = [this, directory = _directory, options = _options, key = _key,
-                       descending = _descending](std::atomic<bool> const& cancelled) -> std::function<void()>
+    _namer.cancel();
+    _reader.start(OsAsync::getEntries(_directory), makeReading(_options));
+}
+
+void QtDirModel::showNames()
+{
+    if (!isReading() || (_listing && !hasNamesOnly()))
+        return;
+    QtDirListing::Options options = _options;
+    options.asksEntries = false;
+    _namer.start(_directory, makeReading(options));
+}
+
+QtDirWorker::Work QtDirModel::makeReading(QtDirListing::Options const& options)
+{
+    return [this, directory = _directory, options, key = _key,
+            descending = _descending](std::atomic<bool> const& cancelled) -> std::function<void()>
     {
         try
         {
@@ -77,13 +93,11 @@ void QtDirModel::reread()
             return [this, reason = std::string(error.what())] { fail(reason); };
         }
     };
-    _worker.start(read);
 }
 
-void QtDirModel::rereadIfChanged()
+void QtDirModel::rereadIfChanged(QtDirStamp const& now)
 {
-    QtDirStamp const stamp = QtDirStamp::take(_directory);
-    if (!isReading() && (!_listing || !_listing->getStamp().isUnchangedIn(stamp)))
+    if (!isReading() && (!_listing || !_listing->getStamp().isUnchangedIn(now)))
         reread();
 }
 
@@ -153,14 +167,11 @@ void QtDirModel::sort(int column, Qt::SortOrder order)
            : column == ModifiedColumn ? QtDirListing::Modified
                                       : QtDirListing::Name;
     _descending = order == Qt::DescendingOrder;
-    if (!_listing)
-    {
-        if (isReading())
-            reread();
-        return;
-    }
-    _worker.start([this, listing = _listing, key = _key, descending = _descending](std::atomic<bool> const&)
-                  { return [this, rows = listing->sort(key, descending)] { reorderRows(rows); }; });
+    if (_listing)
+        _sorter.start("", [this, listing = _listing, key = _key, descending = _descending](std::atomic<bool> const&)
+                      { return [this, rows = listing->sort(key, descending)] { reorderRows(rows); }; });
+    if (isReading())
+        reread();
 }
 
 void QtDirModel::fail(std::string const& reason)
@@ -177,6 +188,10 @@ void QtDirModel::replaceRows(Listing listing, std::vector<int> rows)
         return isSame(_listing->getEntries()[static_cast<std::size_t>(mine)],
                       listing->getEntries()[static_cast<std::size_t>(other)]);
     };
+    // What is under way for rows that go.
+    _sorter.cancel();
+    if (!isReading())
+        _namer.cancel();
     bool const isNew = !std::equal(_rows.begin(), _rows.end(), rows.begin(), rows.end(), isSameRow);
     if (isNew)
         beginResetModel();
@@ -209,6 +224,8 @@ QVariant QtDirModel::getText(QtDirEntry const& entry, int column) const
 {
     if (column == NameColumn)
         return toShownPath(entry.title);
+    if (hasNamesOnly())
+        return {};
     if (column == ModifiedColumn)
         return QDateTime::fromSecsSinceEpoch(entry.modified).toString(QStringLiteral("yyyy-MM-dd hh:mm"));
     return entry.isDirectory ? QString() : QLocale().formattedDataSize(static_cast<qint64>(entry.size), 1);

@@ -27,7 +27,8 @@ public:
         ColumnCount,
     };
 
-    /// `onRead` is called when a reading has ended, well or with an error. The rows are then new.
+    /// `onRead` is called when a reading has ended, well or with an error, or the names are there. The rows are then
+    /// new.
     QtDirModel(QObject* parent, std::function<void()> onRead);
 
     void setCollapsing(std::function<bool(std::string const&)> collapses) { _options.collapses = std::move(collapses); }
@@ -41,10 +42,16 @@ public:
     /// Reads the directory again.
     void reread();
 
-    /// Reads the directory again where it has changed. Throws an `ExBase` where it cannot be asked.
-    void rereadIfChanged();
+    /// Reads the directory again where it has changed since it was read, by how it is now.
+    void rereadIfChanged(QtDirStamp const& now);
 
-    bool isReading() const { return _worker.isBusy(); }
+    /// Makes do with the names, where the reading takes long and nothing else has been read, until it has ended.
+    void showNames();
+
+    bool isReading() const { return _reader.isBusy(); }
+
+    /// True while the rows have neither a size nor a time.
+    bool hasNamesOnly() const { return _listing && !_listing->hasDetails(); }
 
     /// The reason why the directory could not be read, in words; else empty.
     std::string const& getError() const { return _error; }
@@ -63,6 +70,7 @@ public:
 private:
     using Listing = std::shared_ptr<QtDirListing const>;
 
+    QtDirWorker::Work makeReading(QtDirListing::Options const& options);
     void fail(std::string const& reason);
     void replaceRows(Listing listing, std::vector<int> rows);
     void reorderRows(std::vector<int> rows);
@@ -81,7 +89,9 @@ private:
     bool _descending = false;
     QIcon _directoryIcon;
     QIcon _fileIcon;
-    QtDirWorker _worker;
+    QtDirWorker _reader;
+    QtDirWorker _namer;
+    QtDirWorker _sorter;
 };
 
 } // namespace Kv

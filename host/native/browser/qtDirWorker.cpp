@@ -1,9 +1,12 @@
 #include "browser/qtDirWorker.h"
 
-#include <csignal>
+#include "files/osAsync.h"
+
+#include <QCoreApplication>
+#include <QEvent>
+
+#include <condition_variable>
 #include <mutex>
-#include <system_error>
-#include <thread>
 #include <utility>
 
 namespace Kv
@@ -13,70 +16,49 @@ namespace Kv
 struct QtDirWorker::Job
 {
     std::atomic<bool> cancelled = false;
-    /// Guards `owner`, which is null once nobody wants the result.
+    /// Guards what follows.
     std::mutex mutex;
+    std::condition_variable ended;
+    /// Null once nobody wants the result.
     QtDirWorker* owner = nullptr;
+    /// Null until the work has ended.
+    std::function<void()> result;
 };
-
-namespace
-{
-
-/// Keeps the signals of the process from threads that are started meanwhile: the interpreter waits for them in its own.
-class SignalsBlocked
-{
-public:
-    SignalsBlocked()
-    {
-        sigset_t all;
-        sigfillset(&all);
-        pthread_sigmask(SIG_SETMASK, &all, &_before);
-    }
-    SignalsBlocked(SignalsBlocked const&) = delete;
-    SignalsBlocked& operator=(SignalsBlocked const&) = delete;
-    ~SignalsBlocked() { pthread_sigmask(SIG_SETMASK, &_before, nullptr); }
-
-private:
-    sigset_t _before{};
-};
-
-} // namespace
 
 QtDirWorker::~QtDirWorker()
 {
     cancel();
 }
 
-void QtDirWorker::start(Work work)
+void QtDirWorker::start(std::string const& path, Work work)
 {
     cancel();
     _job = std::make_shared<Job>();
     _job->owner = this;
     auto const run = [job = _job, work = std::move(work)]
     {
-        std::function<void()> const finish = work(job->cancelled);
-        std::lock_guard const lock(job->mutex);
-        if (job->owner)
-            QMetaObject::invokeMethod(
-                job->owner,
-                [job, finish]
-                {
-                    if (job->cancelled)
-                        return;
-                    job->owner->_job.reset();
-                    finish();
-                },
-                Qt::QueuedConnection);
+        std::function<void()> result = work(job->cancelled);
+        std::lock_guard<std::mutex> const lock(job->mutex);
+        if (!job->owner)
+            return;
+        job->result = std::move(result);
+        job->ended.notify_all();
+        QCoreApplication::postEvent(job->owner, new QEvent(QEvent::User));
     };
-    try
+    OsAsync::start(path, run, std::shared_ptr<std::atomic<bool> const>(_job, &_job->cancelled));
+}
+
+void QtDirWorker::startAndWait(std::string const& path, Work work)
+{
+    bool const isSilent = OsAsync::isSilent(path);
+    start(path, std::move(work));
+    if (isSilent)
+        return;
     {
-        SignalsBlocked const blocked;
-        std::thread(run).detach();
+        std::unique_lock<std::mutex> lock(_job->mutex);
+        _job->ended.wait_for(lock, OsAsync::patience, [job = _job.get()] { return job->result != nullptr; });
     }
-    catch (std::system_error const&)
-    {
-        // No thread is to be had: it takes as long as it takes.
-        run();
-    }
+    takeResult();
 }
 
 void QtDirWorker::cancel()
@@ -85,8 +67,28 @@ void QtDirWorker::cancel()
     if (!job)
         return;
     job->cancelled = true;
-    std::lock_guard const lock(job->mutex);
+    std::lock_guard<std::mutex> const lock(job->mutex);
     job->owner = nullptr;
+}
+
+void QtDirWorker::customEvent(QEvent*)
+{
+    takeResult();
+}
+
+void QtDirWorker::takeResult()
+{
+    if (!_job)
+        return;
+    std::function<void()> result;
+    {
+        std::lock_guard<std::mutex> const lock(_job->mutex);
+        result = std::exchange(_job->result, nullptr);
+    }
+    if (!result)
+        return;
+    _job.reset();
+    result();
 }
 
 } // namespace Kv

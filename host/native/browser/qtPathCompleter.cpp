@@ -1,6 +1,8 @@
 #include "browser/qtPathCompleter.h"
 
 #include "browser/qtDirListing.h"
+#include "files/osAsync.h"
+#include "files/osPlace.h"
 #include "peers/qtText.h"
 
 #include <QAbstractItemView>
@@ -18,15 +20,18 @@ namespace
 /// More than these nobody reads.
 constexpr int maxProposals = 200;
 
-/// The sorted names of a directory's entries as one types them; none where it cannot be read.
-QStringList readNames(std::string const& directory, std::atomic<bool> const& cancelled)
+/// The sorted names of a directory's entries as one types them; none where there is no directory, or it cannot be read.
+QStringList readNames(std::string const& path, std::atomic<bool> const& cancelled)
 {
     QtDirListing::Options options;
     options.showsHidden = true;
     QStringList names;
     try
     {
-        QtDirListing const listing(directory, options, cancelled);
+        OsPlace const place = OsPlace::find(path);
+        if (!place.name.empty())
+            return {};
+        QtDirListing const listing(place.directory, options, cancelled);
         for (QtDirEntry const& entry : listing.getEntries())
         {
             QString const name = toQString(entry.name);
@@ -52,28 +57,28 @@ QtPathCompleter::QtPathCompleter(QObject* parent, std::function<void()> onReady)
     setModel(&_model);
 }
 
-void QtPathCompleter::propose(QString const& text, std::string const* directory)
+void QtPathCompleter::propose(QString const& text, std::string const& path)
 {
     auto const nameStart = text.lastIndexOf(QLatin1Char('/')) + 1;
     _typedDirectory = text.left(nameStart);
     _typedName = text.mid(nameStart);
-    std::string const wanted = directory && !text.isEmpty() ? *directory : std::string();
-    if (wanted != _directory)
+    std::string const wanted = text.isEmpty() ? std::string() : path;
+    if (wanted != _path)
     {
-        _directory = wanted;
+        _path = wanted;
         _names.clear();
         _worker.cancel();
         if (!wanted.empty())
-            _worker.start(
-                [this, wanted](std::atomic<bool> const& cancelled)
-                {
-                    return [this, names = readNames(wanted, cancelled)]
-                    {
-                        _names = names;
-                        filter();
-                        _onReady();
-                    };
-                });
+            _worker.start(OsAsync::getEntries(wanted),
+                          [this, wanted](std::atomic<bool> const& cancelled)
+                          {
+                              return [this, names = readNames(wanted, cancelled)]
+                              {
+                                  _names = names;
+                                  filter();
+                                  _onReady();
+                              };
+                          });
     }
     filter();
 }

@@ -20,8 +20,9 @@ public:
     /// `onReady` is called when proposals that had to be waited for are there.
     QtPathCompleter(QObject* parent, std::function<void()> onReady);
 
-    /// The proposals from now on. `directory` is null, or what the part of `text` up to its last slash leads to.
-    void propose(QString const& text, std::string const* directory);
+    /// The proposals from now on. `path` is what the part of `text` up to its last slash stands for; it need not be
+    /// that of a directory.
+    void propose(QString const& text, std::string const& path);
 
     QString pathFromIndex(QModelIndex const& index) const override;
 
@@ -29,8 +30,8 @@ private:
     void filter();
 
     std::function<void()> _onReady;
-    std::string _directory;
-    /// Of the directory, sorted; a directory has a slash behind its name.
+    std::string _path;
+    /// Of the directory at the path, sorted; a directory has a slash behind its name.
     QStringList _names;
     QString _typedDirectory;
     QString _typedName;

@@ -1,7 +1,6 @@
 #include "browser/qtPathField.h"
 
 #include "browser/qtPathCompleter.h"
-#include "exBase.h"
 #include "files/osPlace.h"
 #include "peers/qtText.h"
 
@@ -52,17 +51,8 @@ void QtPathField::keyPressEvent(QKeyEvent* event)
 
 void QtPathField::propose()
 {
-    QString const typed = text();
-    try
-    {
-        QString const start = typed.left(typed.lastIndexOf(QLatin1Char('/')) + 1);
-        OsPlace const place = OsPlace::find(toTypedPath(start), _directory);
-        _completer->propose(typed, place.name.empty() ? &place.directory : nullptr);
-    }
-    catch (ExBase const&)
-    {
-        _completer->propose(typed, nullptr);
-    }
+    QString const start = text().left(text().lastIndexOf(QLatin1Char('/')) + 1);
+    _completer->propose(text(), OsPlace::complete(toTypedPath(start), _directory));
 }
 
 void QtPathField::showProposals()

@@ -3,7 +3,6 @@
 #include "ntPeer.h"
 
 #include <functional>
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -22,6 +21,9 @@ public:
     virtual void onSelectionChanged(std::string const& focus, std::vector<std::string> const& selected) = 0;
     /// The user pressed Enter on a file or clicked it twice; it is in focus.
     virtual void onActivated() = 0;
+    /// The browser is where the user has typed that it is to go; `newPath` is empty, or the path of what is not there
+    /// yet.
+    virtual void onTypedPathTaken(std::string const& newPath) = 0;
 };
 
 /// Shows a directory, and lets the user go from one to another.
@@ -41,10 +43,11 @@ public:
     /// Lets the user select more than one entry.
     virtual void setMultiple(bool multiple) = 0;
 
-    /// Goes where the user has typed without pressing Enter, as Enter would, and the listener hears of it; gives an
-    /// empty path. With `takesNew`, where nothing is there but its directory, stays and gives the typed path. Nothing
-    /// in all other cases, which the user is told.
-    virtual std::optional<std::string> takeTypedPath(bool takesNew) = 0;
+    /// Goes where the user has typed without pressing Enter, as Enter would, if the user has; then the listener hears
+    /// that it is there. With `takesNew`, where nothing is there but its directory, it stays, and the listener hears
+    /// the typed path. In all other cases the user is told. All that is so at once, or when the file system has
+    /// answered, unless the user has done something else by then.
+    virtual void takeTypedPath(bool takesNew) = 0;
 };
 
 } // namespace Kv

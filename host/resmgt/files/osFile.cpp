@@ -1,14 +1,13 @@
 #include "files/osFile.h"
 
 #include "exBase.h"
+#include "files/osAsync.h"
 #include "files/osTemporaryFile.h"
 #include "text/liString.h"
 
 #include <array>
 #include <cerrno>
 #include <fcntl.h>
-#include <filesystem>
-#include <optional>
 #include <sys/file.h>
 #include <sys/stat.h>
 #include <system_error>
@@ -177,8 +176,18 @@ bool OsFileDescriptor::isFileAt(std::string const& path) const
 
 bool OsFsUtils::fileExists(OsFilePath const& path)
 {
-    std::error_code error;
-    return std::filesystem::exists(path.toString(), error);
+    auto const kind = findKind(path);
+    return !kind || std::filesystem::exists(std::filesystem::file_status(*kind));
+}
+
+std::optional<std::filesystem::file_type> OsFsUtils::findKind(OsFilePath const& path)
+{
+    auto const look = [file = path.toString()]
+    {
+        std::error_code error;
+        return std::filesystem::status(file, error).type();
+    };
+    return OsAsync::ask(path.toString(), look);
 }
 
 } // namespace Kv

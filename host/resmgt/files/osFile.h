@@ -4,7 +4,9 @@
 #include "kvExport.h"
 
 #include <cstdint>
+#include <filesystem>
 #include <mutex>
+#include <optional>
 #include <string>
 #include <unistd.h>
 #include <utility>
@@ -97,7 +99,11 @@ class KV_API OsFsUtils
 {
 public:
     /// True for an existing file, directory or anything else that a path can lead to; false also where nobody may look.
+    /// Where the file system does not answer in time, something can be there: true.
     static bool fileExists(OsFilePath const& path);
+
+    /// The kind of what a path leads to, which can be nothing; no kind where the file system does not answer in time.
+    static std::optional<std::filesystem::file_type> findKind(OsFilePath const& path);
 };
 
 } // namespace Kv

@@ -1,6 +1,7 @@
 #include "files/osPlace.h"
 
 #include "exBase.h"
+#include "files/osAsync.h"
 
 #include <cstdlib>
 #include <filesystem>
@@ -55,14 +56,12 @@ std::string trim(fs::path const& path)
 }
 
 /// Free of "." and "..", with the links that are no part of the way to a "..".
-fs::path makeAbsolute(std::string const& path, std::string const& base)
+fs::path resolveDots(std::string const& path)
 {
     if (path.find('\0') != std::string::npos)
         throw ExBase(__FILE__, __LINE__, "A path cannot hold a zero byte");
-    std::error_code error;
-    fs::path const from = base.empty() ? fs::current_path(error) : fs::path(base);
     fs::path absolute;
-    for (fs::path const& component : from / expandHome(path))
+    for (fs::path const& component : fs::path(path))
     {
         if (component == "..")
             absolute = getParent(trim(absolute));
@@ -74,9 +73,16 @@ fs::path makeAbsolute(std::string const& path, std::string const& base)
 
 } // namespace
 
-OsPlace OsPlace::find(std::string const& path, std::string const& base)
+std::string OsPlace::complete(std::string const& path, std::string const& base)
 {
-    fs::path const absolute = makeAbsolute(path, base);
+    std::error_code error;
+    fs::path const from = base.empty() ? fs::current_path(error) : fs::path(base);
+    return from / expandHome(path);
+}
+
+OsPlace OsPlace::find(std::string const& path)
+{
+    fs::path const absolute = resolveDots(path);
     std::error_code error;
     fs::file_status const status = fs::status(absolute, error);
     if (status.type() == fs::file_type::not_found)
@@ -89,9 +95,15 @@ OsPlace OsPlace::find(std::string const& path, std::string const& base)
     return {trim(absolute.parent_path()), absolute.filename().native()};
 }
 
-OsPlace OsPlace::findNew(std::string const& path, std::string const& base)
+OsPlace OsPlace::findInTime(std::string const& path)
 {
-    fs::path const absolute = makeAbsolute(path, base);
+    auto const place = OsAsync::ask(path, [path] { return find(path); });
+    return place ? *place : OsPlace{trim(fs::path(path).lexically_normal()), ""};
+}
+
+OsPlace OsPlace::findNew(std::string const& path)
+{
+    fs::path const absolute = resolveDots(path);
     std::error_code error;
     bool const isTaken = fs::status(absolute, error).type() != fs::file_type::not_found;
     if (isTaken || !absolute.has_filename() || !fs::is_directory(absolute.parent_path(), error))

@@ -15,12 +15,19 @@ struct KV_API OsPlace
     /// Empty for the directory itself.
     std::string name;
 
-    /// `path` is absolute, relative to the directory `base`, or begins with the home directory as "~". An empty base
-    /// is the current directory of the process. Throws `ExBase`, with words that name the path, where nothing is there.
-    static OsPlace find(std::string const& path, std::string const& base);
+    /// An absolute path, which nobody has looked at, of one that is relative to the directory `base`, or begins with
+    /// the home directory as "~". An empty base is the current directory of the process.
+    static std::string complete(std::string const& path, std::string const& base);
 
-    /// The same for an entry that is not there yet. Throws `ExBase` where it is, or where its directory is not.
-    static OsPlace findNew(std::string const& path, std::string const& base);
+    /// `path` is absolute. Throws `ExBase`, with words that name it, where nothing is there.
+    static OsPlace find(std::string const& path);
+
+    /// The same for whoever cannot wait: where the file system does not answer in time, the path counts as that of a
+    /// directory.
+    static OsPlace findInTime(std::string const& path);
+
+    /// The place of an entry that is not there yet. Throws `ExBase` where it is, or where its directory is not.
+    static OsPlace findNew(std::string const& path);
 
     /// The directory, or where it is gone, the nearest one above it that exists.
     static std::string findNearest(std::string const& directory);
