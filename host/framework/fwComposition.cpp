@@ -1,6 +1,5 @@
 #include "fwComposition.h"
 
-#include "files/osFile.h"
 #include "fwCompositionXml.h"
 #include "fwGraph.h"
 #include "fwNode.h"
@@ -28,7 +27,7 @@ RCStrongPtr<FwComposition> FwComposition::open(OsFilePath const& path)
 {
     OsFilePath const canonical = path.getCanonical();
     // Before it is read: what comes in between counts as a change.
-    std::string const version = OsFile(canonical).getVersion();
+    OsFile::Version const version = OsFile(canonical).getVersion();
     std::vector<FwNode::Description> nodes = FwCompositionReader::read(canonical);
     RCStrongPtr<FwComposition> composition(std::shared_ptr<FwComposition>(new FwComposition(canonical)));
     composition->_version = version;
@@ -93,8 +92,8 @@ bool FwComposition::isModified() const
 
 bool FwComposition::isChangedOnDisk() const
 {
-    std::string const version = OsFile(_path).getVersion();
-    return !version.empty() && version != _version;
+    OsFile::Version const version = OsFile(_path).getVersion();
+    return version != OsFile::Version{} && version != _version;
 }
 
 void FwComposition::save()

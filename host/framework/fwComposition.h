@@ -1,5 +1,6 @@
 #pragma once
 
+#include "files/osFile.h"
 #include "files/osFilePath.h"
 #include "kvExport.h"
 #include "piCompositionGraphInterface.h"
@@ -64,7 +65,7 @@ private:
 
     OsFilePath _path;
     /// That of the file as it was read or written last.
-    std::string _version;
+    OsFile::Version _version{};
     RCShdPtr<FwNode> _node;
     RCShdPtr<FwGraph> _graph;
     bool _isModified = false;
