@@ -108,6 +108,8 @@ std::string WidgetListGenerator::generate()
 {
     TextBuffer buffer(PyList_GET_SIZE(_widgets.ptr()));
     std::ostream stream(&buffer);
+    // A lack of memory is told as one.
+    stream.exceptions(std::ios::badbit);
     _writer = std::make_unique<XmlWriter>(stream, 2);
     writeContainerHead("MainContainer", {1, "u", "l"}, {1, "u", "b"}, {-1, "uu", "r"}, {-4, "uu", "t"});
     writeContainerHead(closeButtonsContainer, {0, "u", "l"}, {0, "u", "b"}, {0, "uu", "r"}, {closeBarHeight, "u", "h"});
