@@ -29,8 +29,9 @@ public:
     virtual ~NtScriptHook() = default;
 
     /// Takes the interpreter for this thread, and gives it back: a native event can arrive while nobody holds it.
-    virtual void enter() = 0;
-    virtual void leave() noexcept = 0;
+    /// `before` is what `enter` has given.
+    virtual int enter() noexcept = 0;
+    virtual void leave(int before) noexcept = 0;
 
     /// To be called while an exception is handled: that exception, for `rethrow`, with the interpreter's own error
     /// taken off the interpreter, so that scripts can run in between.

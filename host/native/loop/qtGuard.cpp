@@ -17,8 +17,8 @@ namespace
 class NoScriptHook : public NtScriptHook
 {
 public:
-    void enter() override {}
-    void leave() noexcept override {}
+    int enter() noexcept override { return 0; }
+    void leave(int) noexcept override {}
     std::exception_ptr capture() noexcept override { return std::current_exception(); }
     [[noreturn]] void rethrow(std::exception_ptr const& error) override { std::rethrow_exception(error); }
     std::exception_ptr takeError() noexcept override { return nullptr; }
@@ -54,13 +54,14 @@ NtScriptHook* getNoScriptHook()
 class InterpreterHold
 {
 public:
-    explicit InterpreterHold(NtScriptHook& hook) : _hook(hook) { _hook.enter(); }
+    explicit InterpreterHold(NtScriptHook& hook) : _hook(hook), _before(_hook.enter()) {}
     InterpreterHold(InterpreterHold const&) = delete;
     InterpreterHold& operator=(InterpreterHold const&) = delete;
-    ~InterpreterHold() { _hook.leave(); }
+    ~InterpreterHold() { _hook.leave(_before); }
 
 private:
     NtScriptHook& _hook;
+    int _before;
 };
 
 } // namespace
@@ -79,15 +80,17 @@ void QtGuard::setScriptHook(NtScriptHook* hook)
     _hook = hook ? hook : getNoScriptHook();
 }
 
-void QtGuard::run(std::function<void()> const& call) noexcept
+bool QtGuard::runCall(void (*call)(void const*), void const* known) noexcept
 {
+    bool isDone = false;
     {
         InterpreterHold const hold(*_hook);
         ++_depth;
         quint64 const outerCall = std::exchange(_currentCall, ++_calls);
         try
         {
-            call();
+            call(known);
+            isDone = true;
         }
         catch (...)
         {
@@ -98,6 +101,7 @@ void QtGuard::run(std::function<void()> const& call) noexcept
     }
     if (_innermostLoop)
         _innermostLoop->endIfDone();
+    return isDone;
 }
 
 void QtGuard::checkSignals() noexcept
@@ -112,6 +116,7 @@ QtMoment QtGuard::getMoment() const
 
 void QtGuard::take() noexcept
 {
+    InterpreterHold const hold(*_hook);
     std::exception_ptr const error = _hook->capture();
     if (_innermostLoop)
         _innermostLoop->fail(error);
