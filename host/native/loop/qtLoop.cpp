@@ -32,12 +32,13 @@ void forgetExit()
 QtLoop::QtLoop(bool const volatile* until, bool volatile* end)
     : _until(until), _end(end), _outer(QtGuard::getInstance().getInnermostLoop())
 {
-    QtGuard::getInstance().setInnermostLoop(this);
     QAbstractEventDispatcher* const dispatcher = QAbstractEventDispatcher::instance();
     QObject::connect(dispatcher, &QAbstractEventDispatcher::awake, &_loop, [this] { onTurn(); });
     QObject::connect(dispatcher, &QAbstractEventDispatcher::aboutToBlock, &_loop, [this] { onTurn(); });
     QObject::connect(&_tick, &QTimer::timeout, &_loop, [this] { onTick(); });
     _tick.start(tickInterval);
+    // Last: where that fails, nobody would take it back.
+    QtGuard::getInstance().setInnermostLoop(this);
 }
 
 QtLoop::~QtLoop()

@@ -193,12 +193,17 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     QPointer<QtWindowWidget> const window = dynamic_cast<QtWindowWidget*>(QApplication::activeModalWidget());
     QWidget const* const stage = window ? window.data() : static_cast<QWidget*>(QtFrontOrder::getInstance().getFront());
     std::exception_ptr error;
+    try
     {
         QtLoop loop(until, end);
         // Where somebody destroys what runs, nobody could end it any more.
         if (stage)
             loop.endWith(*stage);
         error = loop.run();
+    }
+    catch (...)
+    {
+        error = QtGuard::getInstance().getScriptHook().capture();
     }
     QtDisposal::destroyWaiting();
     if (!error)
