@@ -90,7 +90,7 @@ public:
     }
 };
 
-QtPeerKind<NtTextField, TextField> const registered;
+QtPeerKind<NtTextField, TextField> registered;
 
 } // namespace
 
