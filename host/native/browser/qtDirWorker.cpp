@@ -1,6 +1,7 @@
 #include "browser/qtDirWorker.h"
 
 #include <csignal>
+#include <exception>
 #include <mutex>
 #include <system_error>
 #include <thread>
@@ -53,7 +54,16 @@ void QtDirWorker::start(Work work)
     _job->owner = this;
     auto const run = [job = _job, work = std::move(work)]
     {
-        std::function<void()> const finish = work(job->cancelled);
+        std::function<void()> finish;
+        try
+        {
+            finish = work(job->cancelled);
+        }
+        catch (...)
+        {
+            // Thrown where the work was asked for.
+            finish = [error = std::current_exception()] { std::rethrow_exception(error); };
+        }
         std::lock_guard const lock(job->mutex);
         if (job->owner)
             QMetaObject::invokeMethod(
@@ -70,7 +80,19 @@ void QtDirWorker::start(Work work)
     try
     {
         SignalsBlocked const blocked;
-        std::thread(run).detach();
+        std::thread(
+            [run]
+            {
+                try
+                {
+                    run();
+                }
+                catch (...) // NOLINT(bugprone-empty-catch)
+                {
+                    // Without the memory to tell of it, there is nothing left but not to end the process.
+                }
+            })
+            .detach();
     }
     catch (std::system_error const&)
     {
