@@ -13,6 +13,7 @@
 #include <exception>
 #include <filesystem>
 #include <optional>
+#include <sstream>
 #include <sys/stat.h>
 #include <system_error>
 #include <utility>
@@ -71,10 +72,28 @@ std::string decode(QByteArray const& word)
     return QByteArray::fromPercentEncoding(word).toStdString();
 }
 
+std::string write(Kv::OsFile::Version const& version)
+{
+    std::string text;
+    for (long long const number : version)
+        text += std::to_string(number) + ' ';
+    return text;
+}
+
+/// Numbers that are not there are zero: the file is then another one.
+Kv::OsFile::Version readVersion(std::string const& text)
+{
+    Kv::OsFile::Version version{};
+    std::istringstream stream(text);
+    for (long long& number : version)
+        stream >> number;
+    return version;
+}
+
 std::string writeRecord(PiUnsavedComposition const& unsaved)
 {
     return std::string(firstWord) + ' ' + std::to_string(formatVersion) + ' ' + encode(unsaved.path.toString(), "/") +
-           ' ' + encode(unsaved.version) + '\n' + unsaved.text;
+           ' ' + encode(write(unsaved.version)) + '\n' + unsaved.text;
 }
 
 /// In place of the first line the text has an empty one: the others have the numbers that they have in the file.
@@ -88,7 +107,7 @@ PiUnsavedComposition readRecord(std::string const& content)
         throw ExBase(__FILE__, __LINE__, "line 1: a later version of the application has written it");
     if (words.size() != wordCount || !words[2].startsWith('/'))
         throw ExBase(__FILE__, __LINE__, "line 1: it does not name a composition");
-    return {Kv::OsFilePath(decode(words[2])), decode(words[3]), content.substr(end)};
+    return {Kv::OsFilePath(decode(words[2])), readVersion(decode(words[3])), content.substr(end)};
 }
 
 /// True if nothing is left to be saved: the process ended when it had just done so.

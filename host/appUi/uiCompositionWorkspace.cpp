@@ -110,7 +110,11 @@ void UiCompositionWorkspace::openComposition(RCWeakPtr<const PiCompositionGraphI
     }
     auto const known = find(apart->getPath());
     if (known == _compositions.end())
+    {
+        // First, since what is taken over would go where it finds no place.
+        _compositions.reserve(_compositions.size() + 1);
         add(apart->takeOver());
+    }
     else if (apart->isModified())
         throw ExBase(__FILE__, __LINE__,
                      "Cannot open " + LiStringUtil::getPrintablePath(apart->getPath().toString()) +
@@ -160,8 +164,8 @@ UiCompositionWorkspace::Compositions::const_iterator UiCompositionWorkspace::fin
 
 void UiCompositionWorkspace::add(RCStrongPtr<FwComposition> const& composition)
 {
-    composition->setChangeCallback([this] { tellChange(); });
     _compositions.push_back(composition);
+    composition->setChangeCallback([this] { tellChange(); });
     setCurrent(composition);
 }
 

@@ -1,6 +1,5 @@
 #include "fwComposition.h"
 
-#include "files/osFile.h"
 #include "fwCompositionXml.h"
 #include "fwGraph.h"
 #include "fwNode.h"
@@ -28,7 +27,7 @@ RCStrongPtr<FwComposition> FwComposition::open(OsFilePath const& path)
 {
     OsFilePath const canonical = path.getCanonical();
     // Before it is read: what comes in between counts as a change.
-    std::string const version = OsFile(canonical).getVersion();
+    OsFile::Version const version = OsFile(canonical).getVersion();
     return make(canonical, version, FwCompositionReader::read(canonical));
 }
 
@@ -45,12 +44,12 @@ FwComposition::Keeper FwComposition::restoreApart(PiUnsavedComposition const& un
     return keepApart(composition);
 }
 
-FwComposition::FwComposition(OsFilePath path, std::string version)
-    : _path(std::move(path)), _version(std::move(version))
+FwComposition::FwComposition(OsFilePath path, OsFile::Version const& version)
+    : _path(std::move(path)), _version(version)
 {
 }
 
-RCStrongPtr<FwComposition> FwComposition::make(OsFilePath const& path, std::string const& version,
+RCStrongPtr<FwComposition> FwComposition::make(OsFilePath const& path, OsFile::Version const& version,
                                                std::vector<FwNode::Description> nodes)
 {
     RCStrongPtr<FwComposition> composition(std::shared_ptr<FwComposition>(new FwComposition(path, version)));
@@ -123,8 +122,8 @@ PiUnsavedComposition FwComposition::getUnsaved() const
 
 bool FwComposition::isChangedOnDisk() const
 {
-    std::string const version = OsFile(_path).getVersion();
-    return !version.empty() && version != _version;
+    OsFile::Version const version = OsFile(_path).getVersion();
+    return version != OsFile::Version{} && version != _version;
 }
 
 void FwComposition::save()

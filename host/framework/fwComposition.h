@@ -1,5 +1,6 @@
 #pragma once
 
+#include "files/osFile.h"
 #include "files/osFilePath.h"
 #include "fwNode.h"
 #include "kvExport.h"
@@ -66,10 +67,10 @@ public:
 private:
     friend class FwGraph;
 
-    FwComposition(OsFilePath path, std::string version);
+    FwComposition(OsFilePath path, OsFile::Version const& version);
 
     /// `path` is canonical.
-    static RCStrongPtr<FwComposition> make(OsFilePath const& path, std::string const& version,
+    static RCStrongPtr<FwComposition> make(OsFilePath const& path, OsFile::Version const& version,
                                            std::vector<FwNode::Description> nodes);
     static Keeper keepApart(RCStrongPtr<FwComposition> const& composition);
 
@@ -77,7 +78,7 @@ private:
 
     OsFilePath _path;
     /// That of the file as it was read or written last.
-    std::string _version;
+    OsFile::Version _version{};
     RCShdPtr<FwNode> _node;
     RCShdPtr<FwGraph> _graph;
     bool _isModified = false;

@@ -217,6 +217,8 @@ void writeNode(XmlWriter& writer, PiNode const& node)
 std::string FwCompositionWriter::write(PiGraph const& graph)
 {
     std::ostringstream stream;
+    // A lack of memory is told as one.
+    stream.exceptions(std::ios::badbit);
     XmlWriter writer(stream, indent);
     writer.openTag(Format::composition);
     writer.writeAttrib(Format::version, std::to_string(Format::currentVersion));

@@ -41,9 +41,16 @@ void WsCursorRegistry::setCurrent(LiString const& name)
 
 void WsCursorRegistry::restore(LiString const& name) noexcept
 {
-    _current = name;
-    if (WsThread::isCurrent())
-        apply();
+    // At the end of a guard nobody can be told what fails: the next change gives the pointer its shape.
+    try
+    {
+        _current = name;
+        if (WsThread::isCurrent())
+            apply();
+    }
+    catch (...) // NOLINT(bugprone-empty-catch)
+    {
+    }
 }
 
 void WsCursorRegistry::apply() const

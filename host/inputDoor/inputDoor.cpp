@@ -82,8 +82,8 @@ void InputDoor::open(std::function<void()> onTurn)
                      {
                          if (_parts->isTurnAsked || getLoopLevel() <= _parts->busyLevel)
                              return;
-                         _parts->isTurnAsked = true;
                          platform.callNextTurn([this] { turn(); });
+                         _parts->isTurnAsked = true;
                      });
     _parts->timer->start(turnInterval);
 }

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "files/osFilePath.h"
+#include "files/osFile.h"
 #include "kvExport.h"
 #include "piGraph.h"
 
@@ -16,7 +16,7 @@ struct PiUnsavedComposition
     /// That of the composition's file.
     OsFilePath path;
     /// That of the file as the composition knows it, by `OsFile::getVersion`.
-    std::string version;
+    OsFile::Version version;
     /// The file as a save would write it.
     std::string text;
 };

@@ -5,7 +5,6 @@
 #include <boost/python/errors.hpp>
 
 #include <optional>
-#include <vector>
 
 namespace Kv
 {
@@ -17,14 +16,9 @@ namespace
 class PythonHook : public NtScriptHook
 {
 public:
-    void enter() override { _states.push_back(PyGILState_Ensure()); }
+    int enter() noexcept override { return PyGILState_Ensure(); }
 
-    void leave() noexcept override
-    {
-        PyGILState_STATE const state = _states.back();
-        _states.pop_back();
-        PyGILState_Release(state);
-    }
+    void leave(int before) noexcept override { PyGILState_Release(static_cast<PyGILState_STATE>(before)); }
 
     int getDepth() noexcept override
     {
@@ -127,9 +121,6 @@ private:
             return std::nullopt;
         }
     }
-
-    /// The lock's states that `leave` goes back to, for the one thread of the user interface.
-    std::vector<PyGILState_STATE> _states;
 };
 
 } // namespace

@@ -110,8 +110,18 @@ void UiContainer::addChild(RCShdPtr<UiWidget> const& child)
     _children.push_back(child);
     child->_parent = this;
     forgetNames();
-    if (_native)
+    if (!_native)
+        return;
+    try
+    {
         child->realize(WsNative::getPlatform(), *_native);
+    }
+    catch (...)
+    {
+        // Half a widget is none.
+        child->clearParent();
+        throw;
+    }
 }
 
 std::unique_ptr<NtPeer> UiContainer::createPeer(NtPlatform& platform, NtContainer& parent)

@@ -4,7 +4,7 @@
 #include "uiMoveContainer.h"
 #include "wsNative.h"
 
-#include <utility>
+#include <iterator>
 
 namespace Kv
 {
@@ -18,19 +18,33 @@ UiLatePeers& UiLatePeers::getInstance()
 
 UiLatePeers::Place UiLatePeers::add(UiMoveContainer& container)
 {
-    if (!std::exchange(_turnIsAwaited, true))
+    if (!_turnIsAwaited)
         WsNative::getPlatform().callNextTurn(
             [this]
             {
                 _turnIsAwaited = false;
                 makeAll();
             });
+    _turnIsAwaited = true;
     return _waiting.insert(_waiting.end(), &container);
 }
 
 void UiLatePeers::remove(Place place)
 {
     _waiting.erase(place);
+}
+
+std::list<UiMoveContainer*> UiLatePeers::take(Place place)
+{
+    std::list<UiMoveContainer*> taken;
+    taken.splice(taken.end(), _waiting, place);
+    return taken;
+}
+
+UiLatePeers::Place UiLatePeers::putBack(std::list<UiMoveContainer*>& taken)
+{
+    _waiting.splice(_waiting.end(), taken);
+    return std::prev(_waiting.end());
 }
 
 void UiLatePeers::makeAll()

@@ -21,6 +21,10 @@ public:
     Place add(UiMoveContainer& container);
     void remove(Place place);
 
+    /// Takes the one at that place out, to be put back to the end where it could not be filled. Neither can fail.
+    std::list<UiMoveContainer*> take(Place place);
+    Place putBack(std::list<UiMoveContainer*>& taken);
+
     /// Fills all containers.
     void makeAll();
 

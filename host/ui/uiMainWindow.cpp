@@ -48,15 +48,30 @@ void UiMainWindow::refuseInput()
 {
     requireUiThread();
     UiLatePeers::getInstance().makeAll();
-    ++_inputLevel;
     _native->refuseInput();
-    blockWidgetsIn(*getRootContainer());
+    ++_inputLevel;
+    try
+    {
+        blockWidgetsIn(*getRootContainer());
+    }
+    catch (...)
+    {
+        admitInput();
+        throw;
+    }
 }
 
-void UiMainWindow::admitInput()
+void UiMainWindow::admitInput() noexcept
 {
     --_inputLevel;
-    blockWidgetsIn(*getRootContainer());
+    // What fails is left to the next one to whom input is refused or admitted: nobody can be told at the end of a run.
+    try
+    {
+        blockWidgetsIn(*getRootContainer());
+    }
+    catch (...) // NOLINT(bugprone-empty-catch)
+    {
+    }
     _native->admitInput();
 }
 

@@ -25,7 +25,7 @@ public:
     /// Keeps input from the window until the matching `admitInput`, but from the floating containers that come to the
     /// front meanwhile. Both nest; the last `admitInput` leaves all as it was.
     void refuseInput();
-    void admitInput();
+    void admitInput() noexcept;
 
     /// The innermost widget that has the keyboard whenever the window has it; borrowed, null if there is none.
     UiWidget* findWidgetWithKeyboard() const;

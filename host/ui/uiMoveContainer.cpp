@@ -126,7 +126,7 @@ std::unique_ptr<NtPeer> UiMoveContainer::createPeer(NtPlatform& platform, NtCont
 
 void UiMoveContainer::fill()
 {
-    UiLatePeers::getInstance().remove(*std::exchange(_waiting, std::nullopt));
+    std::list<UiMoveContainer*> taken = UiLatePeers::getInstance().take(*std::exchange(_waiting, std::nullopt));
     bool const isLost = getReferenceCount() == 1;
     RCShdPtr<UiMoveContainer> const self(this);
     if (isLost)
@@ -134,9 +134,19 @@ void UiMoveContainer::fill()
         clearParent();
         return;
     }
-    attachNative(WsNative::getPlatform(), *_float);
-    layOutChildren();
-    placePeers();
+    try
+    {
+        attachNative(WsNative::getPlatform(), *_float);
+        layOutChildren();
+        placePeers();
+    }
+    catch (...)
+    {
+        // Whoever asks next has it filled anew.
+        if (_float)
+            _waiting = UiLatePeers::getInstance().putBack(taken);
+        throw;
+    }
 }
 
 void UiMoveContainer::dropPeer()

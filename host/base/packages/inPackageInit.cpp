@@ -13,6 +13,9 @@ namespace
 /// The packages of the process.
 struct Packages
 {
+    // A library that comes later needs no memory for its place here.
+    Packages() { loaded.reserve(64); }
+
     /// By the places where they are announced: a package that is loaded from two files stands here twice.
     std::vector<InPackageInit*> loaded;
     /// Those that are set up, in that order.
@@ -110,7 +113,8 @@ void InPackageInit::registerPackage()
 
 void InPackageInit::addDependency(std::type_info const* package)
 {
-    _dependencyTypes.push_back(package);
+    _dependencyTypes.at(_dependencyCount) = package;
+    ++_dependencyCount;
 }
 
 std::vector<InPackageInit const*> InPackageInit::getPackages()
@@ -140,9 +144,9 @@ void InPackageInit::setUp()
         return;
     // First of all, so that a ring of dependencies ends here.
     setInitialized(true);
-    for (std::type_info const* const type : _dependencyTypes)
+    for (std::size_t i = 0; i < _dependencyCount; ++i)
         for (InPackageInit* const other : getAll().loaded)
-            if (*other->_type == *type)
+            if (*other->_type == *_dependencyTypes[i])
                 addDependency(other);
     for (InVariableBase* const dependency : std::vector(getDependencies()))
         if (auto* const other = dynamic_cast<InPackageInit*>(dependency))

@@ -3,6 +3,8 @@
 #include "packages/inBuildInfo.h"
 #include "pointers/plainPtr.h"
 
+#include <array>
+#include <cstddef>
 #include <string>
 #include <typeinfo>
 #include <vector>
@@ -73,7 +75,8 @@ public:
 
     using InPackageInitBase::addDependency;
 
-    /// Has the package with a record of that type set up first, if it is loaded by then.
+    /// Has the package with a record of that type set up first, if it is loaded by then. There can be 16 of them; one
+    /// more throws `std::out_of_range`.
     void addDependency(std::type_info const* package);
 
     /// Every package that is loaded, in the order in which they were set up; sets those up first that are not yet.
@@ -92,7 +95,9 @@ private:
     void setUp();
 
     std::type_info const* _type = nullptr;
-    std::vector<std::type_info const*> _dependencyTypes;
+    // Of a size that is known: what a library does while it is loaded must not need memory.
+    std::array<std::type_info const*, 16> _dependencyTypes{};
+    std::size_t _dependencyCount = 0;
     OPtr<InBuildInfo> _buildInfo;
 };
 

@@ -45,7 +45,7 @@ public:
     }
 };
 
-QtPeerKind<NtBrowser, Browser> const registered;
+QtPeerKind<NtBrowser, Browser> registered;
 
 } // namespace
 

@@ -6,6 +6,7 @@
 #include <QEvent>
 
 #include <condition_variable>
+#include <exception>
 #include <mutex>
 #include <utility>
 
@@ -37,7 +38,16 @@ void QtDirWorker::start(std::string const& path, Work work)
     _job->owner = this;
     auto const run = [job = _job, work = std::move(work)]
     {
-        std::function<void()> result = work(job->cancelled);
+        std::function<void()> result;
+        try
+        {
+            result = work(job->cancelled);
+        }
+        catch (...)
+        {
+            // Thrown where the work was asked for.
+            result = [error = std::current_exception()] { std::rethrow_exception(error); };
+        }
         std::lock_guard<std::mutex> const lock(job->mutex);
         if (!job->owner)
             return;

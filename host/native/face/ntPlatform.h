@@ -29,8 +29,9 @@ public:
     virtual ~NtScriptHook() = default;
 
     /// Takes the interpreter for this thread, and gives it back: a native event can arrive while nobody holds it.
-    virtual void enter() = 0;
-    virtual void leave() noexcept = 0;
+    /// `before` is what `enter` has given.
+    virtual int enter() noexcept = 0;
+    virtual void leave(int before) noexcept = 0;
 
     /// The number of times that this thread has entered the interpreter from outside, and not left it yet. Whoever
     /// enters it counts: between two moments with the same number there is nothing of the interpreter on the stack.

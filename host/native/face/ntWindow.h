@@ -50,7 +50,7 @@ public:
     /// Keeps input from what is the application's own in the window, but not from what the host has in it, until
     /// `admitInput`. Nobody has the keyboard after the first; after the second the front-most that takes input has it.
     virtual void refuseInput() = 0;
-    virtual void admitInput() = 0;
+    virtual void admitInput() noexcept = 0;
 };
 
 } // namespace Kv

@@ -49,9 +49,14 @@ void QtDisposal::destroy(QWidget* widget)
         std::unique_ptr<QWidget> const done(widget);
         return;
     }
-    widget->hide();
-    widget->deleteLater();
-    getWaiting().emplace_back(widget);
+    // Nothing may come out of an end. What fails leaves the widget to its parent, hidden and unheard.
+    QtGuard::getInstance().shield(
+        [widget]
+        {
+            widget->hide();
+            widget->deleteLater();
+            getWaiting().emplace_back(widget);
+        });
 }
 
 void QtDisposal::destroyWaiting()

@@ -19,8 +19,12 @@ namespace
 class NoScriptHook : public NtScriptHook
 {
 public:
-    void enter() override { ++_depth; }
-    void leave() noexcept override { --_depth; }
+    int enter() noexcept override
+    {
+        ++_depth;
+        return 0;
+    }
+    void leave(int) noexcept override { --_depth; }
     int getDepth() noexcept override { return _depth; }
     std::exception_ptr capture() noexcept override { return std::current_exception(); }
     [[noreturn]] void rethrow(std::exception_ptr const& error) override { std::rethrow_exception(error); }
@@ -60,13 +64,14 @@ NtScriptHook* getNoScriptHook()
 class InterpreterHold
 {
 public:
-    explicit InterpreterHold(NtScriptHook& hook) : _hook(hook) { _hook.enter(); }
+    explicit InterpreterHold(NtScriptHook& hook) : _hook(hook), _before(_hook.enter()) {}
     InterpreterHold(InterpreterHold const&) = delete;
     InterpreterHold& operator=(InterpreterHold const&) = delete;
-    ~InterpreterHold() { _hook.leave(); }
+    ~InterpreterHold() { _hook.leave(_before); }
 
 private:
     NtScriptHook& _hook;
+    int _before;
 };
 
 } // namespace
@@ -85,8 +90,9 @@ void QtGuard::setScriptHook(NtScriptHook* hook)
     _hook = hook ? hook : getNoScriptHook();
 }
 
-void QtGuard::run(std::function<void()> const& call)
+bool QtGuard::runCall(void (*call)(void const*), void const* known)
 {
+    bool isDone = false;
     {
         InterpreterHold const hold(*_hook);
         QtSpareHandles::Pause const pause;
@@ -94,7 +100,8 @@ void QtGuard::run(std::function<void()> const& call)
         quint64 const outerCall = std::exchange(_currentCall, ++_calls);
         try
         {
-            call();
+            call(known);
+            isDone = true;
         }
         catch (...)
         {
@@ -103,10 +110,12 @@ void QtGuard::run(std::function<void()> const& call)
         _currentCall = outerCall;
         --_depth;
     }
-    if (!_innermostLoop)
-        return;
-    _innermostLoop->endIfDone();
-    QtWayOut::take();
+    if (_innermostLoop)
+    {
+        _innermostLoop->endIfDone();
+        QtWayOut::take();
+    }
+    return isDone;
 }
 
 void QtGuard::checkSignals()
@@ -127,6 +136,7 @@ QtMoment QtGuard::getMoment() const
 
 void QtGuard::take() noexcept
 {
+    InterpreterHold const hold(*_hook);
     std::exception_ptr const error = _hook->capture();
     if (_innermostLoop)
         _innermostLoop->fail(error);

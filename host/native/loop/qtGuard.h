@@ -5,7 +5,6 @@
 #include <QtGlobal>
 
 #include <exception>
-#include <functional>
 
 namespace Kv
 {
@@ -37,9 +36,28 @@ public:
     /// Without an interpreter a hook that does as much as it can.
     NtScriptHook& getScriptHook() const { return *_hook; }
 
-    /// Calls into the host. What is thrown there stays there; a loop that cannot go on is left from here by its
-    /// `QtWayOut`.
-    void run(std::function<void()> const& call);
+    /// Calls into the host. What is thrown there stays there, and gives false; a loop that cannot go on is left from
+    /// here by its `QtWayOut`. Needs no memory itself.
+    template <typename Call> bool run(Call const& call)
+    {
+        return runCall([](void const* known) { (*static_cast<Call const*>(known))(); }, &call);
+    }
+
+    /// Runs what is the host's own, and leaves the interpreter as it is unless something is thrown.
+    template <typename Call> void shield(Call const& call) noexcept
+    {
+        try
+        {
+            call();
+        }
+        catch (...)
+        {
+            take();
+        }
+    }
+
+    /// Takes the exception that is being handled, for the innermost local loop.
+    void take() noexcept;
 
     /// Runs what is pending for the interpreter, guarded.
     void checkSignals();
@@ -58,8 +76,7 @@ public:
 private:
     QtGuard();
 
-    /// Takes the exception that is being handled.
-    void take() noexcept;
+    bool runCall(void (*call)(void const*), void const* known);
 
     NtScriptHook* _hook;
     QtLoop* _innermostLoop = nullptr;

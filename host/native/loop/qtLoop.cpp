@@ -67,12 +67,13 @@ void runInApplication(QEventLoop& loop)
 QtLoop::QtLoop(bool const volatile* until, bool volatile* end)
     : _until(until), _end(end), _outer(QtGuard::getInstance().getInnermostLoop())
 {
-    QtGuard::getInstance().setInnermostLoop(this);
     QAbstractEventDispatcher* const dispatcher = QAbstractEventDispatcher::instance();
     QObject::connect(dispatcher, &QAbstractEventDispatcher::awake, &_loop, [this] { endIfDone(); });
     QObject::connect(dispatcher, &QAbstractEventDispatcher::aboutToBlock, &_loop, [this] { endIfDone(); });
     QObject::connect(&_tick, &QTimer::timeout, &_loop, [this] { onTick(); });
     _tick.start(tickInterval);
+    // Last: where that fails, nobody would take it back.
+    QtGuard::getInstance().setInnermostLoop(this);
 }
 
 QtLoop::~QtLoop()

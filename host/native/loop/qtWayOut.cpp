@@ -17,12 +17,6 @@ namespace Kv
 namespace
 {
 
-/// What Qt's frames are left by.
-struct Left
-{
-    std::string reason;
-};
-
 QtWayOut* innermost = nullptr;
 std::function<void()> lastAct;
 /// Qt tells each author of a handler that throws that this is not supported.

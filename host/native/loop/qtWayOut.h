@@ -14,6 +14,12 @@ namespace Kv
 class QtWayOut
 {
 public:
+    /// What Qt's frames are left by.
+    struct Left
+    {
+        std::string reason;
+    };
+
     /// `loops` is the number of loops that are going to run in one another, before the one to be left.
     explicit QtWayOut(int loops = 1);
     QtWayOut(QtWayOut const&) = delete;

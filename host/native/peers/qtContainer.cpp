@@ -6,7 +6,7 @@ namespace Kv
 namespace
 {
 
-QtPeerKind<NtContainer, QtContainer> const registered;
+QtPeerKind<NtContainer, QtContainer> registered;
 
 } // namespace
 

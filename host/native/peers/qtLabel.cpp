@@ -41,7 +41,7 @@ public:
     }
 };
 
-QtPeerKind<NtLabel, Label> const registered;
+QtPeerKind<NtLabel, Label> registered;
 
 } // namespace
 

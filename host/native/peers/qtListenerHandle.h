@@ -18,12 +18,12 @@ public:
 
     void close() const { *_listener = nullptr; }
 
-    /// Calls a member function of the listener, guarded.
-    template <typename Method, typename... Args> void tell(Method method, Args const&... args) const
+    /// Calls a member function of the listener, guarded. False if that has thrown.
+    template <typename Method, typename... Args> bool tell(Method method, Args const&... args) const
     {
         // A copy: the widget that holds this one can go while the host hears of it.
         auto const shared = _listener;
-        QtGuard::getInstance().run(
+        return QtGuard::getInstance().run(
             [&]
             {
                 if (Listener* const listener = *shared)

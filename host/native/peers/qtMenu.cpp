@@ -171,7 +171,7 @@ public:
     }
 };
 
-QtPeerKind<NtMenu, Menu> const registered;
+QtPeerKind<NtMenu, Menu> registered;
 
 } // namespace
 

@@ -14,7 +14,6 @@
 
 #include <algorithm>
 #include <stdexcept>
-#include <unordered_map>
 #include <utility>
 
 namespace Kv
@@ -59,10 +58,10 @@ QColor getReadableOn(QColor const& ground)
     return light > 0.46 ? Qt::black : Qt::white;
 }
 
-std::unordered_map<std::type_index, QtPeerKinds::Make>& getKinds()
+QtPeerKinds::Kind const*& getKinds()
 {
-    static std::unordered_map<std::type_index, QtPeerKinds::Make> kinds;
-    return kinds;
+    static QtPeerKinds::Kind const* first = nullptr;
+    return first;
 }
 
 /// The number of widgets in one that is shown again, beyond which it takes care that they do not cost their square.
@@ -89,7 +88,12 @@ void showAgain(QWidget& widget)
 
 } // namespace
 
-QtPeer::QtPeer(QWidget* widget, std::string const& name, int inset) : _widget(widget), _inset(inset)
+QtPeer::QtPeer(std::unique_ptr<QWidget> widget, int inset) : _widget(widget.get()), _inset(inset)
+{
+    static_cast<void>(widget.release());
+}
+
+QtPeer::QtPeer(std::unique_ptr<QWidget> widget, std::string const& name, int inset) : QtPeer(std::move(widget), inset)
 {
     if (!_widget)
         return;
@@ -223,18 +227,18 @@ void QtPeer::focusFirstInContent() const
         QtFocusOrder::give(*first, Qt::TabFocusReason);
 }
 
-void QtPeerKinds::add(std::type_index face, Make make)
+void QtPeerKinds::add(Kind& kind)
 {
-    getKinds().emplace(face, make);
+    kind.next = std::exchange(getKinds(), &kind);
 }
 
 std::unique_ptr<NtPeer> QtPeerKinds::make(std::type_index face, QWidget* parent, std::string const& name,
                                           void* listener)
 {
-    auto const found = getKinds().find(face);
-    if (found == getKinds().end())
-        throw std::logic_error(std::string("No native widget has the face ") + face.name());
-    return found->second(parent, name, listener);
+    for (Kind const* kind = getKinds(); kind; kind = kind->next)
+        if (kind->face == face)
+            return kind->make(parent, name, listener);
+    throw std::logic_error(std::string("No native widget has the face ") + face.name());
 }
 
 } // namespace Kv

@@ -48,7 +48,7 @@ protected:
 
     /// `widget` can be null. It gets the name, is displayed and has no cell yet. `inset` is left free above and below
     /// in the cell, where the widget is not too high for that.
-    QtPeer(QWidget* widget, std::string const& name, int inset);
+    QtPeer(std::unique_ptr<QWidget> widget, std::string const& name, int inset);
 
     /// A widget of the application's, which keeps its name and its place.
     explicit QtPeer(NtForeignWidget widget);
@@ -57,6 +57,9 @@ protected:
     void focusFirstInContent() const;
 
 private:
+    /// Owns the widget from here on, also where the construction goes on and fails.
+    QtPeer(std::unique_ptr<QWidget> widget, int inset);
+
     QPointer<QWidget> _widget;
     int _inset = 0;
     bool _foreign = false;
@@ -89,12 +92,12 @@ private:
     {
     }
 
-    static Widget* makeWidget(QWidget* parent, Handle const& handle)
+    static std::unique_ptr<QWidget> makeWidget(QWidget* parent, Handle const& handle)
     {
         if constexpr (std::is_same_v<typename Face::Listener, NtNoListener>)
-            return new Widget(parent);
+            return std::make_unique<Widget>(parent);
         else
-            return new Widget(parent, handle);
+            return std::make_unique<Widget>(parent, handle);
     }
 
     Handle _handle;
@@ -106,7 +109,17 @@ class QtPeerKinds
 public:
     using Make = std::unique_ptr<NtPeer> (*)(QWidget* parent, std::string const& name, void* listener);
 
-    static void add(std::type_index face, Make make);
+    /// One kind. They are a list, each in the static object that makes it known: what a library does while it is loaded
+    /// must not need memory.
+    struct Kind
+    {
+        std::type_index face;
+        Make make;
+        Kind const* next = nullptr;
+    };
+
+    /// Borrowed for ever.
+    static void add(Kind& kind);
 
     /// `listener` is a `Listener` of the face. Throws a `std::logic_error` for a face that no kind has.
     static std::unique_ptr<NtPeer> make(std::type_index face, QWidget* parent, std::string const& name, void* listener);
@@ -116,17 +129,15 @@ public:
 template <typename Face, typename Peer> class QtPeerKind
 {
 public:
-    QtPeerKind()
-    {
-        QtPeerKinds::add(typeid(Face), [](QWidget* parent, std::string const& name, void* listener)
-                         { return make(parent, name, *static_cast<typename Face::Listener*>(listener)); });
-    }
+    QtPeerKind() { QtPeerKinds::add(_kind); }
 
 private:
-    static std::unique_ptr<NtPeer> make(QWidget* parent, std::string const& name, typename Face::Listener& listener)
+    static std::unique_ptr<NtPeer> make(QWidget* parent, std::string const& name, void* listener)
     {
-        return std::make_unique<Peer>(parent, name, listener);
+        return std::make_unique<Peer>(parent, name, *static_cast<typename Face::Listener*>(listener));
     }
+
+    QtPeerKinds::Kind _kind{typeid(Face), &make};
 };
 
 } // namespace Kv

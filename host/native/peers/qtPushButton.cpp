@@ -111,7 +111,7 @@ public:
     }
 };
 
-QtPeerKind<NtPushButton, PushButtonPeer> const registered;
+QtPeerKind<NtPushButton, PushButtonPeer> registered;
 
 } // namespace
 

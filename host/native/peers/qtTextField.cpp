@@ -107,7 +107,7 @@ public:
     }
 };
 
-QtPeerKind<NtTextField, TextField> const registered;
+QtPeerKind<NtTextField, TextField> registered;
 
 } // namespace
 

@@ -47,7 +47,7 @@ public:
     }
 };
 
-QtPeerKind<NtToggle, Toggle> const registered;
+QtPeerKind<NtToggle, Toggle> registered;
 
 } // namespace
 

@@ -1,6 +1,7 @@
 #include "start/qtApplication.h"
 
 #include "exBase.h"
+#include "loop/qtGuard.h"
 #include "loop/qtWayOut.h"
 #include "start/qtDisplayProbe.h"
 #include "start/qtDisplayWatch.h"
@@ -34,6 +35,33 @@ private:
     std::string _name;
 };
 
+/// Keeps what an event handler throws, of ours or of Qt's own, from the frames of Qt's loop: its timers would never go
+/// on.
+class GuardedApplication final : public QApplication
+{
+public:
+    using QApplication::QApplication;
+
+    bool notify(QObject* receiver, QEvent* event) override
+    {
+        try
+        {
+            return QApplication::notify(receiver, event);
+        }
+        catch (QtWayOut::Left const&)
+        {
+            throw;
+        }
+        catch (...)
+        {
+            if (QThread::currentThread() != thread())
+                throw;
+            QtGuard::getInstance().take();
+            return false;
+        }
+    }
+};
+
 /// Never destroyed: the last widgets go after everything that could destroy it. The arguments live as long.
 QCoreApplication* makeApplication(QString const& platform)
 {
@@ -46,7 +74,7 @@ QCoreApplication* makeApplication(QString const& platform)
     arguments = {program.data(), option.data(), value.data(), nullptr};
     static int count = 0;
     count = static_cast<int>(arguments.size()) - 1;
-    auto* const application = new QApplication(count, arguments.data());
+    auto* const application = new GuardedApplication(count, arguments.data());
     QApplication::setQuitOnLastWindowClosed(false);
     QApplication::setWindowIcon(getWindowIcon());
     return application;

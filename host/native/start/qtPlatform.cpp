@@ -196,6 +196,7 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     QPointer<QtWindowWidget> const window = dynamic_cast<QtWindowWidget*>(QApplication::activeModalWidget());
     QWidget const* const stage = window ? window.data() : static_cast<QWidget*>(QtFrontOrder::getInstance().getFront());
     std::exception_ptr error;
+    try
     {
         QtSpareHandles::Turn const turn;
         QtSpareHandles::require();
@@ -204,6 +205,10 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
         if (stage)
             loop.endWith(*stage);
         error = loop.run();
+    }
+    catch (...)
+    {
+        error = QtGuard::getInstance().getScriptHook().capture();
     }
     QtDisposal::destroyWaiting();
     if (!error)

@@ -3,12 +3,12 @@
 #include "windows/qtCaptions.h"
 
 #include <QAccessible>
-#include <QApplication>
 #include <QPointer>
 #include <QScrollBar>
 
 #include <algorithm>
 #include <utility>
+#include <vector>
 
 namespace Kv
 {
@@ -32,23 +32,27 @@ public:
 
     bool isThere() const { return _isThere; }
 
+    // A list of its own: in that of Qt a widget stays that Qt has failed to construct.
+    void add(QtContentArea& area) { _areas.push_back(&area); }
+    void remove(QtContentArea& area) { _areas.erase(std::remove(_areas.begin(), _areas.end(), &area), _areas.end()); }
+
 private:
     ScreenReader() { QAccessible::installActivationObserver(this); }
 
     void accessibilityActiveChanged(bool active) override
     {
         _isThere = active;
-        for (QWidget* const widget : QApplication::allWidgets())
-            if (auto* const area = dynamic_cast<QtContentArea*>(widget))
-                area->nameValuesSoon();
+        for (QtContentArea* const area : _areas)
+            area->nameValuesSoon();
     }
 
+    std::vector<QtContentArea*> _areas;
     bool _isThere = QAccessible::isActive();
 };
 
 } // namespace
 
-QtContentArea::QtContentArea(QWidget* parent, std::function<void(int, int)> onRoom)
+QtContentArea::QtContentArea(QWidget* parent, std::function<bool(int, int)> onRoom)
     : QScrollArea(parent), _onRoom(std::move(onRoom))
 {
     setFrameShape(QFrame::NoFrame);
@@ -56,6 +60,12 @@ QtContentArea::QtContentArea(QWidget* parent, std::function<void(int, int)> onRo
     // Tab stops at widgets only.
     setFocusPolicy(Qt::NoFocus);
     connect(verticalScrollBar(), &QScrollBar::actionTriggered, this, [this](int action) { turnPage(action); });
+    ScreenReader::getInstance().add(*this);
+}
+
+QtContentArea::~QtContentArea()
+{
+    ScreenReader::getInstance().remove(*this);
 }
 
 void QtContentArea::fill(QRect const& place)
@@ -75,11 +85,13 @@ void QtContentArea::tellRoom()
     for (bool mayLoseBars = true;;)
     {
         QSize const room = maximumViewportSize();
-        if (std::exchange(_told, room) != room)
-            _onRoom(room.width(), room.height());
+        bool const isFilled = std::exchange(_told, room) == room || _onRoom(room.width(), room.height());
         if (!alive)
             return;
-        if (!widget())
+        // What has failed is done anew with the next occasion.
+        if (!isFilled)
+            forgetRoom();
+        if (!isFilled || !widget())
             break;
         bool const isWide = widget()->width() > room.width();
         bool const isHigh = widget()->height() > room.height();

@@ -12,8 +12,10 @@ namespace Kv
 class QtContentArea final : public QScrollArea
 {
 public:
-    /// `onRoom` hears of the width and height in pixels; it may end the area.
-    QtContentArea(QWidget* parent, std::function<void(int, int)> onRoom);
+    /// `onRoom` hears of the width and height in pixels, and gives whether all has its place there; it may end the
+    /// area.
+    QtContentArea(QWidget* parent, std::function<bool(int, int)> onRoom);
+    ~QtContentArea() override;
 
     /// Takes that place in the parent, and tells the room.
     void fill(QRect const& place);
@@ -41,7 +43,7 @@ private:
     void setBars(bool below, bool beside);
     void turnPage(int action);
 
-    std::function<void(int, int)> _onRoom;
+    std::function<bool(int, int)> _onRoom;
     QSize _told;
     QPointer<QWidget> _cover;
     bool _telling = false;

@@ -11,7 +11,7 @@
 #include <QStyle>
 
 #include <algorithm>
-#include <utility>
+#include <memory>
 
 namespace Kv
 {
@@ -80,7 +80,7 @@ public:
     }
 };
 
-QtPeerKind<NtFloat, Float> const registered;
+QtPeerKind<NtFloat, Float> registered;
 
 } // namespace
 
@@ -108,20 +108,26 @@ QtFloat* QtFloat::findAround(QWidget& widget)
 
 QWidget* QtFloat::getContent()
 {
-    if (!std::exchange(_hasContent, true))
+    if (!_hasContent)
         makeContent();
     return _area ? _area->widget() : nullptr;
 }
 
 void QtFloat::makeContent()
 {
-    _area = new QtContentArea(this, [handle = _handle](int width, int height)
-                              { handle.tell(&NtFloatListener::onResized, width, height); });
-    _area->setWidget(new QWidget);
-    _area->widget()->hide();
+    auto area = std::make_unique<QtContentArea>(this, [handle = _handle](int width, int height)
+                                                { return handle.tell(&NtFloatListener::onResized, width, height); });
+    area->setWidget(new QWidget);
+    area->widget()->hide();
+    auto edge = std::make_unique<Edge>(this);
+    _area = area.get();
+    _edge = edge.get();
+    // From here on the float owns both.
+    static_cast<void>(area.release());
+    static_cast<void>(edge.release());
+    _hasContent = true;
     _area->setGeometry(rect());
     _area->show();
-    _edge = new Edge(this);
     _edge->setGeometry(rect());
     _edge->show();
 }

@@ -1,5 +1,6 @@
 #include "windows/qtFrontOrder.h"
 
+#include "loop/qtGuard.h"
 #include "windows/qtFloat.h"
 #include "windows/qtFocusOrder.h"
 
@@ -52,7 +53,8 @@ QtFloat* QtFrontOrder::getFront() const
 void QtFrontOrder::remove(QtFloat& floating)
 {
     forget(floating);
-    cutHoles();
+    // It is being destroyed, and nothing may come out of that.
+    QtGuard::getInstance().shield([this] { cutHoles(); });
 }
 
 void QtFrontOrder::rememberKeyboard(QWidget& widget)

@@ -63,13 +63,21 @@ void QtMainWindow::refuseInput()
     _placesWithKeyboard.emplace_back(findPlaceWithKeyboard());
     if (!native)
         return;
-    // Else Qt gives the keyboard to another widget, and the float forgets this one.
-    native->setFocus(Qt::OtherFocusReason);
-    if (_placesWithKeyboard.size() == 1)
-        _enableOwn(false);
+    try
+    {
+        // Else Qt gives the keyboard to another widget, and the float forgets this one.
+        native->setFocus(Qt::OtherFocusReason);
+        if (_placesWithKeyboard.size() == 1)
+            _enableOwn(false);
+    }
+    catch (...)
+    {
+        admitInput();
+        throw;
+    }
 }
 
-void QtMainWindow::admitInput()
+void QtMainWindow::admitInput() noexcept
 {
     QtErrorAside const aside;
     QPointer<QWidget> const place = _placesWithKeyboard.back();
@@ -77,10 +85,15 @@ void QtMainWindow::admitInput()
     QWidget* const native = _content.getNative();
     if (!native)
         return;
+    QtGuard& guard = QtGuard::getInstance();
     if (_placesWithKeyboard.empty())
-        _enableOwn(true);
-    if (!QtFrontOrder::giveKeyboard(place))
-        QtFrontOrder::getInstance().settleKeyboard(*native);
+        guard.shield([this] { _enableOwn(true); });
+    guard.shield(
+        [&]
+        {
+            if (!QtFrontOrder::giveKeyboard(place))
+                QtFrontOrder::getInstance().settleKeyboard(*native);
+        });
 }
 
 bool QtMainWindow::eventFilter(QObject* watched, QEvent* event)

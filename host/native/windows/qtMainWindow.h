@@ -29,7 +29,7 @@ public:
     void redraw() override;
     void flushInput() override;
     void refuseInput() override;
-    void admitInput() override;
+    void admitInput() noexcept override;
 
     bool eventFilter(QObject* watched, QEvent* event) override;
 

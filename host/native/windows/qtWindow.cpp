@@ -82,7 +82,7 @@ void makeRoomForTitle(QWidget& window)
 QtWindowWidget::QtWindowWidget(QtListenerHandle<NtWindowListener> const& handle)
     : QWidget(nullptr, Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint), _handle(handle),
       _area(new QtContentArea(this, [handle](int width, int height)
-                              { handle.tell(&NtWindowListener::onResized, width, height); }))
+                              { return handle.tell(&NtWindowListener::onResized, width, height); }))
 {
     setAttribute(Qt::WA_QuitOnClose, false);
     // Left and right are what descriptions say, whatever direction the user reads in.

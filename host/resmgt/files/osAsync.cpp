@@ -107,7 +107,19 @@ void Desk::begin()
         try
         {
             SignalsBlocked const blocked;
-            std::thread([this, errand] { run(errand); }).detach();
+            std::thread(
+                [this, errand]
+                {
+                    try
+                    {
+                        run(errand);
+                    }
+                    catch (...) // NOLINT(bugprone-empty-catch)
+                    {
+                        // Without the memory to tell of it, there is nothing left but not to end the process.
+                    }
+                })
+                .detach();
         }
         catch (std::system_error const&)
         {

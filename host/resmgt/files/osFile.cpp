@@ -121,18 +121,14 @@ std::string OsFile::read(std::uint64_t maxSize) const
     }
 }
 
-std::string OsFile::getVersion() const
+OsFile::Version OsFile::getVersion() const
 {
     std::optional<struct stat> const status = findStatus(_path);
     if (!status || !S_ISREG(status->st_mode))
         return {};
-    std::string version;
     // Not the number of the device, which can be another one when the same disk is mounted the next time.
-    for (auto const part :
-         {static_cast<long long>(status->st_ino), static_cast<long long>(status->st_size),
-          static_cast<long long>(status->st_mtim.tv_sec), static_cast<long long>(status->st_mtim.tv_nsec)})
-        version += std::to_string(part) + ' ';
-    return version;
+    return {static_cast<long long>(status->st_ino), static_cast<long long>(status->st_size),
+            static_cast<long long>(status->st_mtim.tv_sec), static_cast<long long>(status->st_mtim.tv_nsec)};
 }
 
 bool OsFile::isWritable() const

@@ -3,6 +3,7 @@
 #include "files/osFilePath.h"
 #include "kvExport.h"
 
+#include <array>
 #include <cstdint>
 #include <filesystem>
 #include <mutex>
@@ -45,8 +46,11 @@ public:
     /// one of more than `maxSize` bytes.
     std::string read(std::uint64_t maxSize) const;
 
-    /// A text that is another one once the file has been written or replaced; empty where there is no regular file.
-    std::string getVersion() const;
+    /// Tells whether a file has been written or replaced: is another one then.
+    using Version = std::array<long long, 4>;
+
+    /// All zero where there is no regular file. Needs no memory.
+    Version getVersion() const;
 
     /// True if `replace` would find what it needs: a regular file that can be written, or none, in a folder that can be
     /// written. A file that nobody may write, by its permissions, cannot be written by the superuser either.

@@ -384,12 +384,23 @@ void Dialog::setWidgetValues(RCShdPtr<UiContainer> container, bp::dict const& va
 void Dialog::addCallback(std::string const& widgetName, PiWidget::EventType eventType, PyObject* cb)
 {
     RCShdPtr<UiWidget> const widget = getWidget(widgetName);
+    RCShdPtr<PiWidget> const piWidget = findEventFace(widget);
     auto const set = makeStrong<CallbackSet>(CallbackSet{widgetName, eventType, cb, {}});
-    _callables.add(*set);
     _callbacks.push_back(set);
-    _callbacksByKey.emplace(CallbackKey(widgetName, eventType, cb), set.get());
-    if (RCShdPtr<PiWidget> const piWidget = findEventFace(widget))
-        _widgetCbs->addPythonHandler(piWidget, set);
+    auto known = _callbacksByKey.end();
+    try
+    {
+        known = _callbacksByKey.emplace(CallbackKey(widgetName, eventType, cb), set.get());
+        if (piWidget)
+            _widgetCbs->addPythonHandler(piWidget, set);
+        // Last, since it alone cannot be taken back without fail.
+        _callables.add(*set);
+    }
+    catch (...)
+    {
+        takeBack(std::prev(_callbacks.end()), known, piWidget);
+        throw;
+    }
 }
 
 void Dialog::removeCallback(std::string const& widgetName, PiWidget::EventType eventType, PyObject* cb)
@@ -399,13 +410,20 @@ void Dialog::removeCallback(std::string const& widgetName, PiWidget::EventType e
     auto const found = _callbacksByKey.lower_bound(key);
     if (found == _callbacksByKey.end() || found->first != key)
         return;
+    RCShdPtr<PiWidget> const piWidget = findEventFace(widget);
     auto const place = findCallback(found->second);
-    RCStrongPtr<CallbackSet> const set = *place;
     // First, since it alone can fail.
-    _callables.remove(*set);
-    if (RCShdPtr<PiWidget> const piWidget = findEventFace(widget))
-        piWidget->removeCallback(eventType, set->handler.get());
-    _callbacksByKey.erase(found);
+    _callables.remove(**place);
+    takeBack(place, found, piWidget);
+}
+
+void Dialog::takeBack(CallbackSets::iterator place, CallbacksByKey::iterator known, RCShdPtr<PiWidget> const& piWidget)
+{
+    RCStrongPtr<CallbackSet> const set = *place;
+    if (piWidget)
+        piWidget->removeCallback(set->eventType, set->handler.get());
+    if (known != _callbacksByKey.end())
+        _callbacksByKey.erase(known);
     _callbacks.erase(place);
     WidgetCbs::release(set);
 }

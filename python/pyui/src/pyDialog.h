@@ -130,6 +130,7 @@ private:
     using CallbackSets = std::vector<RCStrongPtr<CallbackSet>>;
     /// What `removeCallback` goes by.
     using CallbackKey = std::tuple<std::string, PiWidget::EventType, PyObject*>;
+    using CallbacksByKey = std::multimap<CallbackKey, CallbackSet*>;
 
     KV_LOCAL void createUi(Positionner const& position);
     KV_LOCAL static RCShdPtr<UiContainer> createTopLevelPanel(RCShdPtr<UiTopLevel> const& topLevel);
@@ -143,6 +144,11 @@ private:
 
     /// The place of a script's callback; looked for from both ends, since one of the last or first goes as a rule.
     KV_LOCAL CallbackSets::iterator findCallback(CallbackSet const* set);
+
+    /// Takes a script's callback from the widget, where that raises events, and from among the callbacks; its key goes
+    /// if it has one.
+    KV_LOCAL void takeBack(CallbackSets::iterator place, CallbacksByKey::iterator known,
+                           RCShdPtr<PiWidget> const& piWidget);
 
     KV_LOCAL void clearCloseCallbacks();
     /// Takes the handler of a close button from the button that has it, where several bear the name.
@@ -169,7 +175,7 @@ private:
     bool _disableNextClose = false;
     PyCallables _callables;
     /// The sets in `_callbacks`; those with one key in the order in which they came.
-    std::multimap<CallbackKey, CallbackSet*> _callbacksByKey;
+    CallbacksByKey _callbacksByKey;
 };
 
 } // namespace Kv::PyextUi

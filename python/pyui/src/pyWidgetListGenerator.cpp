@@ -109,6 +109,8 @@ std::string WidgetListGenerator::generate()
     // What says of itself that it is a list need not be one.
     TextBuffer buffer(PyList_Check(_widgets.ptr()) ? PyList_GET_SIZE(_widgets.ptr()) : 0);
     std::ostream stream(&buffer);
+    // A lack of memory is told as one.
+    stream.exceptions(std::ios::badbit);
     _writer = std::make_unique<XmlWriter>(stream, 2);
     writeContainerHead("MainContainer", {1, "u", "l"}, {1, "u", "b"}, {-1, "uu", "r"}, {-4, "uu", "t"});
     writeContainerHead(closeButtonsContainer, {0, "u", "l"}, {0, "u", "b"}, {0, "uu", "r"}, {closeBarHeight, "u", "h"});

@@ -1,0 +1,430 @@
+"""The life of a dialog, or of a composition, in which memory runs out: at the first call for it, at the second, and so
+on. Each such life has a process of its own, a copy of one that waits before it. With `./run nomemory` a table of them all."""
+
+import collections
+import concurrent.futures
+import ctypes
+import gc
+import json
+import os
+import pathlib
+import re
+import shutil
+import signal
+import subprocess
+import sys
+import tempfile
+
+from quorvane_velmora import graph, ui
+from quorvane_velmora.libs import libKVpyextTesting as door
+
+if os.path.basename(os.readlink('/proc/self/exe')) == 'velmora':
+    from PyQt6.QtWidgets import QApplication
+
+TREE = pathlib.Path(ui.__file__).parents[5]
+LIBRARY = TREE / 'tests' / 'libshortMemory.so'
+FORM = [('TextField', 'Show', 'Show', 'Reel'), ('ToggleButton', 'Win', 'Do you win ?', False),
+        ('Menu', 'Prize', 'Prize', (['Gold', 'Silver', 'Bronze'], 1)), ('PushButton', 'Think', 'Think'),
+        ('Label', 'Words', 'Words', 'Good luck')]
+OLD = {'Show': 'Reel', 'Win': False, 'Prize': 'Silver'}
+NEW = {'Show': 'Golden Reel', 'Win': True, 'Prize': 'Bronze'}
+MENU = (['Gold', 'Silver', 'Bronze'], 2)
+COMPOSITION = pathlib.Path(__file__).parents[2] / 'examples' / 'compositions' / 'shot_020.vmcomposition'
+
+
+def require(is_true, what):
+    if not is_true:
+        raise AssertionError(what)
+
+
+class Tree:
+    """A dialog that nobody sees is described, built, written, read, called back from, and dropped."""
+
+    def __init__(self):
+        self.dialog = None
+
+    def prepare(self):
+        self.calls = []
+
+    def build(self):
+        self.dialog = ui.createDialog('Awards', ui.makeXmlFromWidgetList(FORM, ['OK', 'Cancel']), 400, 300)
+
+    def use(self):
+        dialog = self.dialog
+
+        def listen(given, name, event):
+            self.calls.append((given.getValue(name), name, event))
+
+        dialog.addCallback('Win', ui.EventType.STATE, listen)
+        dialog.addCallback('Show', ui.EventType.VALUE_CHANGED, listen)
+        before = dialog.getValues()
+        dialog.setValues({'Show': NEW['Show']})
+        dialog.setValue('Win', True)
+        dialog.removeCallback('Win', ui.EventType.STATE, listen)
+        dialog.setValue('Prize', MENU)
+        dialog.setValue('Win', True)
+        dialog.hideWidget('Think')
+        dialog.enableWidget('Show', False)
+        dialog.setWidgetResourceName('Show', 'awards')
+        return before, dialog.getValues(), dialog.isDisplayed('Think'), dialog.isEnabled('Show')
+
+    def live(self):
+        self.build()
+        seen = self.use()
+        self.dialog = None
+        gc.collect()
+        return seen
+
+    def judge(self, seen):
+        require(seen == (OLD, NEW, False, False), seen)
+        require(self.calls == [('Golden Reel', 'Show', ui.EventType.VALUE_CHANGED), (True, 'Win', ui.EventType.STATE)],
+                self.calls)
+
+    def look_back(self):
+        """What an exception has left is whole, and goes on working."""
+        if self.dialog is None:
+            return
+        values = self.dialog.getValues()
+        require(values.keys() >= OLD.keys(), values)
+        # A menu whose entries could not all be set has those that were, and no selection.
+        require(all(values[name] in (OLD[name], NEW[name]) for name in ('Show', 'Win')), values)
+        require(values['Prize'] in (OLD['Prize'], NEW['Prize'], None), values)
+        self.prepare()
+        self.dialog.setValues({'Show': OLD['Show'], 'Win': False}, False)
+        self.dialog.setValue('Prize', (['Gold', 'Silver', 'Bronze'], 1), False)
+        self.dialog.enableWidget('Show', True)
+        _, values, *rest = self.use()
+        require((values, rest) == (NEW, [False, False]), (values, rest))
+        self.dialog = None
+
+    def tidy(self):
+        self.dialog = None
+        gc.collect()
+
+
+class Window(Tree):
+    """The dialog is shown, and a user clicks in it."""
+
+    def prepare(self):
+        super().prepare()
+        self.clicks = ['Win', 'Think', 'CloseButton_OK']
+        door.close()
+        door.open(self.turn)
+
+    def turn(self):
+        if self.clicks:
+            place = [widget.name for widget in door.look()].index(self.clicks[0])
+            del self.clicks[0]
+            door.click(place)
+        else:
+            raise RuntimeError('the button does not close the dialog')
+
+    def live(self):
+        self.build()
+
+        def think(dialog, name, event):
+            self.calls.append(name)
+            dialog.setValue('Show', NEW['Show'], False)
+
+        self.dialog.addCallback('Think', ui.EventType.ACTIVATE, think)
+        button = self.dialog.launch()
+        values = self.dialog.getValues()
+        self.dialog = None
+        gc.collect()
+        return button, values
+
+    def judge(self, seen):
+        values = {**OLD, 'Win': True, 'Show': NEW['Show'], 'CloseButtonClicked': 'CloseButton_OK'}
+        require(seen == ('CloseButton_OK', values) and self.calls == ['Think'], (seen, self.calls))
+
+    def look_back(self):
+        if self.dialog is None:
+            return
+        values = self.dialog.getValues()
+        require(all(values[name] in (OLD[name], NEW[name]) for name in OLD), values)
+        self.prepare()
+        self.clicks = ['CloseButton_OK']
+        require(self.dialog.launch() == 'CloseButton_OK', 'another button')
+        self.dialog = None
+
+    def tidy(self):
+        super().tidy()
+        door.close()
+
+
+class Composition:
+    """A composition is read, changed and saved."""
+
+    SIZE = 'a size that is longer than any short text'
+
+    def __init__(self):
+        self.folder = pathlib.Path(tempfile.mkdtemp(prefix='velmora-'))
+        self.old = COMPOSITION.read_text()
+        self.new = self.old.replace('text="4"', 'text="%s"' % self.SIZE)
+
+    def prepare(self):
+        self.shot = None
+        self.path = self.folder / 'shot.vmcomposition'
+        self.path.write_text(self.old)
+
+    def use(self):
+        before = self.shot.getNodes(), self.shot.getNodeValues('Blur'), self.shot.getNodeInputs('Output')
+        self.shot.setNodeValue('Blur', 'size', self.SIZE)
+        self.shot.save()
+        return (before, self.shot.getNodeValues('Blur'))
+
+    def live(self):
+        self.shot = graph.readComposition(str(self.path))
+        return self.use()
+
+    def judge(self, seen):
+        require(seen == ((['Plate', 'Blur', 'Output'], {'size': '4'}, {'source': 'Blur'}), {'size': self.SIZE}), seen)
+        require(self.path.read_text() == self.new, 'not saved')
+
+    def look_back(self):
+        require(self.path.read_text() in (self.old, self.new), 'the file is neither the old nor the new one')
+        require(not list(self.folder.glob('.*')), os.listdir(self.folder))
+        if self.shot is None:
+            return
+        (nodes, before, inputs), after = self.use()
+        require(nodes == ['Plate', 'Blur', 'Output'] and inputs == {'source': 'Blur'}, (nodes, inputs))
+        require(before['size'] in ('4', self.SIZE) and after == {'size': self.SIZE}, (before, after))
+        require(self.path.read_text() == self.new, 'not saved')
+
+    def tidy(self):
+        shutil.rmtree(self.folder)
+
+
+class Workspace(Composition):
+    """The composition is opened in the application between that."""
+
+    def prepare(self):
+        super().prepare()
+        self.path = self.folder / ('shot%d.vmcomposition' % ui.Workspace.getNbCompositions())
+        self.path.write_text(self.old)
+
+    def use(self):
+        ui.Workspace.openComposition(self.shot)
+        seen = super().use()
+        opened = [each.getPath() for each in ui.Workspace.getCompositions()]
+        require(opened.count(str(self.path)) == 1 and ui.Workspace.getCurrentComposition() == self.shot, opened)
+        return seen
+
+    def look_back(self):
+        super().look_back()
+        for each in ui.Workspace.getCompositions():
+            require(each.getNodes() == ['Plate', 'Blur', 'Output'], each.getNodes())
+
+
+class Scenario:
+    def __init__(self, what, inside=False, first=False):
+        self.what = what
+        self.inside = inside
+        # The first life of its process, in which all else is loaded.
+        self.first = first
+
+
+SCENARIOS = {
+    'dialog, unseen': Scenario(Tree),
+    'dialog, unseen, the first': Scenario(Tree, first=True),
+    'dialog, in a window': Scenario(Window),
+    'dialog, in a window, the first': Scenario(Window, first=True),
+    'dialog, floating': Scenario(Window, inside=True),
+    'composition': Scenario(Composition),
+    'composition, in the application': Scenario(Workspace, inside=True),
+}
+
+# Which calls fail: the one, that and all later ones, the one among those of the project's own code.
+MODES = ('one', 'all', 'ours')
+# A life takes a fraction of a second.
+SECONDS = 30
+
+
+def load():
+    library = ctypes.PyDLL(str(LIBRARY))
+    library.runShort.argtypes = [ctypes.py_object, ctypes.c_long, ctypes.c_long, ctypes.c_int, ctypes.c_int]
+    library.runShort.restype = ctypes.py_object
+    library.getCalls.restype = library.getFailures.restype = ctypes.c_long
+    return library
+
+
+def run_one(library, life, mode, k, file):
+    """What becomes of the life in which the call `k` fails; all go well for 0."""
+    seen = None
+    life.prepare()
+    try:
+        last = 0 if k == 0 else sys.maxsize if mode == 'all' else k
+        seen = library.runShort(life.live, k, last, mode == 'ours', file)
+        end = 'finished'
+    except MemoryError:
+        end = 'MemoryError'
+    except BaseException as error:
+        end = '%s: %s' % (type(error).__name__, str(error)[:200])
+    calls, failures = library.getCalls(), library.getFailures()
+    if failures:
+        library.sayFailure()
+    if end == 'finished':
+        life.judge(seen)
+    # Those that are told of the failure only later.
+    seen = None
+    life.look_back()
+    life.prepare()
+    life.judge(life.live())
+    return [end, calls, failures]
+
+
+def fork_one(library, life, mode, k):
+    """Runs one life in a process of its own: how it ended, and what it wrote down."""
+    with tempfile.TemporaryFile() as report, tempfile.TemporaryFile('w+') as answer:
+        child = os.fork()
+        if child == 0:
+            signal.alarm(SECONDS)
+            try:
+                found = run_one(library, life, mode, k, report.fileno())
+            except BaseException as error:
+                found = ['afterwards %s: %s' % (type(error).__name__, str(error)[:300]), -1, 1]
+            json.dump(found, answer)
+            answer.flush()
+            os._exit(0)
+        status = os.waitstatus_to_exitcode(os.waitpid(child, 0)[1])
+        report.seek(0)
+        answer.seek(0)
+        text = report.read().decode(errors='replace')
+        if status == 0:
+            return [*json.load(answer), text]
+        return ['signal %d' % -status if status < 0 else 'status %d' % status, -1, 1, text]
+
+
+def work(name, mode, part, parts, lives):
+    """Runs one of so many equal parts of all lives, or of so many lives that are spread over all, and prints a line for
+    each: which call failed, how it ended, what was written down."""
+    scenario = SCENARIOS[name]
+    life = scenario.what()
+    library = load()
+    if not scenario.first:
+        life.prepare()
+        life.judge(life.live())
+    gc.collect()
+    if scenario.inside:
+        # The copies have none of the threads that draw large pictures, and would wait for them.
+        next(window for window in QApplication.topLevelWidgets() if window.isVisible()).setUpdatesEnabled(False)
+    end, calls, _, text = fork_one(library, life, mode, 0)
+    require(end == 'finished', (end, text))
+    distance = max(calls // lives, 1)
+    k = (distance + 1) // 2 + part * distance
+    while True:
+        end, _, failures, text = fork_one(library, life, mode, k)
+        if not failures:
+            break
+        print(json.dumps([k, end, text]), flush=True)
+        k += parts * distance
+    life.tidy()
+
+
+def start(name, mode, part=0, parts=1, lives=sys.maxsize):
+    """A process that does the work for a scenario."""
+    program = [str(TREE / 'bin' / 'velmora'), '--exit'] if SCENARIOS[name].inside else [sys.executable]
+    environment = {**os.environ, 'LD_PRELOAD': str(LIBRARY), 'PYTHONMALLOC': 'malloc', 'QT_QPA_PLATFORM': 'offscreen',
+                   'PYTHONPATH': str(pathlib.Path(ui.__file__).parents[2]), 'XDG_CONFIG_HOME': '/dev/null',
+                   'PYTHONDONTWRITEBYTECODE': '1'}
+    arguments = [name, mode, str(part), str(parts), str(lives)]
+    return subprocess.Popen([*program, __file__, 'work', *arguments], env=environment, text=True,
+                            stdout=subprocess.PIPE, stderr=subprocess.PIPE)
+
+
+def run(name, mode, parts, lives=sys.maxsize):
+    """The lives of a scenario, by as many processes as there are parts."""
+    workers = [start(name, mode, part, parts, lives) for part in range(parts)]
+    with concurrent.futures.ThreadPoolExecutor() as pool:
+        outputs = list(pool.map(lambda worker: worker.communicate(), workers))
+    for worker, (_, errors) in zip(workers, outputs):
+        require(worker.returncode == 0, errors[-3000:])
+    return sorted(json.loads(line) for output, _ in outputs for line in output.splitlines())
+
+
+FRAME = re.compile(r'(?P<library>[^(]*)\((?P<name>[^+)]*)\+?(?P<offset>0x[0-9a-f]+)?\)')
+# Those through which a process dies, or asks for memory, for somebody else.
+BETWEEN = re.compile(r'/(libshortMemory|libc|libstdc\+\+|libgcc_s|libm|ld-linux-x86-64)\.so')
+DESTRUCTOR = re.compile(r'D[012]Ev$')
+OURS = re.compile(r'/(libKV\w+\.so|velmora)$')
+
+
+def read_traces(text):
+    """What was written down on the way: the frames by their title."""
+    traces = {}
+    for line in text.splitlines():
+        if line in ('reached', 'died', 'failed'):
+            frames = traces[line] = []
+        elif FRAME.match(line):
+            frames.append(FRAME.match(line).groupdict())
+    return traces
+
+
+def find_place(text):
+    """The frame to which a death is put down: the function that an exception may not pass, else the innermost that is
+    no function of the system's own libraries. None where nothing was written down."""
+    traces = read_traces(text)
+    died = traces.get('died', [])
+    for frame in traces.get('reached', []):
+        called = died[died.index(frame) - 1] if frame in died else frame
+        # Who inherits a destructor cannot keep what that throws.
+        return called if DESTRUCTOR.search(called['name']) else frame
+    return next((frame for frame in died if not BETWEEN.search(frame['library'])), died[0] if died else None)
+
+
+def show_place(place):
+    """A frame in words."""
+    if place is None:
+        return 'unknown'
+    name = place['name']
+    if name:
+        name = subprocess.run(['c++filt', name], capture_output=True, text=True).stdout.strip()
+    elif OURS.search(place['library']):
+        # Where a call returns to can be the next line already.
+        address = hex(int(place['offset'], 16) - 1)
+        name = subprocess.run(['addr2line', '-Cfpse', place['library'], address], capture_output=True, text=True).stdout
+    return '%s: %s' % (os.path.basename(place['library']), name.strip() or place['offset'])
+
+
+def find_offence(end, text):
+    """What is wrong with the end of a life; None if it may end so."""
+    if end.startswith(('signal', 'status')):
+        place = find_place(text)
+        if place is None or OURS.search(place['library']):
+            return '%s in %s' % (end, show_place(place))
+    elif end not in ('finished', 'MemoryError'):
+        return end
+    return None
+
+
+def tell(name, mode, lives):
+    """The row of a table, and what is behind its numbers."""
+    ends = [end for _, end, _ in lives]
+    died = collections.Counter('%s: %s' % (end, show_place(find_place(text)))
+                               for _, end, text in lives if end.startswith(('signal', 'status')))
+    offences = {}
+    for k, end, text in lives:
+        offence = find_offence(end, text)
+        if offence:
+            offences.setdefault(offence, []).append(k)
+    wrong = sum(map(len, offences.values()))
+    print('%-32s %-5s %6d %12d %9d %6d %6d' % (name, mode, len(lives), ends.count('MemoryError'),
+                                               ends.count('finished'), sum(died.values()), wrong))
+    for place, count in died.most_common():
+        print('    %5d x %s' % (count, place))
+    for offence, calls in offences.items():
+        print('    WRONG: %s, at %s' % (offence, calls[:20]))
+    sys.stdout.flush()
+    return wrong
+
+
+def run_all(names):
+    print('%-32s %-5s %6s %12s %9s %6s %6s' % ('', 'fails', 'calls', 'MemoryError', 'finished', 'died', 'wrong'))
+    return sum(tell(name, mode, run(name, mode, os.cpu_count())) for name in names or SCENARIOS for mode in MODES)
+
+
+if __name__ == '__main__':
+    if sys.argv[1:2] == ['work']:
+        work(sys.argv[2], sys.argv[3], *map(int, sys.argv[4:]))
+    else:
+        sys.exit(run_all(sys.argv[1:]) > 0)
