@@ -55,6 +55,8 @@ bool hasStack()
     return name != QLatin1String("offscreen") && name != QLatin1String("minimal");
 }
 
+constexpr qsizetype mostInWaylandTitle = 1024;
+
 bool isWayland()
 {
     return QGuiApplication::platformName().startsWith(QLatin1String("wayland"));
@@ -240,10 +242,10 @@ QtWindow::QtWindow(std::string const& name, std::string const& title, std::strin
     native->setObjectName(toQString(name));
     NtNoListener nobody;
     _content = std::make_unique<QtContainer>(native, contentName, nobody);
-    // No screen shows more, and a window system can end the process for it.
-    constexpr int maxTitle = 1024;
+    // A window system can end the process for a longer one, and Qt complains of it on Wayland.
+    qsizetype const most = isWayland() ? mostInWaylandTitle : mostInRow;
     // Doubled, what marks a changed document for Qt stands for itself.
-    native->setWindowTitle(toShown(toQString(title), maxTitle).replace(QLatin1String("[*]"), QLatin1String("[*][*]")));
+    native->setWindowTitle(toShown(toQString(title), most).replace(QLatin1String("[*]"), QLatin1String("[*][*]")));
     // Where the application is a script's own, it has no icon as a rule.
     if (QApplication::windowIcon().isNull())
         native->setWindowIcon(getWindowIcon());
