@@ -1,5 +1,6 @@
 """What a dialog stands on goes while it runs: the display, the application object, its own process."""
 
+import subprocess
 import sys
 
 import pytest
@@ -24,6 +25,16 @@ def tell(act, *arguments):
         print(act(*arguments), flush=True)
     except RuntimeError as error:
         print(str(error).split(':')[0], '-', type(error).__name__, flush=True)
+'''
+
+KILL = '''
+import socket, struct
+with socket.socket(socket.AF_UNIX) as connection:
+    connection.connect(os.environ.get('WAYLAND_DISPLAY') or '/tmp/.X11-unix/X' + os.environ['DISPLAY'].lstrip(':'))
+    server = struct.unpack('3i', connection.getsockopt(socket.SOL_SOCKET, socket.SO_PEERCRED, 12))[0]
+def kill():
+    os.kill(server, signal.SIGKILL)
+    time.sleep(0.2)
 '''
 
 ENDS_OF_THE_SERVER = {
@@ -59,15 +70,7 @@ except End:
 
 @pytest.mark.parametrize('moment', ENDS_OF_THE_SERVER)
 def test_a_display_that_goes_is_an_exception_and_what_the_dialog_holds_is_kept(display, moment):
-    printed = run_script(PREAMBLE + '''
-import socket, struct
-with socket.socket(socket.AF_UNIX) as connection:
-    connection.connect(os.environ.get('WAYLAND_DISPLAY') or '/tmp/.X11-unix/X' + os.environ['DISPLAY'].lstrip(':'))
-    server = struct.unpack('3i', connection.getsockopt(socket.SOL_SOCKET, socket.SO_PEERCRED, 12))[0]
-def kill():
-    os.kill(server, signal.SIGKILL)
-    time.sleep(0.2)
-''' + ENDS_OF_THE_SERVER[moment] + '''
+    printed = run_script(PREAMBLE + KILL + ENDS_OF_THE_SERVER[moment] + '''
 dialog.setValue('a', 'still', False)
 print(dialog.getValue('a'), dialog.getValue('m'))
 tell(ui.showMessageBox, 'Next', ['.'])
@@ -75,6 +78,24 @@ tell(ui.showMessageBox, 'Next', ['.'])
     runs = {'under two dialogs': 2, 'between two dialogs': 0}.get(moment, 1)
     refusal = 'Cannot dispatch events' if scripts.INSIDE else 'Cannot show a window'
     assert printed == ['Cannot go on - RuntimeError'] * runs + ['still y', refusal + ' - RuntimeError', 'atexit']
+
+
+@pytest.mark.standalone
+def test_what_is_not_saved_in_the_application_is_on_the_disk_when_its_display_goes(display, tmp_path):
+    shot, script = tmp_path / 'shot.vmcomposition', tmp_path / 'change.py'
+    shot.write_text('<composition><node name="n" type="t"><value name="v" text="old"/></node></composition>')
+    script.write_text('import os, signal, time\nfrom quorvane_velmora import ui' + KILL + '''
+shot, = ui.Workspace.getCompositions()
+for text in 'first', 'second':
+    shot.setNodeValue('n', 'v', text)
+kill()
+print('goes on', flush=True)
+''')
+    done = subprocess.run([scripts.TREE / 'bin' / 'velmora', '--open', shot, script], capture_output=True, text=True, timeout=60,
+                          env=scripts.environment(XDG_STATE_HOME=str(tmp_path / 'state'), **display))
+    assert (done.returncode, done.stdout) == (1, 'goes on\n') and 'the display is gone' in done.stderr
+    kept, = tmp_path.glob('state/**/*.vmrecovery')
+    assert 'second' in kept.read_text() and 'old' in shot.read_text()
 
 
 FORKS = {
