@@ -7,7 +7,7 @@
 #include "fwComposition.h"
 #include "piGraph.h"
 
-#include <optional>
+#include <algorithm>
 
 using namespace Kv;
 
@@ -28,21 +28,28 @@ void requireSame(PiGraph const& a, PiGraph const& b)
     }
 }
 
-/// Writes the bytes into a value of the first node. False where they cannot be a value's text, and nothing changed.
-bool change(FwComposition& composition, std::string const& text)
+/// Writes the bytes into a value of the first node. Where they cannot be a value's text, nothing changes.
+void change(FwComposition& composition, std::string const& text)
 {
     auto const nodes = composition.getGraph()->getNodes();
     if (nodes.empty())
-        return false;
+        return;
+    PiNode const& node = *nodes.front();
+    auto const before = node.getValues();
     try
     {
-        composition.getGraph()->setNodeValue(nodes.front()->getName(), "text", text);
-        return true;
+        composition.getGraph()->setNodeValue(node.getName(), "text", text);
     }
     catch (ExBase const&)
     {
-        return false;
+        Fuzz::require(node.getValues() == before, "a refusal changes nothing");
+        return;
     }
+    auto const values = node.getValues();
+    bool const isThere =
+        std::any_of(values.begin(), values.end(),
+                    [&text](auto const& value) { return value.first == "text" && value.second == text; });
+    Fuzz::require(isThere, "a value is what was written");
 }
 
 } // namespace
