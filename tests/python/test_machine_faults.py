@@ -15,7 +15,7 @@ import pytest
 
 import displays
 from quorvane_velmora import graph
-from scripts import TREE, environment, needs_pyqt, run_script
+from scripts import NO_SEARCH_FOR_LEAKS, TREE, environment, needs_pyqt, run_script
 
 pytestmark = pytest.mark.standalone
 
@@ -211,8 +211,7 @@ def refuse_files():
 @pytest.mark.parametrize('platform', ['offscreen', 'xcb'])
 def test_without_file_handles_all_is_refused_with_words_or_works_and_works_again_with_them(path, platform, left):
     shown = contextlib.nullcontext({}) if platform == 'offscreen' else displays.display(platform)
-    # The search for leaks itself fails at the end of such a process, whatever it has shown.
-    leaks = {} if platform == 'offscreen' else {'ASAN_OPTIONS': os.environ.get('ASAN_OPTIONS', '') + ':detect_leaks=0'}
+    leaks = {} if platform == 'offscreen' else NO_SEARCH_FOR_LEAKS
     with shown as variables:
         run_script(NO_HANDLES + '''
 left = int(sys.argv[2])
