@@ -51,22 +51,12 @@ void QtSpareHandles::require()
     close(handle);
 }
 
-QtSpareHandles::Turn::Turn() : _wasTurn(isTurn)
+QtSpareHandles::Switch::Switch(bool turn) : _wasTurn(isTurn)
 {
-    setTurn(true);
+    setTurn(turn);
 }
 
-QtSpareHandles::Turn::~Turn()
-{
-    setTurn(_wasTurn);
-}
-
-QtSpareHandles::Pause::Pause() : _wasTurn(isTurn)
-{
-    setTurn(false);
-}
-
-QtSpareHandles::Pause::~Pause()
+QtSpareHandles::Switch::~Switch()
 {
     setTurn(_wasTurn);
 }

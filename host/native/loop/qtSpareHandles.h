@@ -14,30 +14,32 @@ public:
     /// Throws `ExBase` where Qt would have none in its turn either.
     static void require();
 
-    /// Qt has its turn for as long as one lives.
-    class Turn
+private:
+    class Switch
     {
     public:
-        Turn();
-        Turn(Turn const&) = delete;
-        Turn& operator=(Turn const&) = delete;
-        ~Turn();
+        Switch(Switch const&) = delete;
+        Switch& operator=(Switch const&) = delete;
+
+    protected:
+        explicit Switch(bool turn);
+        ~Switch();
 
     private:
         bool _wasTurn;
     };
 
-    /// In the midst of a turn, scripts have theirs.
-    class Pause
+public:
+    /// Qt has its turn for as long as one lives.
+    struct Turn : private Switch
     {
-    public:
-        Pause();
-        Pause(Pause const&) = delete;
-        Pause& operator=(Pause const&) = delete;
-        ~Pause();
+        Turn() : Switch(true) {}
+    };
 
-    private:
-        bool _wasTurn;
+    /// In the midst of a turn, scripts have theirs.
+    struct Pause : private Switch
+    {
+        Pause() : Switch(false) {}
     };
 };
 

@@ -40,9 +40,9 @@ void forgetPendingOfGlib()
     dlclose(glib);
 }
 
-bool isUserInterface(QThread const* thread)
+bool isOnUserInterface()
 {
-    return QCoreApplication::instance() && thread == QCoreApplication::instance()->thread();
+    return QCoreApplication::instance() && QThread::currentThread() == QCoreApplication::instance()->thread();
 }
 
 void hear(QtMsgType type, QMessageLogContext const& context, QString const& message)
@@ -57,7 +57,7 @@ void hear(QtMsgType type, QMessageLogContext const& context, QString const& mess
     {
         QtDisplayWatch::noteBroken();
         // A thread of Qt's that reads for the other one has no more to read. The loop sees it at its next tick.
-        if (!isUserInterface(QThread::currentThread()))
+        if (!isOnUserInterface())
             pthread_exit(nullptr);
         QtWayOut::take();
     }
