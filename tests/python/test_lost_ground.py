@@ -145,8 +145,6 @@ except End:
 
 @needs_pyqt
 @pytest.mark.standalone
-# On Wayland about one run in six does not come back, for a reason that is not known yet.
-@pytest.mark.parametrize('desk', ['xcb'], indirect=True)
 @pytest.mark.parametrize('act', ['click 1', 'key space', 'slot'])
 def test_a_run_ends_with_an_exception_when_its_application_object_is_deleted(desk, act):
     script = desk.start(sys.executable, '-c', '''

@@ -2,12 +2,18 @@
 
 #include <QGuiApplication>
 
+#include <algorithm>
 #include <atomic>
+#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <fcntl.h>
+#include <filesystem>
+#include <fstream>
 #include <poll.h>
 #include <pthread.h>
+#include <string>
+#include <thread>
 #include <unistd.h>
 #include <xcb/xcb.h>
 
@@ -32,6 +38,31 @@ bool drawsOutsideTheProcess()
 {
     QString const name = QGuiApplication::platformName();
     return name == QLatin1String("xcb") || name.startsWith(QLatin1String("wayland"));
+}
+
+/// A thread of Qt's that reads for a Wayland display has been woken, and not slept since.
+bool isReaderAwake()
+{
+    std::error_code error;
+    std::filesystem::directory_iterator const threads("/proc/self/task", error);
+    return std::any_of(begin(threads), end(threads),
+                       [](std::filesystem::directory_entry const& thread)
+                       {
+                           std::string identity;
+                           std::string name;
+                           char state = 0;
+                           std::ifstream(thread.path() / "stat") >> identity >> name >> state;
+                           return name == "(WaylandEventThr)" && state != 'S';
+                       });
+}
+
+/// Qt ends the threads that read for a Wayland display with its application object. One that was woken to read, and is
+/// told to end before it does, never says that it will not: the next one to end waits for it for ever.
+void letReadersRest()
+{
+    auto const patience = std::chrono::steady_clock::now() + std::chrono::seconds(1);
+    while (isReaderAwake() && std::chrono::steady_clock::now() < patience)
+        std::this_thread::sleep_for(std::chrono::milliseconds(1));
 }
 
 /// Static objects of Qt's wait at the exit for threads that a forked process does not have.
@@ -75,6 +106,7 @@ bool QtDisplayWatch::watch()
     QObject::connect(application, &QObject::destroyed,
                      []
                      {
+                         letReadersRest();
                          watched = nullptr;
                          isOutside = false;
                          connection = -1;
