@@ -118,6 +118,8 @@ int Application::run(std::optional<ScriptCall> const& script, bool exit)
         _watch.emplace([this] { return _scriptRuns || _interpreter.isRunning(); }, [this] { stopScript(); });
     int const status = runLoop();
     _watch.reset();
+    if (!Kv::WsNative::getPlatform().hasDisplay())
+        return status;
     _signalTimer.stop();
     _recovery->discard();
     _window.saveLook(_settings);
@@ -135,7 +137,7 @@ int Application::runLoop()
     catch (Kv::ExBase const&)
     {
         _recovery->leave();
-        // The display is gone. What a script has come to before that counts.
+        // There is no display any more. What a script has come to before that counts.
         if (!_exitStatus)
             throw;
         return *_exitStatus;

@@ -9,10 +9,12 @@
 #include "packages/inBuildInfo.h"
 #include "wsNative.h"
 
+#include <QCoreApplication>
+
 #include <fcntl.h>
 #include <filesystem>
 #include <iostream>
-#include <optional>
+#include <memory>
 
 namespace
 {
@@ -50,16 +52,22 @@ int run(CommandLine const& line)
     applyTheme();
     // The streams of Python copy what they write to it to the end.
     ScriptOutput output;
-    std::optional<Application> application;
-    // The window goes while scripts can still hear of it.
-    Interpreter interpreter({[&application] { application.reset(); },
+    std::unique_ptr<Application> application;
+    // The window goes while scripts can still hear of it. Where a script has deleted the application object it has lost
+    // its screen already, and Qt cannot take the rest down.
+    Interpreter interpreter({[&application]
+                             {
+                                 if (!QCoreApplication::instance())
+                                     static_cast<void>(application.release());
+                                 application.reset();
+                             },
                              [&application]
                              {
                                  if (application)
                                      application->keepUnsaved();
                              }});
     // A script that has the application to itself finds it as it is for everybody.
-    application.emplace(interpreter, output, !line.exit);
+    application = std::make_unique<Application>(interpreter, output, !line.exit);
     for (std::string const& path : line.compositions)
         application->openComposition(path);
     int const status = application->run(line.script, line.exit);

@@ -80,20 +80,32 @@ tell(ui.showMessageBox, 'Next', ['.'])
     assert printed == ['Cannot go on - RuntimeError'] * runs + ['still y', refusal + ' - RuntimeError', 'atexit']
 
 
+LOSSES = {
+    'display': ('kill()', 'the display is gone'),
+    'application object': ('from PyQt6 import QtWidgets, sip; sip.delete(QtWidgets.QApplication.instance())',
+                           'the QApplication was destroyed'),
+    'application object, later': ('from PyQt6 import QtWidgets; QtWidgets.QApplication.instance().deleteLater()',
+                                  'the QApplication was destroyed'),
+}
+
+
+@needs_pyqt
 @pytest.mark.standalone
-def test_what_is_not_saved_in_the_application_is_on_the_disk_when_its_display_goes(display, tmp_path):
+@pytest.mark.parametrize('loss', LOSSES)
+def test_what_is_not_saved_in_the_application_is_on_the_disk_when_its_ground_goes(display, tmp_path, loss):
+    act, words = LOSSES[loss]
     shot, script = tmp_path / 'shot.vmcomposition', tmp_path / 'change.py'
     shot.write_text('<composition><node name="n" type="t"><value name="v" text="old"/></node></composition>')
     script.write_text('import os, signal, time\nfrom quorvane_velmora import ui' + KILL + '''
 shot, = ui.Workspace.getCompositions()
 for text in 'first', 'second':
     shot.setNodeValue('n', 'v', text)
-kill()
+%s
 print('goes on', flush=True)
-''')
+''' % act)
     done = subprocess.run([scripts.TREE / 'bin' / 'velmora', '--open', shot, script], capture_output=True, text=True, timeout=60,
                           env=scripts.environment(XDG_STATE_HOME=str(tmp_path / 'state'), **display))
-    assert (done.returncode, done.stdout) == (1, 'goes on\n') and 'the display is gone' in done.stderr
+    assert (done.returncode, done.stdout) == (1, 'goes on\n') and words in done.stderr
     kept, = tmp_path.glob('state/**/*.vmrecovery')
     assert 'second' in kept.read_text() and 'old' in shot.read_text()
 
@@ -145,7 +157,7 @@ except End:
 
 @needs_pyqt
 @pytest.mark.standalone
-@pytest.mark.parametrize('act', ['click 1', 'key space', 'slot'])
+@pytest.mark.parametrize('act', ['click 1', 'key space', 'slot', 'later'])
 def test_a_run_ends_with_an_exception_when_its_application_object_is_deleted(desk, act):
     script = desk.start(sys.executable, '-c', '''
 from PyQt6 import sip
@@ -163,6 +175,8 @@ dialog.addCallback('p', ui.EventType.ACTIVATE, lambda *_: sip.delete(application
 QTimer.singleShot(200, place)
 if sys.argv[1] == 'slot':
     QTimer.singleShot(300, lambda: sip.delete(application))
+elif sys.argv[1] == 'later':
+    QTimer.singleShot(300, application.deleteLater)
 tell(dialog.launch)
 print(dialog.getValue('a'), dialog.getValue('m'))
 application = QApplication([])
@@ -170,7 +184,7 @@ tell(ui.showMessageBox, 'Next', ['.'])
 ''', act)
     window = desk.wait_for_window('Ground')
     x, y = map(int, script.stdout.readline().split())
-    if act != 'slot':
+    if ' ' in act:
         desk.run('mousemove', window.left + x, window.top + y, *act.split())
     assert script.communicate()[0].splitlines() == ['Cannot go on - RuntimeError', 'kept y',
                                                     'Cannot show a window - RuntimeError', 'atexit']

@@ -1,7 +1,9 @@
 #include "loop/qtInputDrop.h"
 
-#include <QCoreApplication>
+#include "loop/qtWayOut.h"
+
 #include <QEvent>
+#include <QGuiApplication>
 
 namespace Kv
 {
@@ -54,6 +56,12 @@ bool standsAlone(QObject const& object)
 QtInputDrop::QtInputDrop(QWidget& window) : _window(&window)
 {
     QCoreApplication::instance()->installEventFilter(this);
+}
+
+void QtInputDrop::flush(QWidget& window)
+{
+    QtInputDrop const drop(window);
+    QtWayOut(0).run(&QGuiApplication::sync);
 }
 
 bool QtInputDrop::eventFilter(QObject* receiver, QEvent* event)

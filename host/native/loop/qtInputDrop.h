@@ -15,6 +15,10 @@ public:
     /// `window` is borrowed and may go first.
     explicit QtInputDrop(QWidget& window);
 
+    /// Has all that is pending handled, but what the user did to that window. Where the display or the application
+    /// object goes on the way, it ends there.
+    static void flush(QWidget& window);
+
     bool isFor(QWidget const& window) const { return _window == &window; }
 
     bool eventFilter(QObject* receiver, QEvent* event) override;

@@ -57,6 +57,9 @@ void runInApplication(QEventLoop& loop)
     QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::awake, &context, run);
     QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::aboutToBlock, &context, run);
     QCoreApplication::exec();
+    // Asked for in the loop, its deletion may come in the end of its own.
+    if (!application)
+        return;
     application->blockSignals(wasSilent);
     if (quits)
         QGuiApplication::setQuitOnLastWindowClosed(true);

@@ -25,9 +25,11 @@ bool isLeaving = false;
 /// begin.
 bool isWrecked = false;
 QtMessageHandler others = nullptr;
+/// That of the application object, also when that is gone.
+QThread* userInterface = nullptr;
 
-/// Where Qt's loop is one of GLib's, that keeps a list of what it was about to call. The loop around it would go on
-/// with that list; preparing a turn clears it.
+/// Where Qt's loop is one of GLib's, that keeps a list of what it was about to call, and goes on with it, as does the
+/// loop around it. Preparing a turn clears it.
 void forgetPendingOfGlib()
 {
     void* const glib = dlopen("libglib-2.0.so.0", RTLD_NOW | RTLD_NOLOAD);
@@ -38,11 +40,6 @@ void forgetPendingOfGlib()
     if (prepare)
         prepare(nullptr, &priority);
     dlclose(glib);
-}
-
-bool isOnUserInterface()
-{
-    return QCoreApplication::instance() && QThread::currentThread() == QCoreApplication::instance()->thread();
 }
 
 void hear(QtMsgType type, QMessageLogContext const& context, QString const& message)
@@ -57,13 +54,35 @@ void hear(QtMsgType type, QMessageLogContext const& context, QString const& mess
     {
         QtDisplayWatch::noteBroken();
         // A thread of Qt's that reads for the other one has no more to read. The loop sees it at its next tick.
-        if (!isOnUserInterface())
+        if (QThread::currentThread() != userInterface)
             pthread_exit(nullptr);
         QtWayOut::take();
     }
     isHearing = true;
     others(type, context, message);
     isHearing = false;
+}
+
+void listen()
+{
+    QtMessageHandler const other = qInstallMessageHandler(&hear);
+    if (other != &hear)
+        others = other;
+}
+
+void callLastAct()
+{
+    if (lastAct && !QtDisplayWatch::isForked())
+        std::exchange(lastAct, nullptr)();
+}
+
+/// Called by the application object as it goes.
+void endLoops()
+{
+    if (!innermost)
+        return;
+    callLastAct();
+    QCoreApplication::exit();
 }
 
 } // namespace
@@ -73,12 +92,16 @@ QtWayOut::QtWayOut(int loops)
       _depth(QtGuard::getInstance().getScriptHook().getDepth())
 {
     listen();
-    // What loops are in the middle of has to outlive them.
+    // What loops are in the middle of has to outlive them, and they may call nothing more. Where they are delivering
+    // posted events, the list of those forgets them next, but not how far they have come in it: a turn within theirs,
+    // which reaches nobody any more, ends at the beginning.
     QObject::connect(QCoreApplication::instance(), &QObject::destroyed, &_context,
                      [dispatcher = QAbstractEventDispatcher::instance()]
                      {
                          isWrecked = true;
                          dispatcher->setParent(nullptr);
+                         QCoreApplication::sendPostedEvents();
+                         forgetPendingOfGlib();
                      });
 }
 
@@ -87,11 +110,11 @@ QtWayOut::~QtWayOut()
     innermost = _outer;
 }
 
-void QtWayOut::listen()
+void QtWayOut::watch()
 {
-    QtMessageHandler const other = qInstallMessageHandler(&hear);
-    if (other != &hear)
-        others = other;
+    userInterface = QCoreApplication::instance()->thread();
+    listen();
+    qAddPostRoutine(&endLoops);
 }
 
 std::string QtWayOut::run(std::function<void()> const& loop)
@@ -114,8 +137,7 @@ void QtWayOut::take()
     std::string reason = findLoss();
     if (reason.empty())
         return;
-    if (lastAct && !QtDisplayWatch::isForked())
-        std::exchange(lastAct, nullptr)();
+    callLastAct();
     if (!innermost || QThread::currentThread()->loopLevel() > innermost->_level ||
         QtGuard::getInstance().getScriptHook().getDepth() != innermost->_depth)
         return;
@@ -125,7 +147,7 @@ void QtWayOut::take()
 
 std::string QtWayOut::findLoss()
 {
-    return isWrecked ? "the QApplication was destroyed while a dialog ran" : QtDisplayWatch::findLoss();
+    return isWrecked ? "the QApplication was destroyed while it ran" : QtDisplayWatch::findLoss();
 }
 
 void QtWayOut::setLastAct(std::function<void()> act)

@@ -29,8 +29,9 @@ public:
     /// Runs a function that runs a loop of Qt's. Gives the words for why the loop had to be left; empty where it ended.
     std::string run(std::function<void()> const& loop);
 
-    /// Hears from here on what Qt says before it ends the process.
-    static void listen();
+    /// For each new application object. Hears what Qt says before it ends the process, and ends the loops when that
+    /// object goes: they would turn for ever without it.
+    static void watch();
 
     /// The words for why no loop can run; empty where one can.
     static std::string findLoss();

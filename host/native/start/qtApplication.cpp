@@ -111,10 +111,10 @@ bool QtApplication::isOwn() const
 void QtApplication::requireLoop()
 {
     start();
-    if (!QCoreApplication::instance())
-        throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: " + _refusal);
     if (std::string const loss = QtWayOut::findLoss(); !loss.empty())
         throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: " + loss);
+    if (!QCoreApplication::instance())
+        throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: " + _refusal);
     if (QCoreApplication::instance()->thread() != QThread::currentThread())
         throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: this is not the thread of the user interface");
 }
@@ -140,7 +140,7 @@ void QtApplication::start()
     if (!_tried && !QCoreApplication::instance())
         makeOwn();
     if (QtDisplayWatch::watch())
-        QtWayOut::listen();
+        QtWayOut::watch();
 }
 
 void QtApplication::makeOwn()

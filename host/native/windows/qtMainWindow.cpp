@@ -50,11 +50,8 @@ void QtMainWindow::redraw()
 
 void QtMainWindow::flushInput()
 {
-    QWidget* const native = _content.getNative();
-    if (!native)
-        return;
-    QtInputDrop const drop(*native);
-    QGuiApplication::sync();
+    if (QWidget* const native = _content.getNative())
+        QtInputDrop::flush(*native);
 }
 
 void QtMainWindow::refuseInput()

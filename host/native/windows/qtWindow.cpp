@@ -314,11 +314,8 @@ void QtWindow::redraw()
 void QtWindow::flushInput()
 {
     QtSpareHandles::Turn const turn;
-    QWidget* const native = getNative();
-    if (!native)
-        return;
-    QtInputDrop const drop(*native);
-    QGuiApplication::sync();
+    if (QWidget* const native = getNative())
+        QtInputDrop::flush(*native);
 }
 
 QtWindowWidget* QtWindow::getNative() const
