@@ -347,6 +347,11 @@ FRAME = re.compile(r'(?P<library>[^(]*)\((?P<name>[^+)]*)\+?(?P<offset>0x[0-9a-f
 BETWEEN = re.compile(r'/(libshortMemory|libc|libstdc\+\+|libgcc_s|libm|ld-linux-x86-64)\.so')
 DESTRUCTOR = re.compile(r'D[012]Ev$')
 OURS = re.compile(r'/(libKV\w+\.so|velmora)$')
+# Words where a library cannot be loaded, and where the system or Qt does not recover from that, or from a start of Qt's
+# or from the making of one of its global objects.
+REFUSED = re.compile(r'(afterwards )?RuntimeError: (Cannot load the window system|Cannot start Qt|std::exception)')
+# The dynamic linker ends a process that it cannot give the variables of a thread.
+NO_THREAD_DATA = 'status 127'
 
 
 def read_traces(text):
@@ -388,6 +393,8 @@ def show_place(place):
 
 def find_offence(end, text):
     """What is wrong with the end of a life; None if it may end so."""
+    if end == NO_THREAD_DATA or REFUSED.match(end):
+        return None
     if end.startswith(('signal', 'status')):
         place = find_place(text)
         if place is None or OURS.search(place['library']):
@@ -395,6 +402,9 @@ def find_offence(end, text):
     elif end not in ('finished', 'MemoryError'):
         return end
     return None
+
+
+ROW = '%-32s %-5s %6s %12s %8s %9s %6s %6s'
 
 
 def tell(name, mode, lives):
@@ -408,8 +418,8 @@ def tell(name, mode, lives):
         if offence:
             offences.setdefault(offence, []).append(k)
     wrong = sum(map(len, offences.values()))
-    print('%-32s %-5s %6d %12d %9d %6d %6d' % (name, mode, len(lives), ends.count('MemoryError'),
-                                               ends.count('finished'), sum(died.values()), wrong))
+    print(ROW % (name, mode, len(lives), ends.count('MemoryError'), sum(bool(REFUSED.match(end)) for end in ends),
+                 ends.count('finished'), sum(died.values()), wrong))
     for place, count in died.most_common():
         print('    %5d x %s' % (count, place))
     for offence, calls in offences.items():
@@ -419,7 +429,7 @@ def tell(name, mode, lives):
 
 
 def run_all(names):
-    print('%-32s %-5s %6s %12s %9s %6s %6s' % ('', 'fails', 'calls', 'MemoryError', 'finished', 'died', 'wrong'))
+    print(ROW % ('', 'fails', 'calls', 'MemoryError', 'refused', 'finished', 'died', 'wrong'))
     return sum(tell(name, mode, run(name, mode, os.cpu_count())) for name in names or SCENARIOS for mode in MODES)
 
 

@@ -22,3 +22,32 @@ def test_a_life_without_memory_ends_well_and_so_does_the_next(name, mode, count)
     lives = short_memory.run(name, mode, 1, count)
     assert len(lives) >= count // 2
     assert not [(k, offence) for k, end, text in lives if (offence := short_memory.find_offence(end, text))]
+
+
+def test_what_a_process_may_not_have_is_an_exception_and_the_next_dialog_works(display):
+    """Qt would crash with too little, or wait for threads that did not start."""
+    assert scripts.run_script('''
+import resource, sys
+from quorvane_velmora import ui
+from quorvane_velmora.libs import libKVpyextTesting as door
+with open('/proc/self/statm') as file:
+    used = int(file.read().split()[0]) * resource.getpagesize()
+
+def show():
+    dialog = ui.createDialog('Awards', ui.makeXmlFromWidgetList([('TextField', 'Show', 'Show', 'Reel')], ['OK']), 400, 300)
+    door.open(lambda: door.click(next(n for n, each in enumerate(door.look()) if each.name == 'CloseButton_OK')))
+    try:
+        return dialog.launch()
+    finally:
+        door.close()
+
+errors = set()
+for megabytes in range(0, 800, 40):
+    resource.setrlimit(resource.RLIMIT_AS, (used + (megabytes << 20), resource.RLIM_INFINITY))
+    try:
+        assert show() == 'CloseButton_OK'
+    except (MemoryError, RuntimeError) as error:
+        errors.add(type(error).__name__)
+    resource.setrlimit(resource.RLIMIT_AS, (resource.RLIM_INFINITY, resource.RLIM_INFINITY))
+print(*sorted(errors), show())
+''', **display) == 'MemoryError RuntimeError CloseButton_OK\n'

@@ -13,6 +13,9 @@
 
 #include <array>
 #include <clocale>
+#include <cstddef>
+#include <new>
+#include <sys/mman.h>
 #include <unistd.h>
 
 namespace Kv
@@ -62,6 +65,20 @@ public:
     }
 };
 
+/// More of the address space than Qt takes as it starts, or for a window: its threads have much set aside. It crashes,
+/// or waits for ever, where it does not get all.
+void requireMemory()
+{
+    constexpr std::size_t size = std::size_t(256) << 20;
+    void* const block = mmap(nullptr, size, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+    if (block == MAP_FAILED)
+        throw std::bad_alloc();
+    munmap(block, size);
+}
+
+/// What ends Qt's own start leaves an application object that is none, and that nobody can take away.
+bool isStarting = false;
+
 /// Never destroyed: the last widgets go after everything that could destroy it. The arguments live as long.
 QCoreApplication* makeApplication(QString const& platform)
 {
@@ -74,7 +91,9 @@ QCoreApplication* makeApplication(QString const& platform)
     arguments = {program.data(), option.data(), value.data(), nullptr};
     static int count = 0;
     count = static_cast<int>(arguments.size()) - 1;
+    isStarting = true;
     auto* const application = new GuardedApplication(count, arguments.data());
+    isStarting = false;
     QApplication::setQuitOnLastWindowClosed(false);
     QApplication::setWindowIcon(getWindowIcon());
     return application;
@@ -133,10 +152,14 @@ void QtApplication::requireWindows()
         throw ExBase(__FILE__, __LINE__, "Cannot show a window: " + loss);
     if (application->thread() != QThread::currentThread())
         throw ExBase(__FILE__, __LINE__, "Cannot show a window: this is not the thread of the user interface");
+    requireMemory();
 }
 
 void QtApplication::start()
 {
+    if (isStarting)
+        throw ExBase(__FILE__, __LINE__,
+                     "Cannot start Qt: it was short of memory when it started in this process; start another one");
     if (!_tried && !QCoreApplication::instance())
         makeOwn();
     if (QtDisplayWatch::watch())
@@ -151,6 +174,7 @@ void QtApplication::makeOwn()
         _refusal = "this is not the main thread, and there is no QApplication; launch dialogs from the main thread";
         return;
     }
+    requireMemory();
     _tried = true;
     QtDisplayProbe probe;
     DisplayChoice choice = probe.choose();

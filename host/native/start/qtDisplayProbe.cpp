@@ -48,7 +48,9 @@ QStringList pluginFolders()
     QString const own = environment("QT_QPA_PLATFORM_PLUGIN_PATH");
     if (!own.isEmpty())
         folders << own;
-    for (QString const& path : QCoreApplication::libraryPaths())
+    // A copy of the list would be taken without asking whether there is memory for it.
+    QStringList const paths = QCoreApplication::libraryPaths();
+    for (QString const& path : paths)
         folders << path + QStringLiteral("/platforms");
     return folders;
 }
