@@ -31,6 +31,11 @@ int getLoopLevel()
     return QThread::currentThread()->loopLevel();
 }
 
+void act(std::function<void()> const& action)
+{
+    WsNative::getPlatform().callForScript(action);
+}
+
 QWidget& requireDialog()
 {
     QWidget* const dialog = QtStage::findDialog();
@@ -129,7 +134,7 @@ std::string InputDoor::getObstacle(std::size_t widget)
 
 void InputDoor::click(std::size_t widget)
 {
-    QtHand::click(_parts->stage.get(widget));
+    act([&] { QtHand::click(_parts->stage.get(widget)); });
 }
 
 std::vector<std::string> InputDoor::getEntries(std::size_t widget) const
@@ -149,19 +154,21 @@ void InputDoor::pick(std::size_t widget, int entry, bool isMore)
 {
     QWidget& native = _parts->stage.get(widget);
     if (auto* const menu = qobject_cast<QComboBox*>(&native))
-        QtHand::pick(*menu, entry);
+        act([&] { QtHand::pick(*menu, entry); });
     else if (auto* const list = qobject_cast<QAbstractItemView*>(&native))
-        QtHand::pick(*list, entry, isMore);
+        act([&] { QtHand::pick(*list, entry, isMore); });
 }
 
 void InputDoor::type(std::string const& text)
 {
-    QtHand::type(requireDialog(), QString::fromStdString(text));
+    act([&] { QtHand::type(requireDialog(), QString::fromStdString(text)); });
 }
 
 bool InputDoor::press(std::string const& key)
 {
-    return QtHand::press(requireDialog(), QString::fromStdString(key));
+    bool isKnown = false;
+    act([&] { isKnown = QtHand::press(requireDialog(), QString::fromStdString(key)); });
+    return isKnown;
 }
 
 bool InputDoor::takePicture(std::string const& path) const

@@ -224,6 +224,12 @@ void QtPlatform::callScript(std::function<void()> const& call)
     call();
 }
 
+void QtPlatform::callForScript(std::function<void()> const& call)
+{
+    QtSpareHandles::Turn const turn;
+    call();
+}
+
 void QtPlatform::refuseLoop()
 {
     // A script that asks until it gets an answer would go on for ever, with no window to end it by.

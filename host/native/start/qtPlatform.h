@@ -35,6 +35,7 @@ public:
     void runLoop(bool const volatile* until, bool volatile* end) override;
     int runApplication(std::function<void()> lastAct) override;
     void callScript(std::function<void()> const& call) override;
+    void callForScript(std::function<void()> const& call) override;
     void endLoop() override;
     void interruptLoop() override;
     void closeLoops() override;
