@@ -122,13 +122,25 @@ PiUnsavedComposition FwComposition::getUnsaved() const
 
 bool FwComposition::isChangedOnDisk() const
 {
+    try
+    {
+        return hasOtherVersion();
+    }
+    catch (ExBase const&)
+    {
+        return false;
+    }
+}
+
+bool FwComposition::hasOtherVersion() const
+{
     OsFile::Version const version = OsFile(_path).getVersion();
     return version != OsFile::Version{} && version != _version;
 }
 
 void FwComposition::save()
 {
-    if (isChangedOnDisk())
+    if (hasOtherVersion())
         throw ExBase(__FILE__, __LINE__,
                      "Cannot save " + LiStringUtil::getPrintablePath(_path.toString()) +
                          ": the file has been changed on disk since it was opened");
@@ -137,9 +149,7 @@ void FwComposition::save()
 
 void FwComposition::saveOver()
 {
-    OsFile const file(_path);
-    file.replace(FwCompositionWriter::write(*_graph));
-    _version = file.getVersion();
+    _version = OsFile(_path).replace(FwCompositionWriter::write(*_graph));
     setModified(false);
 }
 

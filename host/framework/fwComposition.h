@@ -74,6 +74,9 @@ private:
                                            std::vector<FwNode::Description> nodes);
     static Keeper keepApart(RCStrongPtr<FwComposition> const& composition);
 
+    /// Throws `ExBase` where the system cannot tell.
+    bool hasOtherVersion() const;
+
     void setModified(bool isModified);
 
     OsFilePath _path;

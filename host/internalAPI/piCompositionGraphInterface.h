@@ -42,7 +42,8 @@ public:
 
     virtual PiUnsavedComposition getUnsaved() const = 0;
 
-    /// True if somebody else has written the file since it was opened or saved.
+    /// True if somebody else has written the file since it was opened or saved; false also where the system cannot
+    /// tell.
     virtual bool isChangedOnDisk() const = 0;
 
     /// Writes the file as a whole or not at all. Throws `ExBase`, naming the path, where it cannot be written, and

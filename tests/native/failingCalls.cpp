@@ -1,17 +1,21 @@
-// A library that is loaded ahead of all others: has the memory run out at a chosen call, and says where the process
-// dies of that. It reaches the interpreter that it is loaded into, and nothing of the project.
-
-#include <Python.h>
+// A library that is loaded ahead of all others: has a chosen call for memory or to the disk fail, and says where the
+// process dies of that. It reaches the interpreter that it is loaded into, and nothing of the project.
 
 #include <array>
 #include <cerrno>
 #include <csignal>
+#include <cstdarg>
 #include <cstddef>
 #include <cstring>
 #include <dlfcn.h>
 #include <execinfo.h>
+#include <fcntl.h>
+#include <sys/stat.h>
 #include <unistd.h>
 #include <unwind.h>
+
+// After the system's headers, which it would have give other names to what is named here.
+#include <Python.h>
 
 // NOLINTBEGIN(bugprone-reserved-identifier,cert-dcl37-c,cert-dcl51-cpp,readability-inconsistent-declaration-parameter-name)
 extern "C" void* __libc_malloc(std::size_t size);
@@ -36,6 +40,8 @@ struct Plan
     long first = 0;
     long last = 0;
     bool isOursAlone = false;
+    /// Which calls count: 0 for those for memory, else those to the disk, which give that error.
+    int diskError = 0;
     long calls = 0;
     long failures = 0;
     Trace firstFailure{};
@@ -64,7 +70,7 @@ bool isOurs(char const* library)
 /// Those that others ask for memory through.
 bool isBetween(char const* library)
 {
-    return contains(library, "shortMemory") || contains(library, "/libstdc++") || contains(library, "/libc.so");
+    return contains(library, "failingCalls") || contains(library, "/libstdc++") || contains(library, "/libc.so");
 }
 
 /// True if the project's own code asks for the memory.
@@ -78,9 +84,9 @@ bool isAskedByUs()
     return false;
 }
 
-bool isToFail()
+bool isToFail(bool isToDisk)
 {
-    if (!isArmed || isAsking)
+    if (!isArmed || isAsking || isToDisk != (plan.diskError != 0))
         return false;
     isAsking = true;
     bool isFailing = false;
@@ -92,6 +98,14 @@ bool isToFail()
     if (isFailing && ++plan.failures == 1)
         plan.firstFailure.count = backtrace(plan.firstFailure.frames.data(), maxFrames);
     isAsking = false;
+    return isFailing;
+}
+
+bool isDiskToFail()
+{
+    bool const isFailing = isToFail(true);
+    if (isFailing)
+        errno = plan.diskError;
     return isFailing;
 }
 
@@ -151,22 +165,22 @@ void watch()
 
 KV_SHOWN void* malloc(std::size_t size)
 {
-    return isToFail() ? fail() : __libc_malloc(size);
+    return isToFail(false) ? fail() : __libc_malloc(size);
 }
 
 KV_SHOWN void* calloc(std::size_t count, std::size_t size)
 {
-    return isToFail() ? fail() : __libc_calloc(count, size);
+    return isToFail(false) ? fail() : __libc_calloc(count, size);
 }
 
 KV_SHOWN void* realloc(void* block, std::size_t size)
 {
-    return isToFail() ? fail() : __libc_realloc(block, size);
+    return isToFail(false) ? fail() : __libc_realloc(block, size);
 }
 
 KV_SHOWN void* memalign(std::size_t alignment, std::size_t size)
 {
-    return isToFail() ? fail() : __libc_memalign(alignment, size);
+    return isToFail(false) ? fail() : __libc_memalign(alignment, size);
 }
 
 KV_SHOWN void* aligned_alloc(std::size_t alignment, std::size_t size)
@@ -182,6 +196,35 @@ KV_SHOWN int posix_memalign(void** block, std::size_t alignment, std::size_t siz
     return made ? 0 : ENOMEM;
 }
 
+#define KV_DISK_CALL(type, name, parameters, arguments)                                                                \
+    KV_SHOWN type name parameters                                                                                      \
+    {                                                                                                                  \
+        static auto const real = reinterpret_cast<type(*) parameters>(dlsym(RTLD_NEXT, #name));                        \
+        return isDiskToFail() ? -1 : real arguments;                                                                   \
+    }
+
+KV_DISK_CALL(ssize_t, read, (int file, void* buffer, std::size_t size), (file, buffer, size))
+KV_DISK_CALL(ssize_t, write, (int file, void const* buffer, std::size_t size), (file, buffer, size))
+KV_DISK_CALL(int, stat, (char const* path, struct stat* status), (path, status))
+KV_DISK_CALL(int, lstat, (char const* path, struct stat* status), (path, status))
+KV_DISK_CALL(int, fstat, (int file, struct stat* status), (file, status))
+KV_DISK_CALL(int, faccessat, (int folder, char const* path, int mode, int flags), (folder, path, mode, flags))
+KV_DISK_CALL(ssize_t, readlink, (char const* path, char* buffer, std::size_t size), (path, buffer, size))
+KV_DISK_CALL(int, fchown, (int file, uid_t owner, gid_t group), (file, owner, group))
+KV_DISK_CALL(int, fchmod, (int file, mode_t mode), (file, mode))
+KV_DISK_CALL(int, fsync, (int file), (file))
+KV_DISK_CALL(int, rename, (char const* path, char const* target), (path, target))
+
+KV_SHOWN int open(char const* path, int flags, ...)
+{
+    static auto const real = reinterpret_cast<int (*)(char const*, int, ...)>(dlsym(RTLD_NEXT, "open"));
+    va_list rest;
+    va_start(rest, flags);
+    mode_t const mode = (flags & O_CREAT) != 0 ? va_arg(rest, mode_t) : 0;
+    va_end(rest);
+    return isDiskToFail() ? -1 : real(path, flags, mode);
+}
+
 /// Where an exception may not pass a function, the process ends in here.
 KV_SHOWN _Unwind_Reason_Code __gxx_personality_v0(int version, _Unwind_Action actions, _Unwind_Exception_Class kind,
                                                   _Unwind_Exception* exception, _Unwind_Context* context)
@@ -195,9 +238,10 @@ KV_SHOWN _Unwind_Reason_Code __gxx_personality_v0(int version, _Unwind_Action ac
     return code;
 }
 
-/// Calls `life`, in which the calls for memory from `first` to `last` fail, counted from 1. With `isOursAlone` only the
-/// calls of the project's own code count. A signal that ends the process is written down in `file`.
-KV_SHOWN PyObject* runShort(PyObject* life, long first, long last, int isOursAlone, int file)
+/// Calls `life`, in which the calls from `first` to `last` fail, counted from 1: those for memory where `diskError` is
+/// 0, else those to the disk. With `isOursAlone` only the calls of the project's own code count. A signal that ends the
+/// process is written down in `file`.
+KV_SHOWN PyObject* runShort(PyObject* life, long first, long last, int isOursAlone, int diskError, int file)
 {
     reportFile = file;
     watch();
@@ -205,6 +249,7 @@ KV_SHOWN PyObject* runShort(PyObject* life, long first, long last, int isOursAlo
     plan.first = first;
     plan.last = last;
     plan.isOursAlone = isOursAlone != 0;
+    plan.diskError = diskError;
     isArmed = true;
     PyObject* const result = PyObject_CallNoArgs(life);
     isArmed = false;

@@ -1,9 +1,11 @@
-"""The life of a dialog, or of a composition, in which memory runs out: at the first call for it, at the second, and so
-on. Each such life has a process of its own, a copy of one that waits before it. With `./run nomemory` a table of them all."""
+"""The life of a dialog, or of a composition, in which a call for memory or to the disk fails: the first one, the second,
+and so on. Each such life has a process of its own, a copy of one that waits before it. With `./run failures` a table of
+them all."""
 
 import collections
 import concurrent.futures
 import ctypes
+import errno
 import gc
 import json
 import os
@@ -22,7 +24,7 @@ if os.path.basename(os.readlink('/proc/self/exe')) == 'velmora':
     from PyQt6.QtWidgets import QApplication
 
 TREE = pathlib.Path(ui.__file__).parents[5]
-LIBRARY = TREE / 'tests' / 'libshortMemory.so'
+LIBRARY = TREE / 'tests' / 'libfailingCalls.so'
 FORM = [('TextField', 'Show', 'Show', 'Reel'), ('ToggleButton', 'Win', 'Do you win ?', False),
         ('Menu', 'Prize', 'Prize', (['Gold', 'Silver', 'Bronze'], 1)), ('PushButton', 'Think', 'Think'),
         ('Label', 'Words', 'Words', 'Good luck')]
@@ -162,10 +164,12 @@ class Composition:
         self.old = COMPOSITION.read_text()
         self.new = self.old.replace('text="4"', 'text="%s"' % self.SIZE)
 
-    def prepare(self):
+    def prepare(self, name='shot.vmcomposition'):
         self.shot = None
-        self.path = self.folder / 'shot.vmcomposition'
-        self.path.write_text(self.old)
+        self.file, self.path = self.folder / name, self.folder / ('link to ' + name)
+        self.file.write_text(self.old)
+        self.path.unlink(missing_ok=True)
+        self.path.symlink_to(self.file)
 
     def use(self):
         before = self.shot.getNodes(), self.shot.getNodeValues('Blur'), self.shot.getNodeInputs('Output')
@@ -179,17 +183,23 @@ class Composition:
 
     def judge(self, seen):
         require(seen == ((['Plate', 'Blur', 'Output'], {'size': '4'}, {'source': 'Blur'}), {'size': self.SIZE}), seen)
-        require(self.path.read_text() == self.new, 'not saved')
+        require(self.file.read_text() == self.new, 'not saved')
+
+    def take_again(self):
+        return graph.readComposition(str(self.path))
 
     def look_back(self):
-        require(self.path.read_text() in (self.old, self.new), 'the file is neither the old nor the new one')
+        require(self.path.is_symlink(), 'the link has been replaced')
+        require(self.file.read_text() in (self.old, self.new), 'the file is neither the old nor the new one')
         require(not list(self.folder.glob('.*')), os.listdir(self.folder))
         if self.shot is None:
             return
+        if 'read-only' in repr(self.shot):
+            self.shot = self.take_again()
         (nodes, before, inputs), after = self.use()
         require(nodes == ['Plate', 'Blur', 'Output'] and inputs == {'source': 'Blur'}, (nodes, inputs))
         require(before['size'] in ('4', self.SIZE) and after == {'size': self.SIZE}, (before, after))
-        require(self.path.read_text() == self.new, 'not saved')
+        require(self.file.read_text() == self.new, 'not saved')
 
     def tidy(self):
         shutil.rmtree(self.folder)
@@ -199,16 +209,18 @@ class Workspace(Composition):
     """The composition is opened in the application between that."""
 
     def prepare(self):
-        super().prepare()
-        self.path = self.folder / ('shot%d.vmcomposition' % ui.Workspace.getNbCompositions())
-        self.path.write_text(self.old)
+        super().prepare('shot%d.vmcomposition' % ui.Workspace.getNbCompositions())
 
     def use(self):
         ui.Workspace.openComposition(self.shot)
         seen = super().use()
         opened = [each.getPath() for each in ui.Workspace.getCompositions()]
-        require(opened.count(str(self.path)) == 1 and ui.Workspace.getCurrentComposition() == self.shot, opened)
+        require(opened.count(str(self.file)) == 1 and ui.Workspace.getCurrentComposition() == self.shot, opened)
         return seen
+
+    def take_again(self):
+        opened = [each for each in ui.Workspace.getCompositions() if each.getPath() == str(self.file)]
+        return opened[0] if opened else super().take_again()
 
     def look_back(self):
         super().look_back()
@@ -217,32 +229,35 @@ class Workspace(Composition):
 
 
 class Scenario:
-    def __init__(self, what, inside=False, first=False):
+    def __init__(self, what, inside=False, first=False, saves=False):
         self.what = what
         self.inside = inside
         # The first life of its process, in which all else is loaded.
         self.first = first
+        self.modes = MODES if saves else [mode for mode in MODES if mode not in DISK_ERRORS]
 
 
+# Which calls fail: the one for memory, that and all later ones, the one among those of the project's own code; of the
+# latter's calls to the disk the one, and from that on all, as with a disk that is full.
+MODES = 'one', 'all', 'ours', 'disk', 'full'
+DISK_ERRORS = {'disk': errno.EIO, 'full': errno.ENOSPC}
 SCENARIOS = {
     'dialog, unseen': Scenario(Tree),
     'dialog, unseen, the first': Scenario(Tree, first=True),
     'dialog, in a window': Scenario(Window),
     'dialog, in a window, the first': Scenario(Window, first=True),
     'dialog, floating': Scenario(Window, inside=True),
-    'composition': Scenario(Composition),
-    'composition, in the application': Scenario(Workspace, inside=True),
+    'composition': Scenario(Composition, saves=True),
+    'composition, in the application': Scenario(Workspace, inside=True, saves=True),
 }
 
-# Which calls fail: the one, that and all later ones, the one among those of the project's own code.
-MODES = ('one', 'all', 'ours')
 # A life takes a fraction of a second.
 SECONDS = 30
 
 
 def load():
     library = ctypes.PyDLL(str(LIBRARY))
-    library.runShort.argtypes = [ctypes.py_object, ctypes.c_long, ctypes.c_long, ctypes.c_int, ctypes.c_int]
+    library.runShort.argtypes = [ctypes.py_object, ctypes.c_long, ctypes.c_long, *3 * [ctypes.c_int]]
     library.runShort.restype = ctypes.py_object
     library.getCalls.restype = library.getFailures.restype = ctypes.c_long
     return library
@@ -253,8 +268,8 @@ def run_one(library, life, mode, k, file):
     seen = None
     life.prepare()
     try:
-        last = 0 if k == 0 else sys.maxsize if mode == 'all' else k
-        seen = library.runShort(life.live, k, last, mode == 'ours', file)
+        last = 0 if k == 0 else sys.maxsize if mode in ('all', 'full') else k
+        seen = library.runShort(life.live, k, last, mode not in ('one', 'all'), DISK_ERRORS.get(mode, 0), file)
         end = 'finished'
     except MemoryError:
         end = 'MemoryError'
@@ -344,12 +359,14 @@ def run(name, mode, parts, lives=sys.maxsize):
 
 FRAME = re.compile(r'(?P<library>[^(]*)\((?P<name>[^+)]*)\+?(?P<offset>0x[0-9a-f]+)?\)')
 # Those through which a process dies, or asks for memory, for somebody else.
-BETWEEN = re.compile(r'/(libshortMemory|libc|libstdc\+\+|libgcc_s|libm|ld-linux-x86-64)\.so')
+BETWEEN = re.compile(r'/(libfailingCalls|libc|libstdc\+\+|libgcc_s|libm|ld-linux-x86-64)\.so')
 DESTRUCTOR = re.compile(r'D[012]Ev$')
 OURS = re.compile(r'/(libKV\w+\.so|velmora)$')
 # Words where a library cannot be loaded, and where the system or Qt does not recover from that, or from a start of Qt's
 # or from the making of one of its global objects.
 REFUSED = re.compile(r'(afterwards )?RuntimeError: (Cannot load the window system|Cannot start Qt|std::exception)')
+# Words where the disk fails; the last ones where it tells at first that a composition can be written, and then does not.
+WORDS = re.compile(r"\w+Error: (Cannot |Composition '.*' cannot |The composition '.*' is read-only|Null pointer of type )")
 # The dynamic linker ends a process that it cannot give the variables of a thread.
 NO_THREAD_DATA = 'status 127'
 
@@ -391,17 +408,20 @@ def show_place(place):
     return '%s: %s' % (os.path.basename(place['library']), name.strip() or place['offset'])
 
 
-def find_offence(end, text):
+def find_offence(mode, end, text):
     """What is wrong with the end of a life; None if it may end so."""
-    if end == NO_THREAD_DATA or REFUSED.match(end):
+    if end == 'finished':
+        return None
+    if mode in DISK_ERRORS:
+        return None if WORDS.match(end) else end
+    if end in ('MemoryError', NO_THREAD_DATA) or REFUSED.match(end):
         return None
     if end.startswith(('signal', 'status')):
         place = find_place(text)
         if place is None or OURS.search(place['library']):
             return '%s in %s' % (end, show_place(place))
-    elif end not in ('finished', 'MemoryError'):
-        return end
-    return None
+        return None
+    return end
 
 
 ROW = '%-32s %-5s %6s %12s %8s %9s %6s %6s'
@@ -414,11 +434,12 @@ def tell(name, mode, lives):
                                for _, end, text in lives if end.startswith(('signal', 'status')))
     offences = {}
     for k, end, text in lives:
-        offence = find_offence(end, text)
+        offence = find_offence(mode, end, text)
         if offence:
             offences.setdefault(offence, []).append(k)
     wrong = sum(map(len, offences.values()))
-    print(ROW % (name, mode, len(lives), ends.count('MemoryError'), sum(bool(REFUSED.match(end)) for end in ends),
+    refused = sum(bool(REFUSED.match(end) or WORDS.match(end)) for end in ends)
+    print(ROW % (name, mode, len(lives), ends.count('MemoryError'), refused,
                  ends.count('finished'), sum(died.values()), wrong))
     for place, count in died.most_common():
         print('    %5d x %s' % (count, place))
@@ -430,7 +451,8 @@ def tell(name, mode, lives):
 
 def run_all(names):
     print(ROW % ('', 'fails', 'calls', 'MemoryError', 'refused', 'finished', 'died', 'wrong'))
-    return sum(tell(name, mode, run(name, mode, os.cpu_count())) for name in names or SCENARIOS for mode in MODES)
+    return sum(tell(name, mode, run(name, mode, os.cpu_count()))
+               for name in names or SCENARIOS for mode in SCENARIOS[name].modes)
 
 
 if __name__ == '__main__':

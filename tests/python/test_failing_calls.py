@@ -1,10 +1,10 @@
-"""Wherever memory runs out, a call ends with an exception or finishes, what is there stays whole, and the next one works.
-Some of the places; `./run nomemory` goes through all of them."""
+"""Wherever memory runs out or the disk fails, a call ends with an exception or finishes, what is there stays whole, and
+the next one works. Some of the places; `./run failures` goes through all of them."""
 
 import pytest
 
 import scripts
-import short_memory
+import failing_calls
 
 pytestmark = pytest.mark.standalone
 
@@ -12,16 +12,17 @@ pytestmark = pytest.mark.standalone
 LIVES = [('dialog, unseen', 'one', 50), ('dialog, unseen', 'all', 25), ('dialog, unseen', 'ours', 50),
          ('dialog, unseen, the first', 'ours', 8), ('dialog, in a window', 'one', 10),
          ('dialog, in a window', 'ours', 50), ('dialog, floating', 'ours', 25), ('composition', 'one', 50),
-         ('composition', 'all', 25), ('composition, in the application', 'ours', 50)]
+         ('composition', 'all', 25), ('composition', 'disk', 50), ('composition', 'full', 50),
+         ('composition, in the application', 'ours', 50), ('composition, in the application', 'disk', 50)]
 
 
 @pytest.mark.parametrize(
-    'name, mode, count', [pytest.param(*each, marks=scripts.needs_pyqt if short_memory.SCENARIOS[each[0]].inside else ())
+    'name, mode, count', [pytest.param(*each, marks=scripts.needs_pyqt if failing_calls.SCENARIOS[each[0]].inside else ())
                           for each in LIVES])
-def test_a_life_without_memory_ends_well_and_so_does_the_next(name, mode, count):
-    lives = short_memory.run(name, mode, 1, count)
+def test_a_life_in_which_calls_fail_ends_well_and_so_does_the_next(name, mode, count):
+    lives = failing_calls.run(name, mode, 1, count)
     assert len(lives) >= count // 2
-    assert not [(k, offence) for k, end, text in lives if (offence := short_memory.find_offence(end, text))]
+    assert not [(k, offence) for k, end, text in lives if (offence := failing_calls.find_offence(mode, end, text))]
 
 
 def test_what_a_process_may_not_have_is_an_exception_and_the_next_dialog_works(display):

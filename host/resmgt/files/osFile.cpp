@@ -38,13 +38,26 @@ std::string getSystemWords()
     return std::generic_category().message(errno);
 }
 
-/// Nothing where the path leads to nothing.
+/// Nothing with `errno` where the path leads to nothing, or that cannot be told.
 std::optional<struct stat> findStatus(OsFilePath const& path)
 {
     struct stat status = {};
     if (stat(path.getChars(), &status) == 0)
         return status;
     return std::nullopt;
+}
+
+/// True for an `errno` that says so.
+bool isNothingThere(int error)
+{
+    return error == ENOENT || error == ENOTDIR;
+}
+
+OsFile::Version toVersion(struct stat const& status)
+{
+    // Not the number of the device, which can be another one when the same disk is mounted the next time.
+    return {static_cast<long long>(status.st_ino), static_cast<long long>(status.st_size),
+            static_cast<long long>(status.st_mtim.tv_sec), static_cast<long long>(status.st_mtim.tv_nsec)};
 }
 
 bool canBeWritten(OsFilePath const& path, struct stat const& status)
@@ -124,32 +137,42 @@ std::string OsFile::read(std::uint64_t maxSize) const
 OsFile::Version OsFile::getVersion() const
 {
     std::optional<struct stat> const status = findStatus(_path);
-    if (!status || !S_ISREG(status->st_mode))
-        return {};
-    // Not the number of the device, which can be another one when the same disk is mounted the next time.
-    return {static_cast<long long>(status->st_ino), static_cast<long long>(status->st_size),
-            static_cast<long long>(status->st_mtim.tv_sec), static_cast<long long>(status->st_mtim.tv_nsec)};
+    if (!status && !isNothingThere(errno))
+        fail("read", _path, getSystemWords());
+    return status && S_ISREG(status->st_mode) ? toVersion(*status) : Version{};
 }
 
 bool OsFile::isWritable() const
 {
-    OsFilePath const target = _path.getCanonical();
-    return !findObstacle(target, findStatus(target));
+    try
+    {
+        OsFilePath const target = _path.getCanonical();
+        return !findObstacle(target, findStatus(target));
+    }
+    catch (ExBase const&)
+    {
+        return false;
+    }
 }
 
-void OsFile::replace(std::string const& content) const
+OsFile::Version OsFile::replace(std::string const& content) const
 {
     OsFilePath const target = _path.getCanonical();
     auto const old = findStatus(target);
+    int const reason = errno;
     if (auto const obstacle = findObstacle(target, old))
         fail("write", target, *obstacle);
+    if (!old && !isNothingThere(reason))
+        fail("write", target, std::generic_category().message(reason));
     try
     {
         OsTemporaryFile file(target.getFolder());
         file.write(content);
         if (old)
             file.takeOwnerAndPermissions(*old);
+        Version const version = toVersion(file.sync());
         file.moveTo(target);
+        return version;
     }
     catch (std::system_error const& error)
     {
@@ -166,8 +189,11 @@ bool OsFileDescriptor::isFileAt(std::string const& path) const
 {
     struct stat own = {};
     struct stat found = {};
-    return ::fstat(_descriptor, &own) == 0 && ::lstat(path.c_str(), &found) == 0 && own.st_dev == found.st_dev &&
-           own.st_ino == found.st_ino;
+    if (::fstat(_descriptor, &own) == 0 && ::lstat(path.c_str(), &found) == 0)
+        return own.st_dev == found.st_dev && own.st_ino == found.st_ino;
+    if (isNothingThere(errno))
+        return false;
+    throw std::system_error(errno, std::generic_category());
 }
 
 bool OsFsUtils::fileExists(OsFilePath const& path)

@@ -49,7 +49,7 @@ public:
     /// Tells whether a file has been written or replaced: is another one then.
     using Version = std::array<long long, 4>;
 
-    /// All zero where there is no regular file. Needs no memory.
+    /// All zero where there is no regular file. Throws `ExBase`, naming the path, where the system cannot tell.
     Version getVersion() const;
 
     /// True if `replace` would find what it needs: a regular file that can be written, or none, in a folder that can be
@@ -58,9 +58,9 @@ public:
 
     /// Makes `content` the whole content of the file, at once or not at all: another process sees the old file or the
     /// new one, and so does whoever comes after a failure. Symbolic links are followed, and a file that is there keeps
-    /// its permissions and, where the system allows it, its owner. Throws `ExBase`, naming the path, where it cannot be
-    /// done.
-    void replace(std::string const& content) const;
+    /// its permissions and, where the system allows it, its owner. Gives the file's version. Throws `ExBase`, naming
+    /// the path, where it cannot be done.
+    Version replace(std::string const& content) const;
 
 private:
     OsFilePath _path;
@@ -91,7 +91,8 @@ public:
     /// False with `errno` where that is refused; it is `EWOULDBLOCK` where another descriptor has the lock.
     bool lock() const;
 
-    /// True if the path leads to the file of this descriptor, and not to one that has come into its place.
+    /// True if the path leads to the file of this descriptor, and not to one that has come into its place. Throws
+    /// `std::system_error` where the system cannot tell.
     bool isFileAt(std::string const& path) const;
 
 private:

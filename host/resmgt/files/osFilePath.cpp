@@ -38,11 +38,16 @@ fs::path getWorkingFolder(fs::path const& path)
     return folder;
 }
 
-/// Nothing where `path` is no link.
+/// Nothing where `path` is no link, or is nothing that could be reached.
 fs::path readLink(fs::path const& path)
 {
     std::error_code error;
-    return fs::read_symlink(path, error);
+    fs::path target = fs::read_symlink(path, error);
+    // A link that were taken for a file would be replaced.
+    if (error == std::errc::io_error || error == std::errc::not_enough_memory)
+        throw ExBase(__FILE__, __LINE__,
+                     "Cannot tell where " + LiStringUtil::getPrintablePath(path.native()) + " is: " + error.message());
+    return target;
 }
 
 } // namespace

@@ -38,16 +38,19 @@ OsLockedFile OsLockedFile::create(OsFilePath const& folder, std::string const& b
         require(file.isOpen() || errno == EEXIST);
         if (!file.isOpen())
             continue;
-        bool const isLocked = file.lock();
-        if (!isLocked && errno != EWOULDBLOCK)
+        try
         {
-            int const reason = errno;
-            ::unlink(path.getChars());
-            throw std::system_error(reason, std::generic_category());
+            // Another process can have taken it before it was locked.
+            bool const isLocked = file.lock();
+            require(isLocked || errno == EWOULDBLOCK);
+            if (isLocked && file.isFileAt(path.toString()))
+                return {path, std::move(file)};
         }
-        // Another process can have taken it before it was locked.
-        if (isLocked && file.isFileAt(path.toString()))
-            return {path, std::move(file)};
+        catch (std::system_error const&)
+        {
+            ::unlink(path.getChars());
+            throw;
+        }
     }
 }
 
@@ -75,6 +78,7 @@ void OsLockedFile::replace(std::string const& content)
 {
     OsTemporaryFile file(_path.getFolder(), forUserAlone);
     file.write(content);
+    file.sync();
     _descriptor = file.moveTo(_path);
 }
 

@@ -74,9 +74,15 @@ void OsTemporaryFile::takeOwnerAndPermissions(struct stat const& other)
     require(::fchmod(_descriptor.get(), other.st_mode & allPermissions) == 0);
 }
 
+struct stat OsTemporaryFile::sync()
+{
+    struct stat status = {};
+    require(::fsync(_descriptor.get()) == 0 && ::fstat(_descriptor.get(), &status) == 0);
+    return status;
+}
+
 OsFileDescriptor OsTemporaryFile::moveTo(OsFilePath const& target)
 {
-    require(::fsync(_descriptor.get()) == 0);
     OsFileDescriptor const folder(::open(target.getFolder().getChars(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     require(std::rename(_path.c_str(), target.getChars()) == 0);
     _path.clear();
@@ -99,11 +105,21 @@ OsFileDescriptor OsTemporaryFile::create(std::string& path, mode_t permissions)
         OsFileDescriptor file(::open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, permissions));
         if (!file.isOpen() && errno != EEXIST)
             return file;
-        // Before it was locked, another process may have held it for one that was left. Where nothing can be locked,
-        // nothing is held for that.
-        bool const isLost = !file.isOpen() || (!file.lock() && errno == EWOULDBLOCK) || !file.isFileAt(path);
-        if (!isLost)
-            return file;
+        if (!file.isOpen())
+            continue;
+        try
+        {
+            // Before it was locked, another process may have held it for one that was left. Where nothing can be
+            // locked, nothing is held for that.
+            bool const isHeld = file.lock() || errno != EWOULDBLOCK;
+            if (isHeld && file.isFileAt(path))
+                return file;
+        }
+        catch (std::system_error const&)
+        {
+            ::unlink(path.c_str());
+            throw;
+        }
     }
 }
 

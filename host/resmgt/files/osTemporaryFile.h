@@ -29,8 +29,11 @@ public:
     /// The owner is changed where the system allows it; the permissions always.
     void takeOwnerAndPermissions(struct stat const& other);
 
-    /// Puts the file in the place of `target`, once its content is on the disk, and then the folder on the disk too.
-    /// Gives the descriptor, which keeps the file locked.
+    /// Puts the content on the disk. Gives what the file is then.
+    struct stat sync();
+
+    /// Puts the file, once that is done, in the place of `target`, and then the folder on the disk too. Gives the
+    /// descriptor, which keeps the file locked.
     OsFileDescriptor moveTo(OsFilePath const& target);
 
 private:
