@@ -207,8 +207,7 @@ def refuse_files():
 
 
 @pytest.mark.parametrize('left', [0, 1, 3, 8])
-# On Wayland Qt ends the process for a picture that it gets no handle for.
-@pytest.mark.parametrize('platform', ['offscreen', 'xcb'])
+@pytest.mark.parametrize('platform', ['offscreen', 'xcb', 'wayland'])
 def test_without_file_handles_all_is_refused_with_words_or_works_and_works_again_with_them(path, platform, left):
     shown = contextlib.nullcontext({}) if platform == 'offscreen' else displays.display(platform)
     leaks = {} if platform == 'offscreen' else NO_SEARCH_FOR_LEAKS
