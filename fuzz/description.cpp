@@ -10,7 +10,11 @@
 
 #include <fuzzer/FuzzedDataProvider.h>
 
+#include <algorithm>
+#include <array>
+#include <cmath>
 #include <sstream>
+#include <unordered_map>
 
 using namespace Kv;
 
@@ -174,6 +178,38 @@ void requireNames(UiContainer const& root, UiContainer const& container)
     }
 }
 
+/// Every edge stands where its constraint says, beside what it is measured from; half a pixel is rounded on both sides.
+void requirePlaces(UiContainer const& container)
+{
+    constexpr float limit = 1 << 23;
+    GeRectangle<int> const frame = container.getFrame();
+    std::unordered_map<std::string, UiWidget const*> siblings;
+    for (RCShdPtr<UiWidget> const& child : container.getChildren())
+        siblings.emplace(child->getName(), child.get());
+    auto const at = [](GeRectangle<int> const& rect, int edge) {
+        return std::array{rect.xMin, rect.yMin, rect.xMax, rect.yMax}.at(static_cast<std::size_t>(edge % 4));
+    };
+    for (RCShdPtr<UiWidget> const& child : container.getChildren())
+    {
+        for (int edge = 0; edge < UiConstraint::EdgeCount && child->getConstraint(); ++edge)
+        {
+            auto const& where = child->getConstraint()->getEdge(static_cast<UiConstraint::EdgeName>(edge));
+            auto const isFrom = [&](UiConstraint::Target target) { return where.target == target; };
+            int const base = isFrom(UiConstraint::ParentLow)    ? at(frame, edge % 2)
+                             : isFrom(UiConstraint::ParentHigh) ? at(frame, edge % 2 + 2)
+                             : isFrom(UiConstraint::OwnOpposite)
+                                 ? at(child->getRect(), edge + 2)
+                                 : at(siblings.at(where.sibling.toString())->getRect(), edge + 2);
+            float const sign = isFrom(UiConstraint::OwnOpposite) && edge < 2 ? -1 : 1;
+            float const place = std::clamp(static_cast<float>(base) + sign * where.getPixels(), -limit, limit);
+            Fuzz::require(std::fabs(place - static_cast<float>(at(child->getRect(), edge))) <= 1,
+                          "an edge is where its constraint says");
+        }
+        if (auto const* const inner = dynamic_cast<UiContainer const*>(child.get()))
+            requirePlaces(*inner);
+    }
+}
+
 } // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(std::uint8_t const* data, std::size_t size)
@@ -196,6 +232,7 @@ extern "C" int LLVMFuzzerTestOneInput(std::uint8_t const* data, std::size_t size
     requireNames(*root, *root);
     window->display(true);
     window->redraw();
+    requirePlaces(*root);
     window->display(false);
     return 0;
 }
