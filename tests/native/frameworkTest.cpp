@@ -1,6 +1,7 @@
 #include "fwComposition.h"
 #include "piGraph.h"
 #include "pointers/rcWeakPtr.h"
+#include "refusals.h"
 #include "uiCompositionWorkspace.h"
 
 #include <csignal>
@@ -24,25 +25,6 @@ namespace
 {
 
 using Composition = RCWeakPtr<const PiCompositionGraphInterface>;
-
-template <typename Action> std::string wordsOf(Action const& action)
-{
-    try
-    {
-        action();
-    }
-    catch (ExBase const& exception)
-    {
-        return exception.getReason();
-    }
-    ADD_FAILURE() << "nothing was refused";
-    return {};
-}
-
-void expectContains(std::string const& text, std::string const& part)
-{
-    EXPECT_NE(text.find(part), std::string::npos) << "no \"" << part << "\" in \"" << text << "\"";
-}
 
 /// A folder of its own for each test, which is the current one too.
 class Compositions : public testing::Test
