@@ -145,8 +145,7 @@ def nested(depth):
 
 def test_256_nested_containers_are_shown(user):
     dialog = ui.createDialog('deep', nested(256), 300, 100)
-    user.plan(lambda user: user.close())
-    assert dialog.launch() == 'CloseButton_OK'
+    assert user.run(dialog) == 'CloseButton_OK'
 
 
 @pytest.mark.parametrize('depth', [257, 300, 5000])
