@@ -47,12 +47,10 @@ def declared_in(header, class_name, only_public=False):
 def exported_by_class():
     counts = {}
     rest = set()
+    owners = '|'.join(map(re.escape, (DIALOG, ERROR, WRAPPER, GRAPH, ITERATOR, POINTER)))
     for name in symbols(MODULE, '--defined-only'):
-        for class_name in DIALOG, ERROR, WRAPPER, GRAPH, ITERATOR, POINTER:
-            if name.startswith(class_name + '::'):
-                member = re.match(r'operator[^(]*|[~\w]+', name[len(class_name) + 2:]).group()
-                counts.setdefault(class_name, Counter())[member] += 1
-                break
+        if member := re.match(r'(%s)::(operator[^(]*|[~\w]+)' % owners, name):
+            counts.setdefault(member[1], Counter())[member[2]] += 1
         else:
             rest.add(name)
     return counts, rest
