@@ -235,6 +235,7 @@ TEST(XmlDocument, RefusesForbiddenCharactersAndReferences)
     expectRefused("<a/>\r\n\0"s, 2, "cannot hold");
     expectRefused("<a b='\n\x01'/>", 2, R"(cannot hold: '<a b=\'\n\x01\'/>')");
     expectRefused("<!--\xef\xbf\xbf--><a/>", 1, "cannot hold");
+    expectRefused("<a>&go;</a>", 1, "&go;");
     for (std::string const reference :
          {"&#0;",  "&#1;", "&#x1f;", "&#xD800;", "&#xFFFE;", "&#x110000;", "&#99999999999;",
           "&#;",   "&#x;", "&#X41;", "&#-1;",    "&#4 1;",   "&#65x;",     "&foo;",

@@ -75,13 +75,11 @@ def last(user):
 
 
 def test_it_floats_with_its_title_shows_sequences_as_one_and_has_the_keyboard_in_the_list(user, files):
-    seen = []
-
     def look(user):
-        seen.extend([user.title(), user.focus(), rows(user)])
+        assert (user.title(), user.focus()) == ('A <title>', 'Browser.list')
+        assert rows(user) == ['sub', 'frame.####.exr  1-3', 'notes.txt', '\ufffd.txt']
 
     assert browse(user, look, ok, title='A <title>', initialPath=files) == files
-    assert seen == ['A <title>', 'Browser.list', ['sub', 'frame.####.exr  1-3', 'notes.txt', '\ufffd.txt']]
 
 
 @pytest.mark.parametrize('steps, path', [
@@ -255,6 +253,5 @@ def test_the_workspace_knows_of_no_selection_where_a_field_has_the_keyboard(user
         user.type('typed')
         user.press(Qt.Key.Key_Return)
 
-    user.plan(end_edit, lambda user: user.close())
-    dialog.launch()
+    user.run(dialog, end_edit)
     assert seen == [('Text', [])]

@@ -45,21 +45,15 @@ Escape, End = Qt.Key.Key_Escape, Qt.Key.Key_End
 
 
 @pytest.mark.parametrize('widget, action, events', [
-    ('Button', click('Button'), [ACTIVATE]),
-    ('Button', keys('Button', Space), [ACTIVATE]),
+    ('Button', click('Button'), [ACTIVATE]), ('Button', keys('Button', Space), [ACTIVATE]),
     ('Button', keys('Button', Return), [ACTIVATE]),
-    ('Toggle', click('Toggle'), [STATE, ACTIVATE]),
-    ('Toggle', keys('Toggle', Space), [STATE, ACTIVATE]),
-    ('Text', click('Text'), [ACTIVATE]),
-    ('Text', keys('Text', 'new', Return), [VALUE_CHANGED]),
-    ('Text', keys('Text', 'new'), []),
-    ('Text', keys('Text', Return), []),
+    ('Toggle', click('Toggle'), [STATE, ACTIVATE]), ('Toggle', keys('Toggle', Space), [STATE, ACTIVATE]),
+    ('Text', click('Text'), [ACTIVATE]), ('Text', keys('Text', 'new', Return), [VALUE_CHANGED]),
+    ('Text', keys('Text', 'new'), []), ('Text', keys('Text', Return), []),
     ('Text', keys('Text', 'n', Return, Return), [VALUE_CHANGED]),
     ('Text', keys('Text', End, 'n', Backspace, Return), []),
-    ('Menu', pick(Down, Return), [VALUE_CHANGED, ACTIVATE]),
-    ('Menu', keys('Menu', Down), [VALUE_CHANGED, ACTIVATE]),
-    ('Menu', pick(Return), [ACTIVATE]),
-    ('Menu', pick(Down, Escape), []),
+    ('Menu', pick(Down, Return), [VALUE_CHANGED, ACTIVATE]), ('Menu', keys('Menu', Down), [VALUE_CHANGED, ACTIVATE]),
+    ('Menu', pick(Return), [ACTIVATE]), ('Menu', pick(Down, Escape), []),
 ], ids=lambda value: value if isinstance(value, str) else '')
 def test_the_user_raises_events(user, widget, action, events):
     dialog = make_dialog()

@@ -1,5 +1,7 @@
 """The values of widgets, as scripts read and write them."""
 
+from unittest.mock import Mock
+
 import pytest
 
 from descriptions import close_button, container, text, widget
@@ -113,10 +115,7 @@ def test_a_refused_text_or_state_changes_nothing(write, name, value, failure):
 
 
 def test_what_a_callback_raises_in_a_setter_says_nothing_of_the_value(write):
-    def fail(*_):
-        raise KeyError('mine')
-
-    dialog = make()
+    dialog, fail = make(), Mock(side_effect=KeyError('mine'))
     for name, value in ('Show', 'x'), ('Win', True), ('Prize', (['c'], 0)):
         for event in ui.EventType.STATE, ui.EventType.VALUE_CHANGED:
             dialog.addCallback(name, event, fail)
