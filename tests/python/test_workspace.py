@@ -56,12 +56,6 @@ def test_only_a_graph_can_be_opened(no_graph):
     assert type(caught.value).__name__ == 'ArgumentError'
 
 
-def test_scripts_make_no_graphs_and_have_one_exception_for_them():
-    with pytest.raises(RuntimeError):
-        graph.Graph()
-    assert issubclass(graph.GraphError, Exception) and graph.GraphError is not ui.UiError
-
-
 @pytest.mark.standalone
 def test_a_composition_is_read_changed_and_saved_without_a_window(shot):
     run_script('''
