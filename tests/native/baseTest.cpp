@@ -285,6 +285,8 @@ TEST(Iterator, SharesItsSequenceWithCopiesUntilOneOfThemChanges)
     EXPECT_EQ(third.item(), "b");
     EXPECT_EQ(walk(first), (Words{"a", "b"}));
     EXPECT_EQ(walk(second), (Words{"a", "changed"}));
+    *first = "other";
+    EXPECT_EQ(third.item(), "b");
     EXPECT_EQ(third->size(), 1U);
 }
 
