@@ -12,6 +12,7 @@
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
+#include <functional>
 #include <future>
 #include <gtest/gtest.h>
 #include <iterator>
@@ -20,6 +21,7 @@
 #include <sstream>
 #include <string>
 #include <thread>
+#include <utility>
 #include <vector>
 
 using namespace Kv;
@@ -60,25 +62,14 @@ void expectRefused(std::string const& text, int line, std::string const& words)
     }
 }
 
-/// Appends a counting number to whatever pattern it is called for.
-class CountingHandler : public CbHandler<std::string>
+class Handler : public CbHandler<std::string>
 {
 public:
-    void call(std::string& text) override { text += std::to_string(++_calls); }
+    explicit Handler(std::function<void(std::string&)> replace) : _replace(std::move(replace)) {}
+    void call(std::string& text) override { _replace(text); }
 
 private:
-    int _calls = 0;
-};
-
-/// Replaces by a fixed text.
-class FixedHandler : public CbHandler<std::string>
-{
-public:
-    explicit FixedHandler(std::string replacement) : _replacement(std::move(replacement)) {}
-    void call(std::string& text) override { text = _replacement; }
-
-private:
-    std::string _replacement;
+    std::function<void(std::string&)> _replace;
 };
 
 } // namespace
@@ -322,9 +313,10 @@ TEST(XmlLimits, LargeDocumentsCostWhatTheyHold)
 
 TEST(LiStringSubstituter, ReplacesEveryOccurrenceOnce)
 {
-    CountingHandler counting;
-    FixedHandler fixed("-999");
-    FixedHandler empty("");
+    int calls = 0;
+    Handler counting([&](std::string& text) { text += std::to_string(++calls); });
+    Handler fixed([](std::string& text) { text = "-999"; });
+    Handler empty([](std::string& text) { text = ""; });
     LiStringSubstituter substituter;
     EXPECT_EQ(substituter.substitute("-999"), "-999");
     substituter.add("-999", &counting);
