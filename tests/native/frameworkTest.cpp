@@ -12,6 +12,7 @@
 #include <string>
 #include <sys/resource.h>
 #include <sys/stat.h>
+#include <tuple>
 #include <utility>
 #include <vector>
 
@@ -78,13 +79,7 @@ constexpr char const* grade = R"(<composition>
 
 TEST_F(Compositions, NameTheFileAndTheLineOfWhatIsWrongWithThem)
 {
-    struct Case
-    {
-        int line;
-        char const* words;
-        char const* text;
-    };
-    for (Case const& wrong : std::vector<Case>{
+    for (auto const& [line, part, text] : std::vector<std::tuple<int, char const*, char const*>>{
              {1, "no element", ""},
              {2, "", "<composition>\n</comp>"},
              {1, "'graph'", "<graph/>"},
@@ -112,11 +107,11 @@ TEST_F(Compositions, NameTheFileAndTheLineOfWhatIsWrongWithThem)
              {2, "node 'b', which is not there",
               "<composition><node name='a' type='t'>\n<input name='i' node='b'/></node></composition>"}})
     {
-        write("wrong.vmcomposition", wrong.text);
+        write("wrong.vmcomposition", text);
         std::string const words = wordsOf([this] { open("wrong.vmcomposition"); });
         expectContains(words, (folder / "wrong.vmcomposition").string());
-        expectContains(words, "line " + std::to_string(wrong.line) + ":");
-        expectContains(words, wrong.words);
+        expectContains(words, "line " + std::to_string(line) + ":");
+        expectContains(words, part);
     }
     expectContains(wordsOf([this] { open(""); }), folder.string() + "': it is a folder");
     expectContains(wordsOf([this] { open("missing"); }), "missing': No such file");
