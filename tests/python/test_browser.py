@@ -19,9 +19,8 @@ pytestmark = pytest.mark.inside
 def files(tmp_path):
     """A folder with a folder and files in it, one of which has a name that is no text."""
     (tmp_path / 'sub').mkdir()
-    for name in b'frame.0001.exr', b'frame.0002.exr', b'frame.0003.exr', b'notes.txt', b'\xff.txt':
-        with open(os.path.join(os.fsencode(tmp_path), name), 'w'):
-            pass
+    for name in 'frame.0001.exr', 'frame.0002.exr', 'frame.0003.exr', 'notes.txt', '\udcff.txt':
+        (tmp_path / name).touch()
     return str(tmp_path)
 
 

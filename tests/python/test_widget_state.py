@@ -233,9 +233,8 @@ def test_a_bare_name_is_looked_for_in_the_application_and_then_beside_the_script
     script.write_text('dialog.setWidgetResourceName(widget, resource)')
     link.symlink_to(script)
     (folder / 'votes.xml').write_text(TOOLTIPS.replace('Text', 'Name').replace('The', 'My'))
-    (folder / 'both').write_text(TOOLTIPS.replace('The', 'Bare'))
-    (folder / 'both.xml').write_text(TOOLTIPS.replace('The', 'Whole'))
-    (folder / 'bare').write_text(TOOLTIPS.replace('The', 'Bare'))
+    for name, word in ('both', 'Bare'), ('both.xml', 'Whole'), ('bare', 'Bare'):
+        (folder / name).write_text(TOOLTIPS.replace('The', word))
     form = [('TextField', name) for name in ('Name', 'Text')] + [('ToggleButton', 'Toggle')]
     dialog = ui.createDialog('t', ui.makeXmlFromWidgetList(form), 300, 140)
     seen = []

@@ -95,10 +95,8 @@ def test_what_is_no_path_is_refused(take, no_path, failure):
 
 
 @pytest.mark.parametrize('kind', [os.fsencode, os.fsdecode, pathlib.Path])
-def test_the_path_may_be_bytes_and_no_text(tmp_path, kind):
-    path = os.path.join(tmp_path, 'shot \udcff.vmcomposition')
-    with open(path, 'w') as file:
-        file.write(COMPOSITION)
+def test_the_path_may_be_bytes_and_no_text(shot, kind):
+    path = shot.rename(shot.with_name('shot \udcff.vmcomposition'))
     shot = graph.readComposition(kind(path))
     assert (shot.getName(), shot.getPath()) == ('shot \udcff', os.path.realpath(path))
 
