@@ -269,24 +269,17 @@ TEST_F(Folder, IsReadInAThreadThatIsCancelledAndLeftAtAnyMoment)
     {
         std::this_thread::sleep_for(std::chrono::microseconds(random() % 300));
         std::string const path = folder / std::to_string(random() % 3);
-        switch (random() % 8)
-        {
-        case 0:
+        auto const chance = random() % 8;
+        if (chance == 0)
             worker = std::make_unique<QtDirWorker>();
-            break;
-        case 1:
+        else if (chance == 1)
             worker->cancel();
-            break;
-        case 2:
+        else if (chance == 2)
             worker->startAndWait(path, makeReading());
-            break;
-        case 3:
-        case 4:
+        else if (chance < 5)
             worker->start(path, makeReading());
-            break;
-        default:
+        else
             QCoreApplication::processEvents();
-        }
     }
     wait([&] { return !worker->isBusy(); });
     EXPECT_GT(seen, 100);

@@ -1,6 +1,7 @@
 #include "fwComposition.h"
 #include "piGraph.h"
 #include "pointers/rcWeakPtr.h"
+#include "refusals.h"
 #include "uiCompositionWorkspace.h"
 
 #include <csignal>
@@ -8,10 +9,10 @@
 #include <fstream>
 #include <gtest/gtest.h>
 #include <iterator>
-#include <set>
 #include <string>
 #include <sys/resource.h>
 #include <sys/stat.h>
+#include <tuple>
 #include <utility>
 #include <vector>
 
@@ -24,25 +25,6 @@ namespace
 {
 
 using Composition = RCWeakPtr<const PiCompositionGraphInterface>;
-
-template <typename Action> std::string wordsOf(Action const& action)
-{
-    try
-    {
-        action();
-    }
-    catch (ExBase const& exception)
-    {
-        return exception.getReason();
-    }
-    ADD_FAILURE() << "nothing was refused";
-    return {};
-}
-
-void expectContains(std::string const& text, std::string const& part)
-{
-    EXPECT_NE(text.find(part), std::string::npos) << "no \"" << part << "\" in \"" << text << "\"";
-}
 
 /// A folder of its own for each test, which is the current one too.
 class Compositions : public testing::Test
@@ -97,13 +79,7 @@ constexpr char const* grade = R"(<composition>
 
 TEST_F(Compositions, NameTheFileAndTheLineOfWhatIsWrongWithThem)
 {
-    struct Case
-    {
-        int line;
-        char const* words;
-        char const* text;
-    };
-    for (Case const& wrong : std::vector<Case>{
+    for (auto const& [line, part, text] : std::vector<std::tuple<int, char const*, char const*>>{
              {1, "no element", ""},
              {2, "", "<composition>\n</comp>"},
              {1, "'graph'", "<graph/>"},
@@ -131,11 +107,11 @@ TEST_F(Compositions, NameTheFileAndTheLineOfWhatIsWrongWithThem)
              {2, "node 'b', which is not there",
               "<composition><node name='a' type='t'>\n<input name='i' node='b'/></node></composition>"}})
     {
-        write("wrong.vmcomposition", wrong.text);
+        write("wrong.vmcomposition", text);
         std::string const words = wordsOf([this] { open("wrong.vmcomposition"); });
         expectContains(words, (folder / "wrong.vmcomposition").string());
-        expectContains(words, "line " + std::to_string(wrong.line) + ":");
-        expectContains(words, wrong.words);
+        expectContains(words, "line " + std::to_string(line) + ":");
+        expectContains(words, part);
     }
     expectContains(wordsOf([this] { open(""); }), folder.string() + "': it is a folder");
     expectContains(wordsOf([this] { open("missing"); }), "missing': No such file");
@@ -272,65 +248,31 @@ TEST_F(Compositions, AreAsTheyWereOnADiskThatIsFull)
 namespace
 {
 
-/// Writes down what has become different each time that the workspace tells of a change.
+std::string nameOf(Composition const& composition)
+{
+    return composition.isExpired() ? "none" : RCWeakAccessor(composition)->getGraph()->getName();
+}
+
+/// Writes down what is open, how many that is and which one is current, each time that the workspace tells of a change.
 class Hearer
 {
 public:
-    explicit Hearer(UiCompositionWorkspace& workspace) : _workspace(workspace)
+    explicit Hearer(UiCompositionWorkspace& workspace)
     {
-        look();
-        workspace.setChangeCallback([this] { hear(); });
+        workspace.setChangeCallback(
+            [this, &workspace]
+            {
+                for (auto all = workspace.getCompositions(); !all.atEnd(); ++all)
+                    _heard += nameOf(*all) + " ";
+                _heard += "(" + std::to_string(workspace.getNbCompositions()) + "), current " +
+                          nameOf(workspace.getCurrentComposition()) + "; ";
+            });
     }
 
     std::string take() { return std::exchange(_heard, ""); }
-    int takeCount() { return std::exchange(_count, 0); }
-
-    static std::string nameOf(Composition const& composition)
-    {
-        return composition.isExpired() ? "none" : RCWeakAccessor(composition)->getGraph()->getName();
-    }
 
 private:
-    void look()
-    {
-        _current = nameOf(_workspace.getCurrentComposition());
-        _names.clear();
-        for (auto all = _workspace.getCompositions(); !all.atEnd(); ++all)
-            _names.insert(nameOf(*all));
-    }
-
-    void hear()
-    {
-        ++_count;
-        std::string const heard = _heard;
-        std::string const current = _current;
-        std::set<std::string> const names = _names;
-        look();
-        noteMissing("opened", _names, names);
-        noteMissing("closed", names, _names);
-        if (_current != current)
-            note("current", _current);
-        if (_heard == heard)
-            note("changed", _current);
-    }
-
-    void noteMissing(char const* what, std::set<std::string> const& names, std::set<std::string> const& others)
-    {
-        for (std::string const& name : names)
-            if (others.count(name) == 0)
-                note(what, name);
-    }
-
-    void note(char const* what, std::string const& name)
-    {
-        _heard += std::string(what) + " " + name + " of " + std::to_string(_workspace.getNbCompositions()) + "; ";
-    }
-
-    UiCompositionWorkspace& _workspace;
-    std::string _current;
-    std::set<std::string> _names;
     std::string _heard;
-    int _count = 0;
 };
 
 } // namespace
@@ -344,39 +286,32 @@ TEST_F(Compositions, AreOpenedMadeCurrentAndClosedInAWorkspace)
     EXPECT_TRUE(workspace->getCurrentComposition().isExpired());
     EXPECT_TRUE(workspace->getFocus().isNull());
     Composition const a = workspace->open(pathOf("a"));
-    EXPECT_EQ(hearer.take(), "opened a of 1; current a of 1; ");
-    EXPECT_EQ(hearer.takeCount(), 1);
+    EXPECT_EQ(hearer.take(), "a (1), current a; ");
     Composition const b = workspace->open(pathOf("b"));
     Composition const c = workspace->open(pathOf("c"));
     hearer.take();
     EXPECT_TRUE(workspace->open(pathOf("b")) == b);
-    EXPECT_EQ(hearer.take(), "current b of 3; ");
+    EXPECT_EQ(hearer.take(), "a b c (3), current b; ");
     workspace->openComposition(b);
     EXPECT_EQ(hearer.take(), "") << "it is current already";
     EXPECT_THROW(workspace->open(pathOf("missing")), ExBase);
     EXPECT_EQ(hearer.take(), "");
-    std::string order;
-    for (auto all = workspace->getCompositions(); !all.atEnd(); ++all)
-        order += Hearer::nameOf(*all);
-    EXPECT_EQ(order, "abc");
 
     RCWeakAccessor<const PiCompositionGraphInterface> const held(b);
     RCShdPtr<const PiGraph> const graph = held->getGraph();
     EXPECT_TRUE(workspace->getComposition(graph) == b);
-    hearer.takeCount();
     workspace->close(b);
-    EXPECT_EQ(hearer.take(), "closed b of 2; current c of 2; ");
-    EXPECT_EQ(hearer.takeCount(), 1);
+    EXPECT_EQ(hearer.take(), "a c (2), current c; ");
     EXPECT_TRUE(workspace->getComposition(graph).isExpired()) << "closed, although it is held here";
     expectContains(wordsOf([&] { workspace->openComposition(b); }), "has been closed");
     EXPECT_THROW(workspace->close(b), ExBase);
     workspace->openComposition(a);
     hearer.take();
     workspace->close(c);
-    EXPECT_EQ(hearer.take(), "closed c of 1; ");
+    EXPECT_EQ(hearer.take(), "a (1), current a; ");
     EXPECT_TRUE(c.isExpired());
     workspace->close(a);
-    EXPECT_EQ(hearer.take(), "closed a of 0; current none of 0; ");
+    EXPECT_EQ(hearer.take(), "(0), current none; ");
     EXPECT_THROW(workspace->openComposition({}), ExBase);
 }
 
@@ -399,14 +334,14 @@ TEST_F(Compositions, BelongToWhoHasReadThemUntilAWorkspaceTakesThemOver)
     kept->setNodeValue("Grade", "gain", "2");
     Composition const taken = workspace->getComposition(kept);
     workspace->openComposition(taken);
-    EXPECT_EQ(hearer.take(), "opened shot of 1; current shot of 1; ");
+    EXPECT_EQ(hearer.take(), "shot (1), current shot; ");
     kept->setNodeValue("Grade", "gain", "3");
-    EXPECT_EQ(hearer.take(), "changed shot of 1; ");
+    EXPECT_EQ(hearer.take(), "shot (1), current shot; ");
     keeper.reset();
     EXPECT_TRUE(workspace->getCurrentComposition() == taken) << "it is the workspace's own now";
     workspace->close(taken);
     EXPECT_TRUE(taken.isExpired());
-    EXPECT_EQ(hearer.take(), "closed shot of 0; current none of 0; ");
+    EXPECT_EQ(hearer.take(), "(0), current none; ");
 }
 
 TEST_F(Compositions, TellTheirWorkspaceOfEachChange)
@@ -423,10 +358,10 @@ TEST_F(Compositions, TellTheirWorkspaceOfEachChange)
     RCShdPtr<PiGraph> const graph = RCWeakAccessor(writable)->getGraph();
     graph->setNodeValue("Read", "file", "a");
     graph->setNodeValue("Read", "file", "a");
-    EXPECT_EQ(hearer.take(), "changed shot of 1; ");
+    EXPECT_EQ(hearer.take(), "shot (1), current shot; ");
     EXPECT_TRUE(held->isModified());
     workspace->save(composition);
-    EXPECT_EQ(hearer.take(), "changed shot of 1; ");
+    EXPECT_EQ(hearer.take(), "shot (1), current shot; ");
     EXPECT_FALSE(held->isModified());
     workspace = nullptr;
     graph->setNodeValue("Read", "file", "b");

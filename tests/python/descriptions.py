@@ -8,15 +8,15 @@ def edge(name, place):
     return '<%s Value="%s" Type="%s" Target="%s"%s/>' % (name, value, measure, target, tail)
 
 
-def head(name, places):
+def head(name, places, ahead=''):
     edges = '\n'.join(map(edge, ('X1', 'Y1', 'X2', 'Y2'), places))
-    return '<Widget Name="%s">\n<Layout><Constraint>\n%s\n</Constraint></Layout>\n' % (name, edges)
+    return '<Widget Name="%s">%s\n<Layout><Constraint>\n%s\n</Constraint></Layout>\n' % (name, ahead, edges)
 
 
-def widget(kind, name, *places, content=''):
+def widget(kind, name, *places, ahead='', content=''):
     """A widget of any kind but a container, 12 units by 4 at the bottom left unless it is told otherwise."""
     places = places or ('0 u l', '0 u b', '12 u w', '4 u h')
-    return '<%s>%s%s</Widget></%s>\n' % (kind, head(name, places), content, kind)
+    return '<%s>%s%s</Widget></%s>\n' % (kind, head(name, places, ahead), content, kind)
 
 
 def text(words):

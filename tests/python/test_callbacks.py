@@ -2,6 +2,7 @@
 
 import gc
 import weakref
+from unittest.mock import Mock
 
 import pytest
 
@@ -44,27 +45,20 @@ Escape, End = Qt.Key.Key_Escape, Qt.Key.Key_End
 
 
 @pytest.mark.parametrize('widget, action, events', [
-    ('Button', click('Button'), [ACTIVATE]),
-    ('Button', keys('Button', Space), [ACTIVATE]),
+    ('Button', click('Button'), [ACTIVATE]), ('Button', keys('Button', Space), [ACTIVATE]),
     ('Button', keys('Button', Return), [ACTIVATE]),
-    ('Toggle', click('Toggle'), [STATE, ACTIVATE]),
-    ('Toggle', keys('Toggle', Space), [STATE, ACTIVATE]),
-    ('Text', click('Text'), [ACTIVATE]),
-    ('Text', keys('Text', 'new', Return), [VALUE_CHANGED]),
-    ('Text', keys('Text', 'new'), []),
-    ('Text', keys('Text', Return), []),
+    ('Toggle', click('Toggle'), [STATE, ACTIVATE]), ('Toggle', keys('Toggle', Space), [STATE, ACTIVATE]),
+    ('Text', click('Text'), [ACTIVATE]), ('Text', keys('Text', 'new', Return), [VALUE_CHANGED]),
+    ('Text', keys('Text', 'new'), []), ('Text', keys('Text', Return), []),
     ('Text', keys('Text', 'n', Return, Return), [VALUE_CHANGED]),
     ('Text', keys('Text', End, 'n', Backspace, Return), []),
-    ('Menu', pick(Down, Return), [VALUE_CHANGED, ACTIVATE]),
-    ('Menu', keys('Menu', Down), [VALUE_CHANGED, ACTIVATE]),
-    ('Menu', pick(Return), [ACTIVATE]),
-    ('Menu', pick(Down, Escape), []),
+    ('Menu', pick(Down, Return), [VALUE_CHANGED, ACTIVATE]), ('Menu', keys('Menu', Down), [VALUE_CHANGED, ACTIVATE]),
+    ('Menu', pick(Return), [ACTIVATE]), ('Menu', pick(Down, Escape), []),
 ], ids=lambda value: value if isinstance(value, str) else '')
 def test_the_user_raises_events(user, widget, action, events):
     dialog = make_dialog()
     heard = listen(dialog, widget)
-    user.plan(action, lambda someone: someone.close())
-    dialog.launch()
+    user.run(dialog, action)
     assert heard == [(widget, event) for event in events]
 
 
@@ -88,8 +82,7 @@ def test_a_setter_raises_the_event_of_a_change_unless_it_is_told_not_to(user, wi
             assert heard == [(widget, event)] * 2
 
     set_in_every_way()
-    user.plan(set_in_every_way, lambda someone: someone.close())
-    dialog.launch()
+    user.run(dialog, set_in_every_way)
     set_in_every_way()
 
 
@@ -98,8 +91,7 @@ def test_a_callable_gets_a_dialog_for_the_same_widgets_the_name_and_the_event(us
     calls = []
     dialog.addCallback('Toggle', STATE, lambda *arguments: calls.append(arguments))
     dialog.addCallback('Toggle', STATE, lambda given, *_: given.setValue('Text', given.getValue('Text') + '!', False))
-    user.plan(click('Toggle'), lambda someone: someone.close())
-    dialog.launch()
+    user.run(dialog, click('Toggle'))
     (given, name, event), = calls
     assert type(given) is ui.Dialog and given is not dialog
     assert (name, type(name)) == ('Toggle', str)
@@ -110,28 +102,21 @@ def test_a_callable_gets_a_dialog_for_the_same_widgets_the_name_and_the_event(us
 
 def test_callables_of_one_event_run_in_order_of_registration_and_as_often_as_registered(user):
     dialog = make_dialog()
-    order = []
+    calls = Mock()
 
-    def first(*_):
-        order.append('first')
+    def take_back(_):
+        dialog.removeCallback('Button', ACTIVATE, calls.first)
 
-    def second(*_):
-        order.append('second')
-        return order
-
-    for callable_ in (first, second, first):
+    for callable_ in (calls.first, calls.second, calls.first):
         dialog.addCallback('Button', ACTIVATE, callable_)
-    user.plan(click('Button'),
-              lambda _: dialog.removeCallback('Button', ACTIVATE, first), click('Button'),
-              lambda _: dialog.removeCallback('Button', ACTIVATE, first), click('Button'),
-              lambda _: dialog.removeCallback('Button', ACTIVATE, first),
-              lambda someone: someone.close())
-    dialog.launch()
-    assert order == ['first', 'second', 'first', 'second', 'first', 'second']
+    user.run(dialog, click('Button'), take_back, click('Button'), take_back, click('Button'), take_back)
+    assert [name for name, *_ in calls.mock_calls] == ['first', 'second', 'first', 'second', 'first', 'second']
 
 
 class Equal:
     """Says of everything that it is the same."""
+
+    heard = 0
 
     def __eq__(self, other):
         return True
@@ -139,50 +124,41 @@ class Equal:
     def __hash__(self):
         return 0
 
-    def method(self, *_):
-        pass
+    def hear(self, *_):
+        self.heard += 1
 
 
 def test_a_callable_is_taken_back_by_identity():
     dialog = make_dialog()
-    calls = []
-
-    class Listener:
-        def hear(self, *_):
-            calls.append('heard')
-
-    listener = Listener()
+    listener = Equal()
     kept = listener.hear
     dialog.addCallback('Toggle', STATE, kept)
-    for other in (listener.hear, Equal(), Equal().method, None):
+    for other in (listener.hear, Equal(), Equal().hear, None):
         dialog.removeCallback('Toggle', STATE, other)
     dialog.removeCallback('Toggle', ACTIVATE, kept)
     dialog.removeCallback('Button', STATE, kept)
     dialog.setValue('Toggle', True)
-    assert calls == ['heard']
+    assert listener.heard == 1
     dialog.removeCallback('Toggle', STATE, kept)
     dialog.setValue('Toggle', True)
-    assert calls == ['heard']
+    assert listener.heard == 1
 
 
 def test_a_callable_is_kept_for_as_long_as_it_is_registered():
     dialog = make_dialog()
     calls = []
-    dialog.addCallback('Toggle', STATE, lambda *_: calls.append('heard'))
+
+    def hear(*_):
+        calls.append('heard')
+
+    gone = weakref.ref(hear)
+    for _ in range(2):
+        dialog.addCallback('Toggle', STATE, hear)
+    dialog.removeCallback('Toggle', STATE, hear)
+    del hear
     gc.collect()
     dialog.setValue('Toggle', True)
     assert calls == ['heard']
-
-    def twice(*_):
-        calls.append('twice')
-
-    gone = weakref.ref(twice)
-    for _ in range(2):
-        dialog.addCallback('Toggle', STATE, twice)
-    dialog.removeCallback('Toggle', STATE, twice)
-    del twice
-    dialog.setValue('Toggle', True)
-    assert calls == ['heard', 'heard', 'twice']
     dialog.removeCallback('Toggle', STATE, gone())
     assert gone() is None
 
@@ -203,8 +179,7 @@ def test_a_label_accepts_a_callable_and_never_calls_it(user):
             dialog.enableWidget(name, False)
             dialog.setValue(name, 'text')
 
-    user.plan(disturb, lambda someone: someone.close())
-    dialog.launch()
+    user.run(dialog, disturb)
     dialog.removeCallback('Note', ACTIVATE, never)
     del never
     assert heard == [] and gone() is None
@@ -235,9 +210,8 @@ def test_a_callback_on_a_close_button_can_keep_the_dialog_open(user):
         seen.append(name)
 
     dialog.addCallback('CloseButton_OK', ACTIVATE, validate)
-    user.plan(lambda someone: someone.close(), lambda _: seen.append(dialog.getValues()['CloseButtonClicked']),
-              keys('Text', 'good'), lambda someone: someone.close())
-    assert dialog.launch() == 'CloseButton_OK'
+    assert user.run(dialog, click('CloseButton_OK'), lambda _: seen.append(dialog.getValues()['CloseButtonClicked']),
+                    keys('Text', 'good')) == 'CloseButton_OK'
     assert seen == ['CloseButton_OK'] * 3
     assert dialog.getValue('Text') == 'good'
 
@@ -245,14 +219,12 @@ def test_a_callback_on_a_close_button_can_keep_the_dialog_open(user):
 @pytest.mark.parametrize('times', [1, 2])
 def test_one_close_is_suppressed_for_the_next_run_however_often_it_was_asked_for(user, times):
     dialog = make_dialog()
-    user.plan(lambda someone: someone.close())
-    dialog.launch()
+    user.run(dialog)
     for _ in range(times):
         dialog.disableNextClose()
     names = []
-    user.plan(lambda someone: someone.close('Cancel'), lambda _: names.append(dialog.getValues()['CloseButtonClicked']),
-              lambda someone: someone.close())
-    assert dialog.launch() == 'CloseButton_OK'
+    assert user.run(dialog, click('CloseButton_Cancel'),
+                    lambda _: names.append(dialog.getValues()['CloseButtonClicked'])) == 'CloseButton_OK'
     assert names == ['CloseButton_Cancel']
 
 
@@ -260,8 +232,7 @@ def test_callbacks_stay_from_run_to_run(user):
     dialog = make_dialog()
     heard = listen(dialog, 'Button', 'CloseButton_OK')
     for run in range(1, 4):
-        user.plan(click('Button'), lambda someone: someone.close())
-        dialog.launch()
+        user.run(dialog, click('Button'))
         assert heard == [('Button', ACTIVATE), ('CloseButton_OK', ACTIVATE)] * run
 
 
@@ -269,8 +240,7 @@ def test_callbacks_stay_from_run_to_run(user):
 def test_what_cannot_be_called_so_fails_at_the_event(user, unfit):
     dialog = make_dialog()
     dialog.addCallback('Button', ACTIVATE, unfit)
-    user.plan(click('Button'), lambda someone: someone.close())
     with pytest.raises(TypeError):
-        dialog.launch()
+        user.run(dialog, click('Button'))
     dialog.removeCallback('Button', ACTIVATE, unfit)
     assert dialog.launch() == 'CloseButton_OK'

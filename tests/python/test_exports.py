@@ -47,12 +47,10 @@ def declared_in(header, class_name, only_public=False):
 def exported_by_class():
     counts = {}
     rest = set()
+    owners = '|'.join(map(re.escape, (DIALOG, ERROR, WRAPPER, GRAPH, ITERATOR, POINTER)))
     for name in symbols(MODULE, '--defined-only'):
-        for class_name in DIALOG, ERROR, WRAPPER, GRAPH, ITERATOR, POINTER:
-            if name.startswith(class_name + '::'):
-                member = re.match(r'operator[^(]*|[~\w]+', name[len(class_name) + 2:]).group()
-                counts.setdefault(class_name, Counter())[member] += 1
-                break
+        if member := re.match(r'(%s)::(operator[^(]*|[~\w]+)' % owners, name):
+            counts.setdefault(member[1], Counter())[member[2]] += 1
         else:
             rest.add(name)
     return counts, rest
@@ -102,51 +100,30 @@ CALLED = {
     'BrBrowser': ('getInputFocusPath getPath setCompositionsCollapsed setDontLoadCompositions setFolderOption '
                   'setSequencesCollapsed setURL setViewType'),
     'BrBrowserFloatingHandler': 'BrBrowserFloatingHandler getBrowser isClosed isClosedConst setActivateCb',
-    'InBuildInfo': 'InBuildInfo',
-    'InBuildInfoUtil': 'getApplicationMode registerInfo',
-    'InPackageInit': 'InPackageInit addDependency registerPackage',
-    'LiString': 'LiString toString ~LiString',
-    'LiStringSubstituter': 'LiStringSubstituter add substitute ~LiStringSubstituter',
-    'LiStringUtil': 'convertNb',
+    'InBuildInfo': 'InBuildInfo', 'InBuildInfoUtil': 'getApplicationMode registerInfo',
+    'InPackageInit': 'InPackageInit addDependency registerPackage', 'LiString': 'LiString toString ~LiString',
+    'LiStringSubstituter': 'LiStringSubstituter add substitute ~LiStringSubstituter', 'LiStringUtil': 'convertNb',
     'OsFile': 'OsFile getSize ~OsFile',
     'OsFile::FileDescriptorManipGuard': 'FileDescriptorManipGuard ~FileDescriptorManipGuard',
-    'OsFilePath': 'OsFilePath getChars isEmpty operator= toString ~OsFilePath',
-    'OsFsUtils': 'fileExists',
-    'PiPythonUtils': 'getCurrentPythonInterpreterId',
-    'PiWidget': 'addCallback removeCallback',
-    'PyextGraph::Graph': 'Graph',
-    'PyextGraph::GraphRO': 'getPiGraphRO',
-    'PyextInit::Error': 'Error newException',
-    'RCExUtil': 'throwExCastFailed throwExNullPtr',
-    'RttiType': 'RttiType',
-    'SnSelection': 'begin end',
+    'OsFilePath': 'OsFilePath getChars isEmpty operator= toString ~OsFilePath', 'OsFsUtils': 'fileExists',
+    'PiPythonUtils': 'getCurrentPythonInterpreterId', 'PiWidget': 'addCallback removeCallback',
+    'PyextGraph::Graph': 'Graph', 'PyextGraph::GraphRO': 'getPiGraphRO', 'PyextInit::Error': 'Error newException',
+    'RCExUtil': 'throwExCastFailed throwExNullPtr', 'RttiType': 'RttiType', 'SnSelection': 'begin end',
     'UiAppDisabler': 'UiAppDisabler ~UiAppDisabler',
     'UiAppMgr': 'getInstance getMainPanel getMainWindow getSelection getTopLevel releaseTopLevel setTopLevel',
-    'UiApplication': 'getInstance localMessageLoop',
-    'UiColorRegistry': 'getColor getInstance',
+    'UiApplication': 'getInstance localMessageLoop', 'UiColorRegistry': 'getColor getInstance',
     'UiConstraint': 'UiConstraint getUIGrid pixelsToUIUnits ~UiConstraint',
     'UiContainer': 'create findWidget findWidgets front getChildren setFocusWidget',
-    'UiCursorGuard': 'UiCursorGuard ~UiCursorGuard',
-    'UiDualState': 'getState setState',
-    'UiFloatingHandler': 'getContainer',
-    'UiFrameLineBottom': 'UiFrameLineBottom',
-    'UiLabel': 'create getLabel',
-    'UiMenu': 'append getStrPtr removeAll setSelection',
-    'UiMoveContainer': 'create',
-    'UiString': 'setString',
-    'UiTextField': 'getString setString',
-    'UiTopLevel': 'create',
-    'UiWidget': ('clearParent getClientDataListPtr getClientDataListSize getName getParent getPiWidget getRect isDisplayed '
-                 'isEnabled setColor setConstraint setEnabled setFrame setKeyboardFocusable setPointerDownCb '
-                 'setPointerMoveCb setPointerUpCb setWidgetResTable'),
-    'UiWidgetFactory': 'createWidget',
-    'UiWidgetPredicate': 'isType nameStartsWith',
-    'UiWorkspace': 'getCurrentWorkspace',
-    'WsFont': 'getStringWidth',
-    'WsFontRegistry': 'getDefaultFont getInstance',
-    'WsScreen': 'getInstance getSize',
-    'WsWindow': 'flushAllEvents',
-    'WsWindowStyleUtils': 'getNormalWindowStyle',
+    'UiCursorGuard': 'UiCursorGuard ~UiCursorGuard', 'UiDualState': 'getState setState',
+    'UiFloatingHandler': 'getContainer', 'UiFrameLineBottom': 'UiFrameLineBottom', 'UiLabel': 'create getLabel',
+    'UiMenu': 'append getStrPtr removeAll setSelection', 'UiMoveContainer': 'create', 'UiString': 'setString',
+    'UiTextField': 'getString setString', 'UiTopLevel': 'create',
+    'UiWidget': ('clearParent getClientDataListPtr getClientDataListSize getName getParent getPiWidget getRect '
+                 'isDisplayed isEnabled setColor setConstraint setEnabled setFrame setKeyboardFocusable '
+                 'setPointerDownCb setPointerMoveCb setPointerUpCb setWidgetResTable'),
+    'UiWidgetFactory': 'createWidget', 'UiWidgetPredicate': 'isType nameStartsWith',
+    'UiWorkspace': 'getCurrentWorkspace', 'WsFont': 'getStringWidth', 'WsFontRegistry': 'getDefaultFont getInstance',
+    'WsScreen': 'getInstance getSize', 'WsWindow': 'flushAllEvents', 'WsWindowStyleUtils': 'getNormalWindowStyle',
     'XmlDocument': 'XmlDocument getRoot ~XmlDocument',
     'XmlWriter': 'XmlWriter closeTag openTag writeAttrib writeTag ~XmlWriter',
 }

@@ -8,7 +8,7 @@ import shutil
 
 import pytest
 
-from quorvane_velmora import ui
+from quorvane_velmora import graph, ui
 from scripts import TREE, run_script
 
 pytestmark = pytest.mark.standalone
@@ -126,6 +126,7 @@ WORKSPACE_METHODS = {
     'getCurrentComposition': '', 'getCompositions': '', 'getNbCompositions': '', 'openComposition': 'path',
     'isCompositionOpened': 'path', 'getBrowserSelection': '',
 }
+TABLES = {ui: FUNCTIONS, ui.Dialog: METHODS, ui.Workspace: WORKSPACE_METHODS}
 # A value of the right type for each; with them no call gets as far as showing a window.
 VALUES = {'title': 't', 'xmlFile': '/missing', 'width': 1, 'height': 1, 'initialValues': {}, 'list': [()],
           'cancelButton': True, 'messages': [1], 'closeButtons': [], 'widgets': [], 'xmlString': XML,
@@ -160,19 +161,21 @@ def is_refused(call, *arguments, **keywords):
     return False
 
 
-@pytest.mark.parametrize('name', FUNCTIONS)
-def test_functions_take_by_name_just_what_can_be_left_out(name):
-    function = getattr(ui, name)
-    parameters, required = parameters_of(name, FUNCTIONS)
+@pytest.mark.parametrize('owner, name', [(ui, name) for name in FUNCTIONS] + [(ui.Dialog, name) for name in METHODS])
+def test_arguments_go_by_name_just_where_a_function_can_do_without_them(owner, name):
+    dialog = ui.createDialog('t', XML)
+    call = getattr(ui if owner is ui else dialog, name)
+    parameters, required = parameters_of(name, TABLES[owner])
     values = [VALUES[parameter] for parameter in parameters]
-    assert is_refused(function, *values, unknown=1)
+    assert is_refused(call, *values, unknown=1)
+    assert owner is ui or is_refused(getattr(owner, name), self=dialog, **dict(zip(parameters, values)))
     for index, parameter in enumerate(parameters):
         allowed = index >= required
         rest = dict(zip(parameters[index:], values[index:]))
-        assert is_refused(function, *values[:index], **{parameter: values[index]}) != allowed, parameter
-        assert is_refused(function, *values[:index], **rest) != allowed, parameter
+        assert is_refused(call, *values[:index], **{parameter: values[index]}) != allowed, parameter
+        assert is_refused(call, *values[:index], **rest) != allowed, parameter
         if index != required:
-            assert is_refused(function, *values[:required], **{parameter: values[index]}), parameter
+            assert is_refused(call, *values[:required], **{parameter: values[index]}), parameter
 
 
 @pytest.mark.parametrize('call, note', [
@@ -199,32 +202,13 @@ def test_a_refused_call_says_which_argument_by_name_is_in_the_way(call, note):
         assert str(caught.value).startswith('Python argument types in\n')
 
 
-@pytest.mark.parametrize('name', METHODS)
-def test_methods_take_nothing_by_name(name):
-    dialog = ui.createDialog('t', XML)
-    parameters, _ = parameters_of(name, METHODS)
-    values = [VALUES[parameter] for parameter in parameters]
-    assert is_refused(getattr(dialog, name), *values, unknown=1)
-    assert is_refused(getattr(ui.Dialog, name), self=dialog, **dict(zip(parameters, values)))
-    for index, parameter in enumerate(parameters):
-        assert is_refused(getattr(dialog, name), *values[:index], **{parameter: values[index]})
-        assert is_refused(getattr(dialog, name), *values[:index], **dict(zip(parameters[index:], values[index:])))
-
-
-def test_a_dialog_has_no_constructor_for_scripts():
-    with pytest.raises(RuntimeError):
-        ui.Dialog()
+def test_dialogs_and_graphs_have_no_constructor_for_scripts():
+    for kind in ui.Dialog, graph.Graph:
+        with pytest.raises(RuntimeError):
+            kind()
     assert type(ui.createDialog('t', XML)) is ui.Dialog
 
 
-def test_the_module_has_one_exception_whose_text_is_the_reason():
-    assert issubclass(ui.UiError, Exception) and ui.UiError.__name__ == 'UiError'
-    with pytest.raises(ui.UiError) as caught:
-        ui.showDialog('t', '/no/such file')
-    assert str(caught.value) == 'Error opening file: /no/such file'
-
-
-TABLES = {ui: FUNCTIONS, ui.Dialog: METHODS, ui.Workspace: WORKSPACE_METHODS}
 DEFAULTS = {'width': 'Defaults to -1', 'height': 'Defaults to -1', 'initialValues': 'Defaults to {}',
             'closeButtons': 'Defaults to []', 'cancelButton': 'Default is C{False}',
             'invokeCallback': 'Defaults to C{True}', 'initialPath': 'Defaults to ""',

@@ -1,5 +1,7 @@
 """The values of widgets, as scripts read and write them."""
 
+from unittest.mock import Mock
+
 import pytest
 
 from descriptions import close_button, container, text, widget
@@ -113,10 +115,7 @@ def test_a_refused_text_or_state_changes_nothing(write, name, value, failure):
 
 
 def test_what_a_callback_raises_in_a_setter_says_nothing_of_the_value(write):
-    def fail(*_):
-        raise KeyError('mine')
-
-    dialog = make()
+    dialog, fail = make(), Mock(side_effect=KeyError('mine'))
     for name, value in ('Show', 'x'), ('Win', True), ('Prize', (['c'], 0)):
         for event in ui.EventType.STATE, ui.EventType.VALUE_CHANGED:
             dialog.addCallback(name, event, fail)
@@ -185,13 +184,11 @@ def test_a_field_without_text_is_passed_over_only_where_it_stands_in_a_container
 
 def test_what_the_user_did_is_the_value_without_enter(user):
     dialog = make({'Show': 'old'})
-    user.plan(lambda user: user.type('New'),
-              lambda user: user.click('Win'),
-              lambda user: (user.find('Prize').setFocus(), user.press(Qt.Key.Key_Down)),
-              lambda user: values.append(dialog.getValues()),
-              lambda user: user.close())
     values = []
-    dialog.launch()
+    user.run(dialog, lambda user: user.type('New'),
+             lambda user: user.click('Win'),
+             lambda user: (user.find('Prize').setFocus(), user.press(Qt.Key.Key_Down)),
+             lambda user: values.append(dialog.getValues()))
     assert values == [{'Show': 'New', 'Win': True, 'Prize': 'b'}]
     assert dialog.getValues() == {**values[0], 'CloseButtonClicked': 'CloseButton_OK'}
 
@@ -213,8 +210,7 @@ def test_what_a_script_writes_while_the_dialog_is_open_stands_on_the_screen(user
         user.type('x')
         assert dialog.getValue('Show') == 'x'
 
-    user.plan(write_and_look, type_into_nothing, lambda user: user.close())
-    dialog.launch()
+    user.run(dialog, write_and_look, type_into_nothing)
 
 
 def test_the_close_button_stands_among_the_values_from_its_press_on(user):

@@ -7,6 +7,7 @@ from xml.etree import ElementTree
 
 import pytest
 
+from descriptions import container, text, widget
 from quorvane_velmora import ui
 from PyQt6.QtGui import QFontMetrics
 from PyQt6.QtWidgets import QApplication, QLabel, QPushButton
@@ -20,30 +21,8 @@ def shape(element):
     return element.tag, list(element.attrib.items()), (element.text or '') if not children else '', children
 
 
-def node(tag, *children, content='', **attributes):
-    return tag, list(attributes.items()), content, list(children)
-
-
-def layout(*places):
-    names = ('Value', 'Type', 'Target', 'Sibling')
-    edges = [node(edge, **dict(zip(names, place.split()))) for edge, place in zip(EDGES, places)]
-    return node('Layout', node('Constraint', *edges))
-
-
-def label_string(text):
-    return node('LabelString', node('Text', content=text))
-
-
 def align(horizontal):
-    return node('LabelAlign', node('Align', H=horizontal, V='Center'))
-
-
-def container(name, places, *children):
-    return node('Container', node('Widget', layout(*places), Name=name), node('Group', *children, Type='Children'))
-
-
-def widget(kind, name, *properties):
-    return node(kind, node('Widget', *properties, Name=name))
+    return '<LabelAlign><Align H="%s" V="Center"/></LabelAlign>' % horizontal
 
 
 def make(widgets, *close_buttons):
@@ -67,43 +46,38 @@ def test_two_entries_give_the_whole_document():
     document = ui.makeXmlFromWidgetList([('TextField', 'Show', 'Show', 'Academy Awards'),
                                          ('ToggleButton', 'Win', 'Do you win ?', True)], ['OK', 'Cancel'])
     buttons = container(
-        'CloseButtonsContainer', ['0 u l', '0 u b', '0 uu r', '5 u h'],
-        widget('PushButton', 'CloseButton_OK', label_string('OK'), layout('0 u l', '0 u b', '12 u w', '4 u h'),
-               align('Center')),
-        widget('PushButton', 'CloseButton_Cancel', label_string('Cancel'),
-               layout('12 u w', '0 u b', '0 uu r', '4 u h'), align('Center')))
+        'CloseButtonsContainer',
+        widget('PushButton', 'CloseButton_OK', '0 u l', '0 u b', '12 u w', '4 u h', ahead=text('OK'),
+               content=align('Center')),
+        widget('PushButton', 'CloseButton_Cancel', '12 u w', '0 u b', '0 uu r', '4 u h', ahead=text('Cancel'),
+               content=align('Center')), places=('0 u l', '0 u b', '0 uu r', '5 u h'))
     rows = container(
-        'UserDefinedWidgetsContainer', ['0 u l', '1 u s CloseButtonsContainer', '0 uu r', '0 uu t'],
-        widget('Label', 'Label_Show', layout('0 u l', '4 u h', '15 u w', '0 uu t'), label_string('Show'),
-               align('Left')),
-        widget('TextField', 'Show', layout('15 u l', '4 u h', '-1 uu r', '0 uu t'), align('Left'),
-               label_string('Academy Awards')),
-        widget('Label', 'Label_Do you win ?', layout('0 u l', '4 u h', '15 u w', '-4 uu t'),
-               label_string('Do you win ?'), align('Left')),
-        widget('ToggleButton', 'Win', layout('15 u l', '4 u h', '4 uu w', '-4 uu t'), align('Left'),
-               node('State', node('Int', content='1'))))
-    main = container('MainContainer', ['1 u l', '1 u b', '-1 uu r', '-4 uu t'], buttons, rows)
-    assert shape(ElementTree.fromstring(document)) == main
+        'UserDefinedWidgetsContainer',
+        widget('Label', 'Label_Show', '0 u l', '4 u h', '15 u w', '0 uu t', content=text('Show') + align('Left')),
+        widget('TextField', 'Show', '15 u l', '4 u h', '-1 uu r', '0 uu t',
+               content=align('Left') + text('Academy Awards')),
+        widget('Label', 'Label_Do you win ?', '0 u l', '4 u h', '15 u w', '-4 uu t',
+               content=text('Do you win ?') + align('Left')),
+        widget('ToggleButton', 'Win', '15 u l', '4 u h', '4 uu w', '-4 uu t',
+               content=align('Left') + '<State><Int>1</Int></State>'),
+        places=('0 u l', '1 u s CloseButtonsContainer', '0 uu r', '0 uu t'))
+    main = container('MainContainer', buttons, rows, places=('1 u l', '1 u b', '-1 uu r', '-4 uu t'))
+    assert shape(ElementTree.fromstring(document)) == shape(ElementTree.fromstring(main))
 
 
 @pytest.mark.parametrize('kind, value, right, properties', [
-    ('Label', 'text', '0 uu r', [label_string('text')]),
-    ('Menu', (['a', '', 'b'], 5), '20 uu w', [
-        node('MenuString', node('Text', content='a'), node('Text'), node('Text', content='b')),
-        node('Selection', node('Int', content='5'))]),
-    ('Menu', ([], -1), '20 uu w', [node('MenuString'), node('Selection', node('Int', content='-1'))]),
-    ('Gauge', 'ignored', '-1 uu r', []),
-    ('textfield', 'ignored', '-1 uu r', []),
-    ('TextField', None, '-1 uu r', []),
-    ('TextField', '', '-1 uu r', []),
-    ('Label', 0, '0 uu r', []),
-    ('ToggleButton', False, '4 uu w', []),
-    ('Menu', (), '20 uu w', []),
+    ('Label', 'text', '0 uu r', text('text')),
+    ('Menu', (['a', '', 'b'], 5), '20 uu w',
+     '<MenuString><Text>a</Text><Text/><Text>b</Text></MenuString><Selection><Int>5</Int></Selection>'),
+    ('Menu', ([], -1), '20 uu w', '<MenuString/><Selection><Int>-1</Int></Selection>'),
+    ('Gauge', 'ignored', '-1 uu r', ''), ('textfield', 'ignored', '-1 uu r', ''), ('TextField', None, '-1 uu r', ''),
+    ('TextField', '', '-1 uu r', ''), ('Label', 0, '0 uu r', ''), ('ToggleButton', False, '4 uu w', ''),
+    ('Menu', (), '20 uu w', ''),
 ])
 def test_a_kind_decides_the_width_and_how_its_value_is_written(kind, value, right, properties):
-    root = make([(kind, 'name', '', value, 'ignored', 5)])
-    row = shape(root.findall('.//Group')[-1][0])
-    assert row == widget(kind, 'name', layout('0 u l', '4 u h', right, '0 uu t'), align('Left'), *properties)
+    row = make([(kind, 'name', '', value, 'ignored', 5)]).findall('.//Group')[-1][0]
+    meant = widget(kind, 'name', '0 u l', '4 u h', right, '0 uu t', content=align('Left') + properties)
+    assert shape(row) == shape(ElementTree.fromstring(meant))
 
 
 def test_the_longest_label_in_bytes_makes_the_column_and_each_entry_a_row():
@@ -165,8 +139,11 @@ def test_a_line_far_wider_than_any_screen_has_at_least_the_room_that_it_needs(pa
 
 
 class Undecided:
+    def __init__(self, failure):
+        self._failure = failure
+
     def __bool__(self):
-        raise ArithmeticError('undecided')
+        raise self._failure
 
 
 INCOMPLETE = '^Incomplete widget description$'
@@ -182,7 +159,8 @@ INCOMPLETE = '^Incomplete widget description$'
     (('Menu', 'a', 'l', ['x']), TypeError, ''), (('Menu', 'a', 'l', 'x'), TypeError, ''),
     (('Menu', 'a', 'l', (5, 0)), TypeError, ''), (('Menu', 'a', 'l', (('x',), 0)), TypeError, ''),
     (('Menu', 'a', 'l', (['x'], '0')), TypeError, ''), (('Menu', 'a', 'l', (['x', 5], 0)), TypeError, ''),
-    (('Menu', 'a', 'l', (['x'],)), IndexError, ''), (('TextField', 'a', 'l', Undecided()), ArithmeticError, ''),
+    (('Menu', 'a', 'l', (['x'],)), IndexError, ''),
+    (('TextField', 'a', 'l', Undecided(ArithmeticError())), ArithmeticError, ''),
     (('Text Field', 'a'), RuntimeError, 'Text Field'), (('', 'a'), RuntimeError, 'name'),
 ])
 def test_a_bad_entry_is_refused_and_the_next_list_works(entry, failure, words):
@@ -230,12 +208,8 @@ def test_a_note_says_which_value_a_row_was_given_and_is_left_out_where_it_cannot
         def __setattr__(self, name, value):
             raise OSError(name)
 
-    class Odd:
-        def __bool__(self):
-            raise Stubborn('odd')
-
     with pytest.raises(Stubborn, match='^odd$'):
-        make([('TextField', 'a', '', Odd())])
+        make([('TextField', 'a', '', Undecided(Stubborn('odd')))])
 
 
 NASTY = ['<&>"\'', '\ttab\t', 'two\nlines', 'dos\r\nend', '\r', ' leading', 'trailing ', '   ', '\n', 'clef 𝄞 😀',

@@ -19,10 +19,6 @@ ENABLE, DISABLE = ui.EventType.ENABLE, ui.EventType.DISABLE
 NAMES = ['Text', 'Toggle', 'Menu', 'Button', 'Note', 'Label_Caption', 'CloseButton_Cancel', 'UserDefinedWidgetsContainer']
 
 
-def close(user):
-    user.close()
-
-
 def go_through_every_operation(dialog, someone=None):
     """Changes and reads each state of each kind of widget; on the screen too, where a user sees it."""
     for name in NAMES:
@@ -42,8 +38,7 @@ def test_every_operation_acts_at_once_before_in_and_after_a_run(user):
     dialog = make_dialog()
     go_through_every_operation(dialog)
     for _ in range(2):
-        user.plan(lambda someone: go_through_every_operation(dialog, someone), close)
-        dialog.launch()
+        user.run(dialog, lambda someone: go_through_every_operation(dialog, someone))
         go_through_every_operation(dialog)
 
 
@@ -91,27 +86,31 @@ def test_a_widget_out_of_reach_keeps_its_value_and_takes_no_input(user, name, ta
             assert QApplication.focusWidget() is not widget
         assert QApplication.activePopupWidget() is None
 
-    user.plan(take if in_run else lambda _: None, disturb, close)
-    in_run or take()
-    dialog.launch()
+    if in_run:
+        user.run(dialog, take, disturb)
+    else:
+        take()
+        user.run(dialog, disturb)
     assert heard == []
     assert dialog.getValue(name) == values.get(name)
+
+
+def press_escape(user):
+    user.press(Qt.Key.Key_Escape)
 
 
 def test_escape_does_not_press_a_disabled_button(user):
     dialog = make_dialog()
     dialog.enableWidget('CloseButton_Cancel', False)
-    user.plan(lambda someone: someone.press(Qt.Key.Key_Escape), lambda someone: someone.ask_to_close(), close)
-    assert dialog.launch() == 'CloseButton_OK'
+    assert user.run(dialog, press_escape, lambda someone: someone.ask_to_close()) == 'CloseButton_OK'
 
 
 def test_escape_presses_the_only_button_that_is_left_when_the_others_are_hidden(user):
     dialog = ui.createDialog('Box', ui.makeXmlFromWidgetList([('PushButton', 'Button')], ['OK', 'Cancel']), 300, 100)
     dialog.hideWidget('CloseButton_Cancel')
-    user.plan(lambda someone: someone.press(Qt.Key.Key_Escape), close)
-    assert dialog.launch() == 'CloseButton_OK'
+    assert user.run(dialog, press_escape) == 'CloseButton_OK'
     dialog.hideWidget('Button')
-    user.plan(lambda someone: someone.press(Qt.Key.Key_Escape))
+    user.plan(press_escape)
     assert dialog.launch() == 'CloseButton_OK'
 
 
@@ -131,12 +130,10 @@ def test_a_hidden_widget_is_shown_where_its_constraint_says(user):
         places.append([QRect(someone.find(name).mapTo(window, QPoint(0, 0)), someone.find(name).size())
                        for name in names])
 
-    user.plan(look, resize, look, close)
-    other.launch()
-    user.plan(lambda _: [dialog.showWidget(name) for name in names], look,
-              lambda _: [dialog.hideWidget(name) for name in names], resize,
-              lambda _: [dialog.showWidget(name) for name in names], look, close)
-    dialog.launch()
+    user.run(other, look, resize, look)
+    user.run(dialog, lambda _: [dialog.showWidget(name) for name in names], look,
+             lambda _: [dialog.hideWidget(name) for name in names], resize,
+             lambda _: [dialog.showWidget(name) for name in names], look)
     assert places[:2] == places[2:]
     assert places[0] != places[1]
 
@@ -154,8 +151,7 @@ def test_only_a_real_change_of_the_enabled_state_raises_an_event(user):
         dialog.showWidget('Toggle')
 
     change()
-    user.plan(change, close)
-    dialog.launch()
+    user.run(dialog, change)
     assert heard == [('Toggle', DISABLE), ('Toggle', ENABLE)] * 2
 
 
@@ -170,10 +166,8 @@ def resource(tmp_path, monkeypatch):
     return tmp_path / 'ballot'
 
 
-def name_in_script(folder, dialog, widget, resource):
-    """Names the resource in a script that lies in the folder."""
-    script = folder / 'script.py'
-    script.write_text('dialog.setWidgetResourceName(widget, resource)')
+def name_in_script(script, dialog, widget, resource):
+    """Names the resource in a script, by whose place it is looked for."""
     runpy.run_path(str(script), {'dialog': dialog, 'widget': widget, 'resource': resource}, '__main__')
 
 
@@ -222,48 +216,45 @@ def test_a_tooltip_resource_is_found_by_its_path(user, resource, form):
     dialog = make_dialog()
     for name in ('Text', 'Button', 'Note'):
         dialog.setWidgetResourceName(name, form(resource))
-    user.plan(hover('Text'), close)
-    dialog.launch()
+    user.run(dialog, hover('Text'))
     assert user.tips == ['The text']
 
 
 def tips(user, dialog, *names):
     seen = []
-    user.plan(lambda user: seen.extend(user.find(name).toolTip() for name in names), close)
-    dialog.launch()
+    user.run(dialog, lambda user: seen.extend(user.find(name).toolTip() for name in names))
     return seen
 
 
 def test_a_bare_name_is_looked_for_in_the_application_and_then_beside_the_script(user, resource):
     folder = resource.parent / 'scripts'
     folder.mkdir()
+    script, link = folder / 'script.py', resource.parent / 'link.py'
+    script.write_text('dialog.setWidgetResourceName(widget, resource)')
+    link.symlink_to(script)
     (folder / 'votes.xml').write_text(TOOLTIPS.replace('Text', 'Name').replace('The', 'My'))
-    (folder / 'both').write_text(TOOLTIPS.replace('The', 'Bare'))
-    (folder / 'both.xml').write_text(TOOLTIPS.replace('The', 'Whole'))
-    (folder / 'bare').write_text(TOOLTIPS.replace('The', 'Bare'))
+    for name, word in ('both', 'Bare'), ('both.xml', 'Whole'), ('bare', 'Bare'):
+        (folder / name).write_text(TOOLTIPS.replace('The', word))
     form = [('TextField', name) for name in ('Name', 'Text')] + [('ToggleButton', 'Toggle')]
     dialog = ui.createDialog('t', ui.makeXmlFromWidgetList(form), 300, 140)
     seen = []
     for name in 'both', 'both.xml', 'bare', 'ballot', 'nowhere':
-        name_in_script(folder, dialog, 'Text', name)
+        name_in_script(script, dialog, 'Text', name)
         seen += tips(user, dialog, 'Text')
         dialog.setWidgetResourceName('Text', str(resource))
     assert seen == ['Whole text', 'Whole text', 'Bare text', 'The text', 'The text']
-    name_in_script(folder, dialog, 'Name', 'votes')
+    name_in_script(script, dialog, 'Name', 'votes')
     assert 'counted' in tips(user, dialog, 'Name')[0]
-    link = resource.parent / 'link.py'
-    link.symlink_to(folder / 'script.py')
-    runpy.run_path(str(link), {'dialog': dialog, 'widget': 'Text', 'resource': 'bare'}, '__main__')
+    name_in_script(link, dialog, 'Text', 'bare')
     assert tips(user, dialog, 'Text') == ['Bare text']
 
 
 def test_the_tooltip_of_a_widget_is_seen_on_hover_in_its_own_words(user, resource):
     dialog = make_dialog()
-    user.plan(lambda _: dialog.setWidgetResourceName('Toggle', str(resource)),
-              lambda _: dialog.setWidgetResourceName('Button', str(resource)),
-              lambda _: dialog.setWidgetResourceName('Toggle', 'unknown'),
-              lambda _: dialog.setWidgetResourceName('Toggle', ''), hover('Toggle'), hover('Button'), close)
-    dialog.launch()
+    user.run(dialog, lambda _: dialog.setWidgetResourceName('Toggle', str(resource)),
+             lambda _: dialog.setWidgetResourceName('Button', str(resource)),
+             lambda _: dialog.setWidgetResourceName('Toggle', 'unknown'),
+             lambda _: dialog.setWidgetResourceName('Toggle', ''), hover('Toggle'), hover('Button'))
     assert user.tips == ['Tick <b> & go', None]
 
 
@@ -274,14 +265,11 @@ def test_the_tooltip_of_a_widget_is_seen_on_hover_in_its_own_words(user, resourc
 def test_a_damaged_tooltip_resource_is_refused_with_words_and_changes_nothing(user, resource, text, words):
     dialog = make_dialog()
     dialog.setWidgetResourceName('Text', str(resource))
-    damaged = pathlib.Path('damaged.xml')
-    damaged.write_text(text)
+    pathlib.Path('damaged.xml').write_text(text)
     with pytest.raises(RuntimeError) as refused:
         dialog.setWidgetResourceName('Text', './damaged')
     assert 'damaged.xml' in str(refused.value) and words in str(refused.value).replace('Line', 'line')
-    user.plan(lambda someone: setattr(someone, 'tips', [someone.find('Text').toolTip()]), close)
-    dialog.launch()
-    assert user.tips == ['The text']
+    assert tips(user, dialog, 'Text') == ['The text']
 
 
 def test_a_dialog_looks_the_same_to_those_who_read_from_right_to_left(person, tmp_path):

@@ -34,6 +34,11 @@ class User:
             self._timer.timeout.connect(self._next)
             self._timer.start(5)
 
+    def run(self, dialog, *steps):
+        """Launches the dialog, which the user closes with OK after the steps, and gives what the launch does."""
+        self.plan(*steps, lambda user: user.close())
+        return dialog.launch()
+
     def stop(self):
         if self._timer is not None:
             self._timer.stop()
