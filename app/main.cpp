@@ -52,16 +52,15 @@ int run(CommandLine const& line)
     applyTheme();
     // The streams of Python copy what they write to it to the end.
     ScriptOutput output;
-    std::unique_ptr<Application> application;
     // The window goes while scripts can still hear of it. Where a script has deleted the application object it has lost
     // its screen already, and Qt cannot take the rest down.
-    Interpreter interpreter({[&application]
+    static auto& application = *new std::unique_ptr<Application>;
+    Interpreter interpreter({[]
                              {
-                                 if (!QCoreApplication::instance())
-                                     static_cast<void>(application.release());
-                                 application.reset();
+                                 if (QCoreApplication::instance())
+                                     application.reset();
                              },
-                             [&application]
+                             []
                              {
                                  if (application)
                                      application->keepUnsaved();
