@@ -3,7 +3,7 @@
 import gc
 import os
 import tempfile
-import threading
+from concurrent.futures import ThreadPoolExecutor
 
 import pytest
 
@@ -69,25 +69,22 @@ def test_a_window_has_an_icon_down_to_the_size_of_a_title_bar(user):
 
 
 @pytest.mark.standalone
-@pytest.mark.parametrize('own', [False, True], ids=['without', 'with'])
-def test_in_an_application_of_the_scripts_a_dialog_has_its_icon_or_ours(own):
-    printed = run_script('''
-import sys
+def test_in_an_application_of_the_scripts_a_dialog_has_our_icon_or_its():
+    assert run_script('''
 from PyQt6.QtCore import QTimer
 from PyQt6.QtGui import QIcon, QPixmap
 from PyQt6.QtWidgets import QApplication, QWidget
 application = QApplication([])
-if %s:
-    application.setWindowIcon(QIcon(QPixmap(7, 7)))
 from quorvane_velmora import ui
 def look():
     window = QApplication.activeModalWidget()
     print(len(window.windowIcon().availableSizes()), application.windowIcon().isNull())
     window.close()
-QTimer.singleShot(0, look)
-ui.showMessageBox('Box', ['text'])
-''' % own, QT_QPA_PLATFORM='offscreen')
-    assert printed == ('1 False\n' if own else '7 True\n')
+for icon in QIcon(), QIcon(QPixmap(7, 7)):
+    application.setWindowIcon(icon)
+    QTimer.singleShot(0, look)
+    ui.showMessageBox('Box', ['text'])
+''', QT_QPA_PLATFORM='offscreen') == '7 True\n1 False\n'
 
 
 def test_an_emoji_is_drawn_by_a_font_that_has_it(user):
@@ -421,33 +418,18 @@ def test_a_run_ends_when_others_delete_what_runs_or_quit_and_the_next_one_works(
 
 def test_a_thread_gets_no_user_interface_of_its_own():
     printed = run_script('''
-import threading
+from concurrent.futures import ThreadPoolExecutor
 from quorvane_velmora import ui
-def show():
-    try:
-        ui.showMessageBox('t', ['x'])
-    except RuntimeError as refusal:
-        print(refusal)
-thread = threading.Thread(target=show)
-thread.start()
-thread.join()
+print(repr(ThreadPoolExecutor().submit(ui.showMessageBox, 't', ['x']).exception()))
 ''', QT_QPA_PLATFORM='offscreen')
+    assert printed.startswith('RuntimeError')
     assert 'this is not the main thread' in printed or 'belongs to the thread that used it first' in printed
 
 
-def in_another_thread(action):
-    failures = []
-
-    def run():
-        try:
-            action()
-        except BaseException as failure:
-            failures.append(failure)
-
-    thread = threading.Thread(target=run)
-    thread.start()
-    thread.join()
-    return failures
+def failure_in_another_thread(action, *arguments):
+    """What it fails with there, or None."""
+    with ThreadPoolExecutor() as threads:
+        return threads.submit(action, *arguments).exception()
 
 
 @pytest.mark.parametrize('call', [
@@ -457,8 +439,8 @@ def in_another_thread(action):
 ])
 def test_a_call_from_another_thread_is_an_error_and_does_no_harm(user, call):
     dialog = make('OK')
-    failures = in_another_thread(lambda: call(dialog))
-    assert [type(failure) for failure in failures] == [RuntimeError] and 'thread' in str(failures[0])
+    failure = failure_in_another_thread(call, dialog)
+    assert type(failure) is RuntimeError and 'thread' in str(failure)
     assert dialog.getValue('Show') == '' and stage.active() is None
     user.plan(close)
     assert dialog.launch() == 'CloseButton_OK'
@@ -468,7 +450,7 @@ def test_dialogs_can_be_dropped_on_another_thread(user):
     held = [make('OK'), make('OK')]
     user.plan(close)
     held[1].launch()
-    assert in_another_thread(held.clear) == []
+    assert failure_in_another_thread(held.clear) is None
     user.plan(close)
     assert make('OK').launch() == 'CloseButton_OK'
     gc.collect()  # what failures of other tests still hold
