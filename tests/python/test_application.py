@@ -404,9 +404,8 @@ def test_a_script_that_is_picked_with_keys_alone_learns_what_is_selected(desk, t
     assert application.wait() == 0
 
 
-def start_form(desk, folder, script):
-    """Gives the application that runs the script, and the frame of its panel on the screen."""
-    write(folder, form='''
+def test_a_box_gives_the_keyboard_back_a_dialog_is_dragged_and_a_long_form_is_scrolled_to_its_buttons(desk, tmp_path):
+    write(tmp_path, form='''
         import stage
         from quorvane_velmora import ui
         from PyQt6.QtCore import QPoint, QTimer
@@ -414,41 +413,13 @@ def start_form(desk, folder, script):
         panel = stage.APPLICATION.findChild(QWidget, 'mainPanel')
         place = panel.mapTo(stage.APPLICATION, QPoint(0, 0))
         print(place.x(), place.y(), panel.width(), panel.height(), flush=True)
-        ''' + script)
-    application = desk.start(PROGRAM, '--exit', str(folder / 'form.py'))
-    left, top, width, height = map(int, application.stdout.readline().split())
-    window = desk.wait_for_window('Velmora')
-    return application, window.left + left, window.top + top, width, height
-
-
-def test_a_dialog_is_dragged_by_its_title_filled_in_by_keys_and_closed_where_it_stands(desk, tmp_path):
-    application, left, top, width, height = start_form(desk, tmp_path, '''
-        values = ui.showSimpleDialog('Form', [('TextField', 'Show', 'Show'), ('ToggleButton', 'Win', 'Win')], 400, True)
-        print(sorted(values.items()))
-        ''')
-    dialog_left, dialog_bottom = left + width // 2 - 200, top + height - (height // 2 - 112 // 2)
-    title = dialog_left + 200, dialog_bottom - 112 - 13
-    button = dialog_left + 49, dialog_bottom - 21
-    desk.run('type', 'Os')
-    desk.drag(title, (title[0] - 150, title[1] + 130))
-    desk.click(*button)  # where it is no more
-    desk.run('type', 'cars')
-    desk.run('key', 'Tab', 'space')
-    desk.click(button[0] - 150, button[1] + 130)
-    assert application.communicate()[0] == (
-        "[('CloseButtonClicked', 'CloseButton_OK'), ('Show', 'Oscars'), ('Win', True)]\n")
-    assert application.returncode == 0
-
-
-def test_a_box_gives_the_keyboard_back_a_drag_ends_and_a_long_form_is_scrolled_to_its_buttons(desk, tmp_path):
-    application, left, top, width, height = start_form(desk, tmp_path, '''
         dialog = ui.createDialog('Form', ui.makeXmlFromWidgetList([('TextField', 'Show')], ['OK', 'Cancel']), 400, 200)
         dialog.addCallback('Show', ui.EventType.VALUE_CHANGED, lambda *_: print(
             ui.showMessageBox('Box', ['Really?'], ['Yes', 'No']), flush=True))
         window, = stage.dialogs()
         def tell_when_it_runs():
             QTimer.singleShot(0, lambda: print('runs', flush=True))
-        for _ in range(3):
+        for _ in range(4):
             tell_when_it_runs()
             print(dialog.launch(), dialog.getValue('Show'), window.x(), window.y(), flush=True)
         del dialog, window
@@ -458,6 +429,10 @@ def test_a_box_gives_the_keyboard_back_a_drag_ends_and_a_long_form_is_scrolled_t
     def expect(line):
         assert application.stdout.readline() == line + '\n'
 
+    application = desk.start(PROGRAM, '--exit', str(tmp_path / 'form.py'))
+    left, top, width, height = map(int, application.stdout.readline().split())
+    window = desk.wait_for_window('Velmora')
+    left, top = window.left + left, window.top + top
     x, y = width // 2 - 200, height - (height // 2 - 100) - 225
     expect('runs')
     desk.run('type', 'Os')
@@ -475,7 +450,15 @@ def test_a_box_gives_the_keyboard_back_a_drag_ends_and_a_long_form_is_scrolled_t
     desk.run('key', 'Escape')
     expect('CloseButton_Cancel Oscars %d %d' % (x + 20, y + 10))
     expect('runs')
+    desk.run('type', 'Em')
+    desk.drag((title[0] + 20, title[1] + 10), (title[0] - 130, title[1] - 90))
+    button = left + x + 20 + 49, top + y + 10 + 225 - 21
+    desk.click(*button)  # where it is no more
+    desk.run('type', 'mys')
+    desk.click(button[0] - 150, button[1] - 100)
+    expect('CloseButton_OK Emmys %d %d' % (x - 130, y - 90))
+    expect('runs')
     desk.run('type', 'first')
-    desk.run('click', '--repeat', 60, 5)
+    desk.run('mousemove', *title, 'click', '--repeat', 60, 5)
     desk.click(left + x + 49, top + height - 21)
     assert application.communicate()[0] == 'first\n' and application.returncode == 0
