@@ -9,7 +9,6 @@ import zipfile
 
 import pytest
 
-from quorvane_velmora import ui
 from scripts import TREE, environment, needs_pyqt
 
 pytestmark = [pytest.mark.standalone, needs_pyqt]

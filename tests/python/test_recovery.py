@@ -173,8 +173,8 @@ def kept():
 def run_here(folder, script, *options, state='state', status=0):
     """What a script prints that has a composition open, and ends with that status."""
     (folder / 'shot.vmcomposition').write_text(COMPOSITION)
-    ended, printed, errors = run_inside(folder, HERE + textwrap.dedent(script), '--open', 'shot.vmcomposition', *options,
-                                        XDG_STATE_HOME=os.path.join(folder, state))
+    ended, printed, errors = run_inside(folder, HERE + textwrap.dedent(script), '--open', 'shot.vmcomposition',
+                                        *options, XDG_STATE_HOME=os.path.join(folder, state))
     assert ended == status, errors
     return printed
 
