@@ -177,7 +177,8 @@ def test_the_log_is_searched_copied_and_cleared_by_keys_and_buttons(tmp_path):
         def place():
             return log.textCursor().selectedText(), log.textCursor().blockNumber()
         places = [place()]
-        for modifier in Qt.KeyboardModifier.NoModifier, Qt.KeyboardModifier.NoModifier, Qt.KeyboardModifier.ShiftModifier:
+        none, shift = Qt.KeyboardModifier.NoModifier, Qt.KeyboardModifier.ShiftModifier
+        for modifier in none, none, shift:
             QTest.keyClick(field, Qt.Key.Key_Return, modifier)
             places.append(place())
         assert places == [('alpha', 1), ('Alpha', 3), ('alpha', 1), ('Alpha', 3)], places
@@ -204,8 +205,7 @@ def test_the_log_is_searched_copied_and_cleared_by_keys_and_buttons(tmp_path):
 
 def test_a_script_is_stopped_by_a_key_while_its_dialog_runs_and_no_other_command_can_be_used(desk, tmp_path):
     write(tmp_path, watching=WATCHING + textwrap.dedent('''
-        plan += [(1, 'script.py was stopped', lambda: trigger('Run Script Again')),
-                 (2, 'script.py has ended', stage.APPLICATION.close)]
+        plan += [(1, 'script.py was stopped', run_again), (2, 'script.py has ended', stage.APPLICATION.close)]
         '''), script=TOOLS + textwrap.dedent('''
         from forms import make_dialog, ui
 
@@ -233,16 +233,13 @@ def test_a_script_is_stopped_by_a_key_while_its_dialog_runs_and_no_other_command
 
 def test_a_script_that_keeps_the_window_from_answering_is_stopped_in_a_window_of_its_own(desk, tmp_path):
     write(tmp_path, watching=WATCHING + textwrap.dedent('''
-        def again():
-            trigger('Run Script Again')
-
         def press():
             button, = (one for one in stage.APPLICATION.findChildren(QPushButton) if one.text() == 'Button')
             button.click()
             print('over', flush=True)
             stage.APPLICATION.close()
 
-        plan += [(1, 'was stopped', again), (2, 'was stopped', again), (3, 'has ended', press)]
+        plan += [(1, 'was stopped', run_again), (2, 'was stopped', run_again), (3, 'has ended', press)]
         '''), script='''
         import time, watching
         from forms import make_dialog, ui
@@ -272,25 +269,21 @@ def test_scripts_and_the_look_of_the_window_are_remembered_from_one_run_to_the_n
     home = tmp_path / 'home'
     write(tmp_path, other='')
 
-    def session(name, *steps, options=()):
-        write(tmp_path, **{name: TOOLS + textwrap.dedent(steps[0])})
-        write(tmp_path, watching=WATCHING)
+    def session(name, script, *options):
+        """What a script prints that closes the window, unless that closes by itself."""
+        end = '' if options else '\nQTimer.singleShot(0, window.close)\n'
+        write(tmp_path, watching=WATCHING, **{name: TOOLS + textwrap.dedent(script) + end})
         status, printed, errors = run(tmp_path, PROGRAM, *options, name + '.py', XDG_CONFIG_HOME=str(home))
         assert status == 0, errors
         return printed.splitlines()
 
-    session('alone', 'stage.APPLICATION.resize(900, 500)', options=['--exit'])
+    session('alone', 'window.resize(900, 500)', '--exit')
     assert not home.exists()
-    session('first', '''
-        window.resize(900, 500)
-        trigger('Show Log')
-        QTimer.singleShot(0, window.close)
-        ''')
+    session('first', 'window.resize(900, 500); trigger("Show Log")')
     assert session('second', '''
         print(window.width(), window.height(), log.isVisible())
         print(recent_names())
         trigger('Show Log')
-        QTimer.singleShot(0, window.close)
         ''') == ['900 500 False', "['second.py', 'first.py']"]
     (tmp_path / 'first.py').unlink()
     assert session('gone', '''
@@ -301,14 +294,12 @@ def test_scripts_and_the_look_of_the_window_are_remembered_from_one_run_to_the_n
         print(said().endswith('first.py is not there any more'), recent_names())
         choose('Clear')
         print(recent_names(), recent())
-        QTimer.singleShot(0, window.close)
         ''') == ["True ['gone.py', 'second.py']", '[] []']
     settings, = home.rglob('*.ini')
     settings.write_bytes(b'[General\n\xff=\x00@ByteArray(\nwindow=@Variant(\0\0)\nscripts=@Invalid()\nrows=7\n')
     assert session('broken', '''
         print(window.isVisible() and window.width() > 500 and log.height() > 50)
         print(recent_names())
-        QTimer.singleShot(0, window.close)
         ''') == ['True', "['broken.py']"]
 
 

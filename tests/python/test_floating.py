@@ -6,6 +6,7 @@ import stage
 from forms import listen, make_dialog
 from descriptions import close_button, container, widget
 from quorvane_velmora import ui
+from user import click, close, look_at
 from PyQt6.QtCore import QEvent, QPoint, QPointF, QRect, Qt
 from PyQt6.QtGui import QGuiApplication, QMouseEvent, QWheelEvent
 from PyQt6.QtTest import QTest
@@ -70,14 +71,17 @@ def turn_wheel(widget, x=0, y=0):
         widget = widget.parent()
 
 
+def resize(width, height):
+    stage.APPLICATION.resize(width, height)
+    QApplication.processEvents()
+
+
 @pytest.fixture
 def small_panel():
     size = stage.APPLICATION.size()
-    stage.APPLICATION.resize(900, 640)
-    QApplication.processEvents()
+    resize(900, 640)
     yield panel()
-    stage.APPLICATION.resize(size)
-    QApplication.processEvents()
+    resize(size.width(), size.height())
 
 
 def the_dialog():
@@ -114,7 +118,7 @@ def test_a_dialog_gets_its_widgets_with_the_first_turn_and_none_if_it_goes_befor
     first, second = (make_dialog(title) for title in ('first', 'second'))
     assert [window.findChildren(QWidget) for window in stage.floating()] == [[], []]
     del first
-    user.plan(lambda user: user.close())
+    user.plan(close)
     ui.showMessageBox('A run needs all of them', ['?'])
     window, = stage.floating()
     assert stage.title_of(window) == 'second' and window.findChild(QWidget, 'Text').isVisible()
@@ -147,7 +151,7 @@ def test_a_dialog_is_dragged_and_never_out_of_reach(user, grip):
         seen = room.intersected(window.geometry())
         assert seen.width() >= 48 and seen.height() >= 24 and room.top() <= window.y() <= room.bottom() - 23
     drag(grip(window), (0, 200))
-    user.plan(lambda user: user.close())
+    user.plan(close)
     assert dialog.launch() == 'CloseButton_OK'
 
 
@@ -217,8 +221,7 @@ def test_a_dialog_larger_than_the_panel_fills_it_and_scrolls_as_far_as_it_was_ma
     turn_wheel(low, x=-50)
     turn_wheel(low, y=50)
     assert not high.visibleRegion().isEmpty() and title_bar(window).pos() == QPoint(0, 0)
-    stage.APPLICATION.resize(1700, 1200)
-    QApplication.processEvents()
+    resize(1700, 1200)
     assert window.geometry() == QRect(0, 0, 1000, 825) and not bars(window)
     drag(title_bar(window), (50, 50))
     assert window.pos() == QPoint(50, 50) and dialog.getValues() == {}
@@ -232,7 +235,7 @@ def test_a_bar_stands_beside_what_a_dialog_was_given(small_panel):
         del dialog
 
 
-def test_no_row_of_a_long_form_is_passed_over_by_pages_and_the_wheel_changes_no_menu(user, small_panel):
+def test_a_long_form_shows_each_row_to_pages_scrolls_by_the_wheel_and_follows_the_keyboard_around(user, small_panel):
     names = ['row %d' % row for row in range(40)]
     form = [('Menu' if row % 2 else 'TextField', name, 'row', (['a', 'b'], 0) if row % 2 else 'text')
             for row, name in enumerate(names)]
@@ -258,41 +261,34 @@ def test_no_row_of_a_long_form_is_passed_over_by_pages_and_the_wheel_changes_no_
         assert bar.value() == bar.maximum() and seen == {*names, 'CloseButton_OK'}
         for name in names[::-2]:  # the menus
             turn_wheel(user.find(name), y=3)
-        assert bar.value() == 0
-        user.press(Qt.Key.Key_Backtab)
-        assert bar.value() == bar.maximum() and user.focus() == 'CloseButton_OK'
-        user.close()
+        assert bar.value() == 0 and user.focus() == 'row 0'
 
-    user.plan(*[page(Qt.Key.Key_PageDown)] * 4, wheel)
+    def go_around(user):
+        for key, name in (Qt.Key.Key_Backtab, 'CloseButton_OK'), (Qt.Key.Key_Tab, 'row 0'):
+            user.press(key)
+            assert user.focus() == name and not user.find(name).visibleRegion().isEmpty()
+
+    user.plan(*[page(Qt.Key.Key_PageDown)] * 4, wheel, go_around, close)
     values = ui.showSimpleDialog('Long', form, 300)
     assert values['row 1'] == 'a' and values['row 39'] == 'a'
 
 
 def test_a_field_wider_than_the_panel_opens_with_its_beginning(user, small_panel):
-    user.plan(lambda user: places.append(user.find('Text').mapTo(user.window(), QPoint(0, 0)).x()),
-              lambda user: user.close())
-    places = []
-    ui.showSimpleDialog('Wide', [('TextField', 'Text', 'A caption')], 1200)
-    assert places[0] > 70, 'the caption is seen'
+    place = look_at(user, lambda: ui.showSimpleDialog('Wide', [('TextField', 'Text', 'A caption')], 1200),
+                    lambda user: user.find('Text').mapTo(user.window(), QPoint(0, 0)))
+    assert place.x() > 70, 'the caption is seen'
 
 
-def test_dialogs_keep_their_place_and_stay_within_reach_when_the_panel_changes():
+def test_dialogs_keep_their_place_and_stay_within_reach_when_the_panel_changes(small_panel):
     dialog = ui.createDialog('Followed', PLAIN, 200, 100)
     window = the_dialog()
-    place, size = window.pos(), stage.APPLICATION.size()
-    try:
-        stage.APPLICATION.resize(size.width() + 90, size.height() + 70)
-        QApplication.processEvents()
-        assert window.pos() == place
-        drag(title_bar(window), (9000, 9000))
-        stage.APPLICATION.resize(size.width() - 60, size.height() - 80)
-        QApplication.processEvents()
-        assert panel().rect().intersected(window.geometry()).height() >= 24
-        assert panel().rect().intersected(window.geometry()).width() >= 48
-    finally:
-        stage.APPLICATION.resize(size)
-        QApplication.processEvents()
-    assert dialog.isDisplayed('titleBar')
+    place = window.pos()
+    resize(990, 710)
+    assert window.pos() == place
+    drag(title_bar(window), (9000, 9000))
+    resize(840, 560)
+    seen = small_panel.rect().intersected(window.geometry())
+    assert seen.height() >= 24 and seen.width() >= 48 and dialog.isDisplayed('titleBar')
 
 
 @pytest.mark.parametrize('description', ['<Container>', '', PLAIN.replace('Name="OK"', 'Name="CloseButton_OK" Id="1"'),
@@ -308,11 +304,10 @@ def test_a_description_that_fails_leaves_nothing_behind(description):
 
 
 def test_what_has_no_room_scrolls_under_the_title():
-    dialog = make_dialog('Small')
-    del dialog
-    dialog = ui.createDialog('Small', ui.makeXmlFromWidgetList([('TextField', 'row %d' % row, 'row') for row in range(40)]),
-                             300, 200)
+    form = [('TextField', 'row %d' % row, 'row') for row in range(40)]
+    dialog = ui.createDialog('Small', ui.makeXmlFromWidgetList(form), 300, 200)
     QApplication.processEvents()
+    assert dialog.isDisplayed('titleBar')
     (orientation, bar), = bars(the_dialog()).items()
     assert orientation == Qt.Orientation.Vertical
     button = the_dialog().findChild(QWidget, 'CloseButton_OK')
@@ -352,8 +347,7 @@ def test_the_application_takes_no_input_during_a_run_and_is_afterwards_as_before
     for _ in range(2):
         before = states()
         assert before == ([True] * 3, dict.fromkeys(stage.titles(), True))
-        patient.plan(disturb, lambda user: user.click('Button'), disturb, lambda user: user.close(),
-                     lambda user: user.close('Cancel'))
+        patient.plan(disturb, click('Button'), disturb, close, click('CloseButton_Cancel'))
         assert outer.launch() == 'CloseButton_Cancel'
         nothing, (before_inner, during, after_inner) = [False] * 3, seen
         assert [state[0] for state in seen] == [nothing] * 3
@@ -372,7 +366,7 @@ def test_when_a_dialog_goes_the_front_most_has_the_keyboard_where_it_was(user):
     holders = {title: window.findChild(QWidget, title) for title, window in windows.items()}
     for holder in files, *holders.values():
         holder.setFocus()
-    user.plan(lambda user: user.close())
+    user.plan(close)
     ui.showMessageBox('Box', ['?'])
     assert QApplication.focusWidget() is holders['Menu']
     drag(title_bar(windows['Text']), (1, 1))
@@ -399,22 +393,5 @@ def test_a_dialog_made_in_a_callback_is_usable_while_the_outer_one_runs(patient)
         made[0].addCallback('Button', ui.EventType.ACTIVATE, lambda *_: clicks.append(stage.titles()))
 
     outer.addCallback('Button', ui.EventType.ACTIVATE, make)
-    patient.plan(lambda user: user.click('Button'), lambda user: user.click('Button'),
-                 lambda user: made.clear(), lambda user: user.close())
+    patient.plan(click('Button'), click('Button'), lambda user: made.clear(), close)
     assert outer.launch() == 'CloseButton_OK' and clicks == [['outer', 'palette']]
-
-
-def test_the_keyboard_goes_around_in_the_dialog_and_brings_it_into_view(user):
-    height = panel().height()
-    rows = [('TextField', 'row %d' % row, 'row') for row in range(height // 28 + 4)]
-
-    def walk(user):
-        assert user.focus() == 'row 0'
-        user.press(Qt.Key.Key_Backtab)
-        assert user.focus() == 'CloseButton_OK' and not user.find('CloseButton_OK').visibleRegion().isEmpty()
-        user.press(Qt.Key.Key_Tab)
-        assert user.focus() == 'row 0' and not user.find('row 0').visibleRegion().isEmpty()
-        user.close()
-
-    user.plan(walk)
-    assert ui.showSimpleDialog('Tall', rows, 300)['CloseButtonClicked'] == 'CloseButton_OK'

@@ -10,6 +10,7 @@ import pytest
 from callback_tools import run_script
 from forms import make_dialog
 from quorvane_velmora import ui
+from user import click, close
 from PyQt6.QtCore import QEvent
 from PyQt6.QtWidgets import QApplication
 
@@ -75,6 +76,16 @@ def attribute_of_the_dialog(dialog):
     return [dialog.callback]
 
 
+def collects_while_it_runs(dialog):
+    def callback(given, *_):
+        gc.collect()
+        assert given.getValue('Text') == 'old'
+    callback.circle = callback, dialog
+    dialog.addCallback('Toggle', STATE, callback)
+    dialog.setValue('Toggle', True)
+    return [callback]
+
+
 def two_dialogs_crosswise(dialog):
     other = make_dialog()
     for one, two in ((dialog, other), (other, dialog)):
@@ -83,7 +94,7 @@ def two_dialogs_crosswise(dialog):
 
 
 MADE_BY = [closure, bound_method, stores_given_in_itself, stores_every_given_in_a_list, stores_given_beside_the_own,
-           attribute_of_the_dialog, two_dialogs_crosswise]
+           attribute_of_the_dialog, collects_while_it_runs, two_dialogs_crosswise]
 
 
 @pytest.mark.parametrize('launched', [False, True], ids=['never shown', 'launched'])
@@ -96,7 +107,7 @@ def test_a_circle_through_the_callables_goes_in_every_order_of_letting_go(user, 
         dialog = make_dialog()
         held = {place: thing for place, thing in enumerate([dialog] + make(dialog))}
         if launched:
-            user.plan(lambda someone: someone.click('Toggle'), lambda someone: someone.close())
+            user.plan(click('Toggle'), close)
             dialog.launch()
             assert len(QApplication.allWidgets()) > native
         del dialog
@@ -128,35 +139,14 @@ def test_a_second_object_of_the_dialog_keeps_its_callbacks_alive_and_at_work():
     assert heard == [True, False, True]
 
 
-def test_a_callable_goes_with_its_removal_and_with_its_dialog():
-    dialog = make_dialog()
-    first, second = Keeper(), Keeper()
-    kept = first.hear
-    dialog.addCallback('Toggle', STATE, kept)
-    dialog.addCallback('Toggle', STATE, second.hear)
-    gone_first, gone_second = weakref.ref(first), weakref.ref(second)
-    del first, second
-    dialog.removeCallback('Toggle', STATE, kept)
-    del kept
-    assert gone_first() is None and gone_second() is not None
+def test_a_callable_goes_with_its_dialog_at_once():
+    dialog, keeper = make_dialog(), Keeper()
+    dialog.addCallback('Toggle', STATE, keeper.hear)
+    gone = weakref.ref(keeper)
+    del keeper
+    assert gone() is not None
     del dialog
-    assert gone_second() is None
-
-
-def test_the_collector_may_come_in_the_middle_of_an_event(user):
-    dialog = make_dialog()
-    heard = []
-
-    def callback(given, *_):
-        gc.collect()
-        heard.append(given.getValue('Text'))
-
-    callback.circle = (callback, dialog)
-    dialog.addCallback('Button', ACTIVATE, callback)
-    user.plan(lambda someone: someone.click('Button'), lambda someone: someone.click('Button'),
-              lambda someone: someone.close())
-    dialog.launch()
-    assert heard == ['old'] * 2
+    assert gone() is None
 
 
 GROWTH = '''
@@ -246,8 +236,7 @@ def test_what_is_connected_to_a_native_widget_goes_with_it_and_not_before(user):
         field.textChanged.connect(lambda *_: heard.append(field.text()))
         wrappers.append(weakref.ref(field))
 
-    user.plan(connect, lambda someone: (gc.collect(), someone.find('Text').setText('new')),
-              lambda someone: someone.close())
+    user.plan(connect, lambda someone: (gc.collect(), someone.find('Text').setText('new')), close)
     dialog.pop().launch()
     gc.collect()
     assert len(heard) == 2 and heard[0] == 'new' and heard[1] is wrappers[0]()

@@ -1,14 +1,13 @@
 """A folder that does not answer, as that of a network in its bad hour, keeps nobody but its own reader."""
 
 import os
-import subprocess
 import textwrap
 
 import pytest
-from scripts import TREE, environment, needs_pyqt
+from scripts import TREE, needs_pyqt
 
-from test_application import COMPOSITION, PROGRAM, WATCHING, write
-from test_application_window import TOOLS
+from test_application import COMPOSITION
+from test_application_window import run_with_tools
 
 pytestmark = [pytest.mark.standalone, needs_pyqt]
 
@@ -80,21 +79,16 @@ def inside(tmp_path):
     (tmp_path / 'alive/other').touch()
 
     def run(script, *options):
-        write(tmp_path, script=TOOLS + HANGING + textwrap.dedent(script), watching=WATCHING)
         library = TREE / 'tests' / 'libhangingFolder.so'
         preload = ':'.join(filter(None, [os.environ.get('LD_PRELOAD'), str(library)]))
-        settings = environment(QT_QPA_PLATFORM='offscreen', QT_LOGGING_RULES='default.warning=false',
-                               LD_PRELOAD=preload, KV_HANGING_FOLDER=str(tmp_path / 'dead'),
-                               KV_HANGING_WHILE=str(tmp_path / 'gate'))
-        done = subprocess.run([PROGRAM, *options, 'script.py'], cwd=tmp_path, env=settings, capture_output=True,
-                              text=True, timeout=120)
-        assert done.returncode == 0, done.stderr
+        run_with_tools(tmp_path, HANGING + textwrap.dedent(script), *options, LD_PRELOAD=preload,
+                       KV_HANGING_FOLDER=str(tmp_path / 'dead'), KV_HANGING_WHILE=str(tmp_path / 'gate'))
         assert (tmp_path / 'gate').exists()
 
     return run
 
 
-def test_the_window_goes_elsewhere_and_shows_the_folder_once_it_answers(inside):
+def test_the_window_goes_elsewhere_shows_the_folder_once_it_answers_and_is_closed_while_it_does_not(inside):
     inside('''
         hang()
         pick_in(files, 'dead')
@@ -125,7 +119,8 @@ def test_the_window_goes_elsewhere_and_shows_the_folder_once_it_answers(inside):
         wait_for(lambda: waits(files))
         still_turns()
         assert names(files) == ['deep', 'file']
-        ''', '--exit')
+        QTimer.singleShot(0, window.close)
+        ''')
 
 
 def test_who_goes_there_again_and_again_leaves_few_threads(inside):
@@ -151,35 +146,35 @@ def test_who_goes_there_again_and_again_leaves_few_threads(inside):
 @pytest.mark.parametrize('initial', ['dead', 'dead/file', 'alive'])
 def test_a_script_asks_for_a_path_and_the_user_cancels_or_takes_another(inside, initial):
     inside('''
-        user = users.User()
+        user, initial = users.User(), %r
 
         def view(user):
             return user.find('Browser.list', QTreeView)
 
         def look(user):
-            wait_for(lambda: %r != 'alive' and waits(view(user)) or names(view(user)) == ['other'])
+            wait_for(lambda: initial != 'alive' and waits(view(user)) or names(view(user)) == ['other'])
             go(view(user), dead + '/new', None)
             user.click('OK')
             wait_for(lambda: waits(view(user)))
             still_turns()
 
         def leave(user):
-            go(view(user), alive, Qt.Key.Key_Return)
+            go(view(user), alive)
             wait_for(lambda: names(view(user)) == ['other'])
             user.click('OK')
 
         hang()
         user.plan(look, lambda user: user.press(Qt.Key.Key_Escape))
-        assert ui.showBrowser('Pick', %r) == ''
+        assert ui.showBrowser('Pick', initial) == ''
         user.plan(look, leave)
-        assert ui.showBrowser('Pick', %r) == alive
+        assert ui.showBrowser('Pick', initial) == alive
 
         # OK of the path that was typed counts once there is an answer.
         user.plan(look, lambda user: wake())
-        assert ui.showBrowser('Pick', %r) == dead + '/new'
+        assert ui.showBrowser('Pick', initial) == dead + '/new'
         user.judge()
         hang()
-        ''' % (initial, initial, initial, initial), '--exit')
+        ''' % initial, '--exit')
 
 
 def test_the_commands_of_the_window_refuse_what_does_not_answer(inside, tmp_path):
@@ -218,13 +213,3 @@ def test_the_commands_of_the_window_refuse_what_does_not_answer(inside, tmp_path
         ui.Workspace.openComposition(graph.readComposition(os.path.join(alive, 'shot.vmcomposition')))
         still_turns()
         ''', '--exit')
-
-
-def test_the_window_is_closed_while_the_folder_hangs(inside):
-    inside('''
-        hang()
-        go(files, dead)
-        QTest.keyClick(files, Qt.Key.Key_F5)
-        wait_for(lambda: waits(files))
-        QTimer.singleShot(0, window.close)
-        ''')

@@ -3,7 +3,7 @@
 import gc
 import os
 import tempfile
-import threading
+from concurrent.futures import ThreadPoolExecutor
 
 import pytest
 
@@ -12,6 +12,7 @@ from forms import make_dialog
 from descriptions import close_button, container, text, widget
 from quorvane_velmora import ui
 from scripts import run_script
+from user import click, close, look_at
 from PyQt6 import sip
 from PyQt6.QtCore import QRect, Qt
 from PyQt6.QtGui import QFontMetrics, QGuiApplication, QTextLayout
@@ -27,11 +28,7 @@ def make(*close_buttons, widgets=FORM, width=400, height=196):
 
 
 def launch(user, dialog, look):
-    """What `look` gives while the dialog is open; it is then closed."""
-    seen = []
-    user.plan(lambda user: seen.append(look(user)), lambda user: user.dismiss())
-    dialog.launch()
-    return seen[0]
+    return look_at(user, dialog.launch, look, lambda user: user.dismiss())
 
 
 @pytest.mark.standalone
@@ -51,19 +48,16 @@ def test_a_window_is_centred_by_its_content_and_has_24_pixels_more(user, size, c
 
 
 @pytest.mark.standalone
-def test_a_window_larger_than_the_screen_is_cut_to_it(user):
-    size = launch(user, make('OK', width=5000, height=4000), lambda user: user.window().size())
-    assert size.width() == 800
-    assert 700 < size.height() < 800, 'there is room for a title bar'
-
-
-@pytest.mark.standalone
-def test_a_window_bears_its_title_and_keeps_the_others_from_input(user):
+def test_a_window_is_cut_to_the_screen_bears_its_title_and_keeps_the_others_from_input(user):
     def look(user):
         window = user.window()
-        return window.windowTitle(), window.objectName(), window.windowModality()
+        assert window.windowTitle() == window.objectName() == 'Launched'
+        assert window.windowModality() == Qt.WindowModality.ApplicationModal
+        return window.size()
 
-    assert launch(user, make('OK'), look) == ('Launched',) * 2 + (Qt.WindowModality.ApplicationModal,)
+    size = launch(user, make('OK', width=5000, height=4000), look)
+    assert size.width() == 800
+    assert 700 < size.height() < 800, 'there is room for a title bar'
 
 
 def test_a_window_has_an_icon_down_to_the_size_of_a_title_bar(user):
@@ -75,25 +69,22 @@ def test_a_window_has_an_icon_down_to_the_size_of_a_title_bar(user):
 
 
 @pytest.mark.standalone
-@pytest.mark.parametrize('own', [False, True], ids=['without', 'with'])
-def test_in_an_application_of_the_scripts_a_dialog_has_its_icon_or_ours(own):
-    printed = run_script('''
-import sys
+def test_in_an_application_of_the_scripts_a_dialog_has_our_icon_or_its():
+    assert run_script('''
 from PyQt6.QtCore import QTimer
 from PyQt6.QtGui import QIcon, QPixmap
 from PyQt6.QtWidgets import QApplication, QWidget
 application = QApplication([])
-if %s:
-    application.setWindowIcon(QIcon(QPixmap(7, 7)))
 from quorvane_velmora import ui
 def look():
     window = QApplication.activeModalWidget()
     print(len(window.windowIcon().availableSizes()), application.windowIcon().isNull())
     window.close()
-QTimer.singleShot(0, look)
-ui.showMessageBox('Box', ['text'])
-''' % own, QT_QPA_PLATFORM='offscreen')
-    assert printed == ('1 False\n' if own else '7 True\n')
+for icon in QIcon(), QIcon(QPixmap(7, 7)):
+    application.setWindowIcon(icon)
+    QTimer.singleShot(0, look)
+    ui.showMessageBox('Box', ['text'])
+''', QT_QPA_PLATFORM='offscreen') == '7 True\n1 False\n'
 
 
 def test_an_emoji_is_drawn_by_a_font_that_has_it(user):
@@ -129,10 +120,8 @@ def test_the_longest_line_of_a_message_box_is_whole(user, line):
         assert QFontMetrics(label.font()).size(Qt.TextFlag.TextExpandTabs, line).width() <= label.width()
         assert user.window().width() - label.width() <= 14 + 6 + 7
         assert label.visibleRegion().boundingRect().width() == label.width()
-        user.close()
 
-    user.plan(look)
-    ui.showMessageBox('Box', ['short', line])
+    look_at(user, lambda: ui.showMessageBox('Box', ['short', line]), look)
 
 
 CONTROLS = {'\x1b[31mred\x1b[0m': '␛[31mred␛[0m', 'a\0' + 'b' * 60: 'a␀' + 'b' * 60, '\x01\b\f\x1f\x7f': '␁␈␌␟␡',
@@ -144,17 +133,15 @@ def test_a_message_box_shows_control_characters_as_signs_of_their_own(user):
         labels = [label for label in user.window().findChildren(QLabel) if label.objectName() == 'Msg']
         assert [label.text() for label in labels] == list(CONTROLS.values())
         assert max(label.sizeHint().width() for label in labels) <= labels[0].width()
-        user.close()
 
-    user.plan(look)
-    ui.showMessageBox('Output', list(CONTROLS))
+    look_at(user, lambda: ui.showMessageBox('Output', list(CONTROLS)), look)
 
 
 @pytest.mark.parametrize('tail', [b'', b'\0<what stands here is not read'])
 def test_a_description_is_read_from_a_file_up_to_its_first_nul(user, tmp_path, tail):
     path = tmp_path / 'façade.xml'
     path.write_bytes(ui.makeXmlFromWidgetList([('TextField', 'a')]).encode() + tail)
-    user.plan(lambda user: user.close())
+    user.plan(close)
     assert ui.showDialog('t', str(path), 300, 100, {'a': 'x'}) == {'a': 'x', 'CloseButtonClicked': 'CloseButton_OK'}
 
 
@@ -173,7 +160,7 @@ def test_a_bad_file_is_an_error_and_the_next_one_works(user, tmp_path, make_path
     with pytest.raises(failure, match=words.format(path)) as caught:
         ui.showDialog('t', path)
     assert caught.type is failure and not stage.dialogs()
-    user.plan(lambda user: user.close())
+    user.plan(close)
     assert ui.showDialog('t', str(tmp_path / 'good')) == {'CloseButtonClicked': 'CloseButton_OK'}
 
 
@@ -269,25 +256,23 @@ def test_tab_goes_as_the_eye_does_and_past_what_takes_no_input(user):
 
     stops = []
     dialog = make('OK', 'Cancel')
-    user.plan(walk(Qt.Key.Key_Tab), walk(Qt.Key.Key_Backtab), lambda user: user.close())
+    user.plan(walk(Qt.Key.Key_Tab), walk(Qt.Key.Key_Backtab), close)
     dialog.launch()
     order = ['Show', 'Win', 'Prize', 'Vote', 'CloseButton_OK', 'CloseButton_Cancel']
     assert stops == order + order[:1] + order[:0:-1]
     dialog.enableWidget('Show', False)
     dialog.hideWidget('Prize')
     stops.clear()
-    user.plan(walk(Qt.Key.Key_Tab), lambda user: user.close())
+    user.plan(walk(Qt.Key.Key_Tab), close)
     dialog.launch()
     assert stops == ['Win', 'Vote', 'CloseButton_OK', 'CloseButton_Cancel', 'Win', 'Vote']
 
 
 def test_a_dialog_can_be_launched_again_with_what_was_left_in_it(user):
     dialog = make('OK', 'Cancel')
-    user.plan(lambda user: user.type('kept'), lambda user: user.close())
+    user.plan(lambda user: user.type('kept'), close)
     assert dialog.launch() == 'CloseButton_OK' and not stage.dialogs()
-    user.plan(lambda user: texts.append(user.find('Show').text()), lambda user: user.close('Cancel'))
-    texts = []
-    assert dialog.launch() == 'CloseButton_Cancel' and texts == ['kept']
+    assert launch(user, dialog, lambda user: user.find('Show').text()) == 'kept'
     assert dialog.getValues()['Show'] == 'kept'
 
 
@@ -296,8 +281,7 @@ def test_only_push_buttons_named_for_it_close_a_dialog(user):
     named = widget('PushButton', 'CloseButton_', content=text('any label'))
     other = widget('PushButton', 'closeButton_Y', '0 u l', '4 u b', '9 u w', '4 u h')
     dialog = ui.createDialog('t', container('c', toggle, container('inner', named, other)))
-    user.plan(lambda user: user.click('CloseButton_X'), lambda user: user.click('closeButton_Y'),
-              lambda user: user.close(''))
+    user.plan(click('CloseButton_X'), click('closeButton_Y'), lambda user: user.close(''))
     assert dialog.launch() == 'CloseButton_' and dialog.getValue('CloseButton_X') is True
 
 
@@ -329,8 +313,7 @@ def test_a_dialog_opened_from_a_timer_has_its_own_window_and_those_beneath_take_
         with user.meanwhile(try_beneath, lambda user: user.close('No')):
             answers.append(ui.showMessageBox('Nested', ['?'], ['Yes', 'No']))
 
-    user.plan(open_box, lambda user: user.find('Show').setFocus(), lambda user: user.type('heard'),
-              lambda user: user.close())
+    user.plan(open_box, lambda user: user.find('Show').setFocus(), lambda user: user.type('heard'), close)
     assert outer.launch() == 'CloseButton_OK' and answers == ['No']
     assert outer.getValues()['Show'] == 'heard' and not stage.dialogs()
 
@@ -351,7 +334,7 @@ def press(key, focus):
     return pressed
 
 
-def ask():
+def ask(*_):
     assert ui.showMessageBox('Box', ['?'], ['Yes', 'No']) == 'No'
 
 
@@ -361,11 +344,11 @@ def run_inner(callback):
     return inner.launch()
 
 
-def ask_from_another():
-    assert run_inner(lambda *_: ask()) == 'CloseButton_Cancel'
+def ask_from_another(*_):
+    assert run_inner(ask) == 'CloseButton_Cancel'
 
 
-def fail_in_another():
+def fail_in_another(*_):
     with pytest.raises(ZeroDivisionError):
         run_inner(lambda *_: 1 / 0)
 
@@ -380,7 +363,7 @@ ANSWER = [press(Qt.Key.Key_Tab, 'CloseButton_Yes'), press(Qt.Key.Key_Return, 'Cl
 def test_the_keyboard_is_after_a_box_where_it_was_before(patient, interrupt, answer):
     dialog = make_dialog()
     for name in 'Text', 'Menu':
-        dialog.addCallback(name, ui.EventType.VALUE_CHANGED, lambda *_: interrupt())
+        dialog.addCallback(name, ui.EventType.VALUE_CHANGED, interrupt)
     patient.plan(enter('a'), *answer, enter('b'), *answer, press(Qt.Key.Key_Tab, 'Text'),
                  press(Qt.Key.Key_Tab, 'Toggle'), press(Qt.Key.Key_Down, 'Menu'), *answer,
                  press(Qt.Key.Key_Up, 'Menu'), *answer, press(Qt.Key.Key_Down, 'Menu'), *answer,
@@ -429,62 +412,24 @@ def test_a_run_ends_when_others_delete_what_runs_or_quit_and_the_next_one_works(
     dialog = make('OK')
     user.plan(end)
     assert dialog.launch() == '' and dialog.getValue('Show') == ''
-    user.plan(lambda user: user.close())
+    user.plan(close)
     assert ui.showMessageBox('after', ['it']) == 'OK'
-
-
-def test_a_second_interpreter_of_the_process_is_refused_with_words():
-    printed = run_script('''
-from quorvane_velmora import ui
-ui.makeXmlFromWidgetList([('PushButton', 'b')])
-try:
-    import _xxsubinterpreters as interpreters
-except ImportError:
-    import _interpreters as interpreters
-other = interpreters.create()
-interpreters.run_string(other, """
-try:
-    from quorvane_velmora import ui
-    ui.showMessageBox('t', ['x'])
-except Exception as refusal:
-    print(type(refusal).__name__, refusal)
-""")
-print('alive')
-''', QT_QPA_PLATFORM='offscreen')
-    refusal, alive = printed.splitlines()
-    assert 'main interpreter' in refusal or 'does not support' in refusal, refusal
-    assert alive == 'alive'
 
 
 def test_a_thread_gets_no_user_interface_of_its_own():
     printed = run_script('''
-import threading
+from concurrent.futures import ThreadPoolExecutor
 from quorvane_velmora import ui
-def show():
-    try:
-        ui.showMessageBox('t', ['x'])
-    except RuntimeError as refusal:
-        print(refusal)
-thread = threading.Thread(target=show)
-thread.start()
-thread.join()
+print(repr(ThreadPoolExecutor().submit(ui.showMessageBox, 't', ['x']).exception()))
 ''', QT_QPA_PLATFORM='offscreen')
+    assert printed.startswith('RuntimeError')
     assert 'this is not the main thread' in printed or 'belongs to the thread that used it first' in printed
 
 
-def in_another_thread(action):
-    failures = []
-
-    def run():
-        try:
-            action()
-        except BaseException as failure:
-            failures.append(failure)
-
-    thread = threading.Thread(target=run)
-    thread.start()
-    thread.join()
-    return failures
+def failure_in_another_thread(action, *arguments):
+    """What it fails with there, or None."""
+    with ThreadPoolExecutor() as threads:
+        return threads.submit(action, *arguments).exception()
 
 
 @pytest.mark.parametrize('call', [
@@ -494,19 +439,19 @@ def in_another_thread(action):
 ])
 def test_a_call_from_another_thread_is_an_error_and_does_no_harm(user, call):
     dialog = make('OK')
-    failures = in_another_thread(lambda: call(dialog))
-    assert [type(failure) for failure in failures] == [RuntimeError] and 'thread' in str(failures[0])
+    failure = failure_in_another_thread(call, dialog)
+    assert type(failure) is RuntimeError and 'thread' in str(failure)
     assert dialog.getValue('Show') == '' and stage.active() is None
-    user.plan(lambda user: user.close())
+    user.plan(close)
     assert dialog.launch() == 'CloseButton_OK'
 
 
 def test_dialogs_can_be_dropped_on_another_thread(user):
     held = [make('OK'), make('OK')]
-    user.plan(lambda user: user.close())
+    user.plan(close)
     held[1].launch()
-    assert in_another_thread(held.clear) == []
-    user.plan(lambda user: user.close())
+    assert failure_in_another_thread(held.clear) is None
+    user.plan(close)
     assert make('OK').launch() == 'CloseButton_OK'
     gc.collect()  # what failures of other tests still hold
     assert [window.objectName() for window in QApplication.topLevelWidgets()].count('Launched') == 0

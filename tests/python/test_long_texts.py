@@ -4,7 +4,8 @@ import pytest
 
 import stage
 from descriptions import close_button, container, text, widget
-from quorvane_velmora import testing, ui
+from quorvane_velmora import ui
+from user import close, look_at
 from PyQt6.QtCore import QEvent, QPoint, QPointF, QRect, Qt
 from PyQt6.QtGui import QContextMenuEvent, QFontMetrics, QHelpEvent, QMouseEvent
 from PyQt6.QtTest import QTest
@@ -42,10 +43,8 @@ def copy_from_menu(shown):
 
 def seen_in_box(user, look, messages, buttons=()):
     """What `look` gives while a message box is open; it is then closed by its last button."""
-    seen = []
-    user.plan(lambda user: seen.append(look(user)), lambda user: user.close((list(buttons) or ['OK'])[-1]))
-    ui.showMessageBox('Box', messages, list(buttons))
-    return seen[0]
+    return look_at(user, lambda: ui.showMessageBox('Box', messages, list(buttons)), look,
+                   lambda user: user.close((list(buttons) or ['OK'])[-1]))
 
 
 def test_a_text_is_shown_from_the_top_and_whole_in_a_tooltip(user):
@@ -63,13 +62,11 @@ def test_a_text_is_shown_from_the_top_and_whole_in_a_tooltip(user):
 @pytest.mark.parametrize('words', ['word ' * 1000, 'x' * 5000], ids=['words', 'one word'])
 def test_a_tooltip_has_no_endless_line(user, words):
     dialog = ui.createDialog('t', container('c', widget('Label', 'Msg', content=text(words)), close_button('OK', *TOP)))
-    tips = []
-    user.plan(lambda user: tips.append(ask_for_tip(label(user))), lambda user: user.close())
-    dialog.launch()
+    tip = look_at(user, dialog.launch, lambda user: ask_for_tip(label(user)))
     screen = QApplication.primaryScreen().availableSize()
-    size = QFontMetrics(QToolTip.font()).size(0, tips[0])
+    size = QFontMetrics(QToolTip.font()).size(0, tip)
     assert size.width() < screen.width() and size.height() < screen.height() // 2
-    assert tips[0].count('\n') > 3 and words.startswith(tips[0].split('\n')[0])
+    assert tip.count('\n') > 3 and words.startswith(tip.split('\n')[0])
 
 
 TOP = '0 u l', '-4 u t', '12 u w', '4 u h'
@@ -141,7 +138,7 @@ def test_a_text_is_selected_by_the_mouse_and_copied_and_a_click_takes_no_keyboar
         copied.append(copy_from_menu(label(user)))
 
     copied = []
-    user.plan(click_and_type, select, copy_whole, lambda user: user.close())
+    user.plan(click_and_type, select, copy_whole, close)
     words = 'A note <i>that</i> & is not whole\non its row\nor the next\nor any'
     values = ui.showSimpleDialog('t', [('TextField', 'Field'), ('Label', 'Msg', '', words)], 300)
     assert values['Field'] == 'typed' and copied == ['A note', words]
@@ -163,22 +160,18 @@ def test_a_push_button_draws_its_text_where_it_is_told_to(user):
                  if abs(picture.pixelColor(x, y).lightness() - ground) > 60]
         return min(inked), max(inked)
 
-    seen = []
     dialog = ui.createDialog('t', container('c', row('left', 0, align('Left')), row('center', 5, align('Center')),
                                             row('plain', 10), close_button('OK', *TOP)), 300, 200)
-    user.plan(lambda user: user.find('CloseButton_OK').setFocus(),
-              lambda user: seen.extend(map(ink, ('left', 'center', 'plain'))), lambda user: user.close())
-    dialog.launch()
-    left, center, plain = seen
+    user.plan(lambda user: user.find('CloseButton_OK').setFocus())
+    left, center, plain = look_at(user, dialog.launch, lambda user: [ink(name) for name in ('left', 'center', 'plain')])
     assert left[1] < 30 and center == plain and abs(sum(center) - 210) <= 4
 
 
 @pytest.mark.standalone
 def test_nothing_in_a_title_is_a_sign_for_qt(user):
-    seen = []
-    user.plan(lambda user: seen.append(user.window().windowHandle().title()), lambda user: user.close())
-    ui.showMessageBox('take [*] & <b>', ['?'])
-    assert seen == ['take [*] & <b>'] and not stage.dialogs()
+    title = look_at(user, lambda: ui.showMessageBox('take [*] & <b>', ['?']),
+                    lambda user: user.window().windowHandle().title())
+    assert title == 'take [*] & <b>' and not stage.dialogs()
 
 
 # The characters that Qt gets of a text to draw, and of one in a row that never scrolls.
@@ -204,16 +197,14 @@ def test_of_a_huge_text_qt_gets_a_part_and_the_script_has_the_whole(user, tmp_pa
                                              close_button('OK', *TOP)))
     dialog.setValues({'Field': huge, 'Menu': ([huge, 'other'], 0)})
     dialog.setWidgetResourceName('Field', str(tips))
-    found, copied = {}, []
-    user.plan(lambda user: found.update(look_at_huge_texts(user)), lambda user: copied.append(copy_from_menu(label(user))),
-              lambda user: user.close())
-    dialog.launch()
+    found, copied = look_at(user, dialog.launch, lambda user: (look_at_huge_texts(user), copy_from_menu(label(user))))
     for most, texts in found.items():
         # Emoji are two units for Qt; here they are one.
         sizes = [len(shown.encode('utf-16-le')) // 2 for shown in texts]
         assert max(sizes) in (most, most - 1)
         assert all(shown[:50] == huge[:50] and shown[-1] == '…' for shown, size in zip(texts, sizes) if size > 1000)
-    assert copied == [huge] and dialog.getValues() == {'Field': huge, 'Menu': huge, 'CloseButtonClicked': 'CloseButton_OK'}
+    assert copied == huge
+    assert dialog.getValues() == {'Field': huge, 'Menu': huge, 'CloseButtonClicked': 'CloseButton_OK'}
 
 
 def test_a_field_whose_text_is_too_long_is_looked_at_and_takes_no_edit(user):
@@ -240,7 +231,7 @@ def test_a_field_whose_text_is_too_long_is_looked_at_and_takes_no_edit(user):
         user.press(Qt.Key.Key_V, Qt.KeyboardModifier.ControlModifier)
 
     user.plan(edit('Field'), lambda user: tips.append(dialog.getValue('Field') == huge),
-              lambda user: dialog.setValue('Field', 'short'), edit('Field'), paste, lambda user: user.close())
+              lambda user: dialog.setValue('Field', 'short'), edit('Field'), paste, close)
     dialog.launch()
     assert tips == ['A text of 100001 characters is too long to be edited here.', True, '']
     # What is pasted ends where nothing more would be shown.

@@ -35,27 +35,34 @@ class Widget:
         return None
 
 
-class TextField(Widget):
+class Simple(Widget):
+    """One whose value is of one type, or None."""
+
     def __init__(self, name, value):
         super().__init__(name)
         self.value = value
 
     def row(self):
-        return 'TextField', self.name, 'C ' + self.name, self.value
+        return self.kind, self.name, 'C ' + self.name, self.value
 
     def read(self):
         return self.value
 
     def write(self, value, adds):
-        if value is not None and not isinstance(value, str):
+        if value is not None and not isinstance(value, self.taken):
             return TypeError
         self.value = value
 
     def make(self, randomly):
-        return randomly.choice([*TEXTS, None])
+        return randomly.choice(self.right)
 
     def wrong(self, randomly):
-        return randomly.choice([5, 1.5, ['a'], (['a'], 0)])
+        return randomly.choice(self.refused)
+
+
+class TextField(Simple):
+    kind, taken = 'TextField', str
+    right, refused = [*TEXTS, None], [5, 1.5, ['a'], (['a'], 0)]
 
     def fill(self, randomly):
         typed = randomly.choice(TEXTS)
@@ -64,29 +71,12 @@ class TextField(Widget):
         return typed
 
 
-class Toggle(Widget):
-    event = ui.EventType.STATE
-
-    def __init__(self, name, value):
-        super().__init__(name)
-        self.value = value
-
-    def row(self):
-        return 'ToggleButton', self.name, 'C ' + self.name, self.value
+class Toggle(Simple):
+    kind, taken, event = 'ToggleButton', int, ui.EventType.STATE
+    right, refused = [True, False, 0, 1, 7, None], ['on', 1.5, [True]]
 
     def read(self):
-        return self.value
-
-    def write(self, value, adds):
-        if value is not None and not isinstance(value, int):
-            return TypeError
-        self.value = bool(value)
-
-    def make(self, randomly):
-        return randomly.choice([True, False, 0, 1, 7, None])
-
-    def wrong(self, randomly):
-        return randomly.choice(['on', 1.5, [True]])
+        return bool(self.value)
 
     def fill(self, randomly):
         self.value = randomly.random() < 0.5

@@ -16,14 +16,13 @@ pytestmark = [pytest.mark.standalone, needs_pyqt]
 
 NAME = os.fsdecode(b'sh\xfft %1')
 CHANGE = '''
-import os, sys
 from quorvane_velmora import ui
 for shot in ui.Workspace.getCompositions():
-    shot.setNodeValue('Plate', 'file', sys.argv[1])
+    shot.setNodeValue('Plate', 'file', 'changed.exr')
 print('changed', flush=True)
 '''
 TELL = '''
-import os, stage
+import stage
 from quorvane_velmora import ui
 from PyQt6.QtWidgets import QPlainTextEdit
 stage.dialogs()
@@ -51,29 +50,27 @@ class Studio:
         return self.desk.start('env', 'XDG_STATE_HOME=%s' % (self.folder / 'state'), PROGRAM, *map(str, arguments),
                                cwd=self.folder)
 
-    def change(self, path, text='changed.exr'):
+    def change(self, path):
         """An application that has changes which are not saved."""
-        application = self.start('--open', path, 'change.py', text)
+        application = self.start('--open', path, 'change.py')
         assert application.stdout.readline() == 'changed\n'
         return application
 
-    def lose(self, path, text='changed.exr'):
-        application = self.change(path, text)
+    def lose(self, path):
+        application = self.change(path)
         application.kill()
         application.wait()
 
-    def ask(self, *keys):
-        """Starts, answers the question by keys, and gives what is open then and what the log says."""
-        application = self.start('tell.py')
-        self.desk.wait_for_window('Recover Changes')
-        return application, self.answer(application, *keys)
+    def ask(self, question='Recover Changes', options=()):
+        """An application that has a question."""
+        application = self.start(*options, 'tell.py')
+        self.desk.wait_for_window(question)
+        return application
 
     def answer(self, application, *keys):
+        """What is open when the keys have been pressed, and what the log says."""
         for key in keys:
             self.desk.run('key', key)
-        return self.told(application)
-
-    def told(self, application):
         lines = []
         while not lines or lines[-1] not in ('True', 'False'):
             lines.append(application.stdout.readline().rstrip('\n'))
@@ -94,7 +91,8 @@ def test_what_a_killed_application_had_not_saved_is_restored_and_that_of_others_
     studio.lose(shot)
     modes = [stat.S_IMODE(path.stat().st_mode) for path in (studio.recovery, *studio.recovery.iterdir())]
     assert modes == [0o700, 0o600, 0o600]
-    application, (lines, _) = studio.ask('Return')
+    application = studio.ask()
+    lines, _ = studio.answer(application, 'Return')
     assert lines == [ascii(NAME) + ' changed.exr', 'True'] and 'a.exr' in shot.read_text()
     studio.desk.run('key', 'ctrl+s', 'ctrl+q')
     assert application.wait() == 0 and 'changed.exr' in shot.read_text()
@@ -105,8 +103,8 @@ def test_what_is_put_off_is_asked_again_and_what_is_thrown_away_is_gone(studio):
     shot = studio.make()
     studio.lose(shot)
     for answer in 'Escape', 'alt+l':
-        application, (lines, _) = studio.ask(answer)
-        assert lines == ['False'] and len(studio.kept()) == 1
+        application = studio.ask()
+        assert studio.answer(application, answer)[0] == ['False'] and len(studio.kept()) == 1
         application.kill()
     application = studio.start('tell.py')
     for sure in 'Return', 'alt+t':
@@ -114,15 +112,14 @@ def test_what_is_put_off_is_asked_again_and_what_is_thrown_away_is_gone(studio):
         studio.desk.run('key', 'alt+t')
         studio.desk.wait_for_window('Throw Away Changes')
         studio.desk.run('key', sure)
-    assert studio.told(application)[0] == ['False'] and studio.kept() == [] and shot.read_text() == COMPOSITION
+    assert studio.answer(application)[0] == ['False'] and studio.kept() == [] and shot.read_text() == COMPOSITION
 
 
 def test_a_restored_composition_takes_the_place_of_the_open_file_and_does_not_save_over_what_others_wrote(studio):
     shot = studio.make()
     studio.lose(shot)
     shot.write_text(COMPOSITION.replace('a.exr', 'of another.exr'))
-    application = studio.start('--open', shot, 'tell.py')
-    studio.desk.wait_for_window('Recover Changes')
+    application = studio.ask(options=['--open', shot])
     assert studio.answer(application, 'alt+r')[0] == [ascii(NAME) + ' changed.exr', 'True']
     studio.desk.run('key', 'ctrl+s')
     time.sleep(0.5)
@@ -152,9 +149,7 @@ def test_what_cannot_be_read_is_said_and_kept_aside(studio, damage, words):
     aside = studio.recovery / 'unreadable' / (file.name + '.2')
     aside.parent.mkdir()
     aside.with_suffix('').write_text('of another time')
-    application = studio.start('tell.py')
-    studio.desk.wait_for_window('Changes That Cannot Be Read')
-    lines, log = studio.answer(application, 'Return')
+    lines, log = studio.answer(studio.ask('Changes That Cannot Be Read'), 'Return')
     assert lines == ['False'] and words in log and str(aside) in log
     assert aside.read_bytes() == damaged and studio.kept() == [] and len(os.listdir(aside.parent)) == 2
 
@@ -175,14 +170,17 @@ def kept():
 '''
 
 
-def run_here(folder, script, *options, state='state'):
+def run_here(folder, script, *options, state='state', status=0):
+    """What a script prints that has a composition open, and ends with that status."""
     (folder / 'shot.vmcomposition').write_text(COMPOSITION)
-    return run_inside(folder, HERE + textwrap.dedent(script), '--open', 'shot.vmcomposition', *options,
-                      XDG_STATE_HOME=os.path.join(folder, state))
+    ended, printed, errors = run_inside(folder, HERE + textwrap.dedent(script), '--open', 'shot.vmcomposition',
+                                        *options, XDG_STATE_HOME=os.path.join(folder, state))
+    assert ended == status, errors
+    return printed
 
 
 def test_nothing_is_left_of_what_is_saved_discarded_or_ended_in_order(tmp_path):
-    status, printed, errors = run_here(tmp_path, '''
+    assert run_here(tmp_path, '''
         change('b.exr')
         assert 'b.exr' in kept()
         shot.save()
@@ -199,13 +197,12 @@ def test_nothing_is_left_of_what_is_saved_discarded_or_ended_in_order(tmp_path):
         wait_for(lambda: 'of the script alone' in kept())
         atexit.register(change, 'too late')
         print('ends')
-        ''', '--exit')
-    assert (status, printed) == (0, ['ends']), errors
+        ''', '--exit') == ['ends']
     assert list((tmp_path / 'state' / 'velmora' / 'recovery').iterdir()) == []
 
 
 def test_many_changes_are_written_once_in_a_while_and_the_last_one_too(tmp_path):
-    status, _, errors = run_here(tmp_path, '''
+    run_here(tmp_path, '''
         versions = set()
         for number in range(3000):
             change(number)
@@ -217,7 +214,6 @@ def test_many_changes_are_written_once_in_a_while_and_the_last_one_too(tmp_path)
         change('the last')
         wait_for(lambda: 'the last' in kept())
         ''', '--exit')
-    assert status == 0, errors
 
 
 WAITING = {'computing': 'while True: pass', 'sleeping': 'time.sleep(60)', 'idle': '',
@@ -227,7 +223,7 @@ WAITING = {'computing': 'while True: pass', 'sleeping': 'time.sleep(60)', 'idle'
 @pytest.mark.parametrize('number', [signal.SIGTERM, signal.SIGHUP])
 @pytest.mark.parametrize('waiting', WAITING.values(), ids=WAITING)
 def test_a_signal_that_ends_the_application_leaves_the_last_change_and_ends_children_as_ever(tmp_path, waiting, number):
-    status, printed, errors = run_here(tmp_path, '''
+    assert run_here(tmp_path, '''
         child = os.fork()
         if child == 0:
             time.sleep(60)
@@ -238,15 +234,14 @@ def test_a_signal_that_ends_the_application_leaves_the_last_change_and_ends_chil
         change('last')
         subprocess.Popen(['sh', '-c', 'sleep 0.3; kill -{0} %d' % os.getpid()])
         {1}
-        '''.format(int(number), waiting))
-    assert (status, printed) == (128 + number, [str(int(number))]), errors
+        '''.format(int(number), waiting), status=128 + number) == [str(int(number))]
     file, = (tmp_path / 'state' / 'velmora' / 'recovery').iterdir()
     assert 'last' in file.read_text()
 
 
 @pytest.mark.parametrize('state, limit', [('/dev/null', -1), ('state', 100)], ids=['no folder', 'a full disk'])
 def test_where_nothing_can_be_kept_that_is_said_once_and_work_goes_on(tmp_path, state, limit):
-    status, _, errors = run_here(tmp_path, '''
+    run_here(tmp_path, '''
         resource.setrlimit(resource.RLIMIT_FSIZE, (%d, -1))
         for text in 'b.exr', 'c.exr':
             change(text)
@@ -256,4 +251,3 @@ def test_where_nothing_can_be_kept_that_is_said_once_and_work_goes_on(tmp_path, 
         shot.save()
         assert 'c.exr' in open('shot.vmcomposition').read()
         ''' % limit, '--exit', state=state)
-    assert status == 0, errors

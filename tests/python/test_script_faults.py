@@ -93,7 +93,7 @@ for kind in Mute, Unborn, Alone:
     print(*caught, run(dialog, end))
 ''', 'Mute Mute TypeError Mute TypeError End\nTypeError TypeError TypeError TypeError TypeError End\n'
      'Alone Alone TypeError Alone TypeError End\n'),
-    'a second interpreter builds dialogs': ('''
+    'a second interpreter builds dialogs and is shown none': ('''
 import _xxsubinterpreters as interpreters
 other = interpreters.create()
 interpreters.run_string(other, """
@@ -101,10 +101,14 @@ from quorvane_velmora import ui
 dialog = ui.createDialog('t', ui.makeXmlFromWidgetList([('TextField', 'a')], ['OK']), 200, 100)
 dialog.addCallback('a', ui.EventType.VALUE_CHANGED, lambda dialog, name, event: print(dialog.getValue(name), flush=True))
 dialog.setValue('a', 'there')
+try:
+    ui.showMessageBox('t', ['x'])
+except Exception as refusal:
+    print('main interpreter' in str(refusal), flush=True)
 """)
 interpreters.destroy(other)
 print(run(make(), end))
-''', 'there\nEnd\n'),
+''', 'there\nTrue\nEnd\n'),
     'its standard streams are closed': ('''
 saved = os.dup(1)
 for stream in sys.stdout, sys.stderr:

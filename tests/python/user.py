@@ -130,3 +130,21 @@ class User:
 
     def press(self, key, modifier=Qt.KeyboardModifier.NoModifier):
         QTest.keyClick(self.focused(), key, modifier)
+
+
+# Steps to plan.
+
+def click(name):
+    return lambda user: user.click(name)
+
+
+def close(user):
+    user.close()
+
+
+def look_at(user, show, look, end=close):
+    """What `look` gives while the dialog is open that `show` runs; `end` then closes it."""
+    seen = []
+    user.plan(lambda user: seen.append(look(user)), end)
+    show()
+    return seen[0]
