@@ -19,12 +19,6 @@ pytestmark = [pytest.mark.screen, pytest.mark.usefixtures('no_wait_is_endless')]
 ACTIVATE, STATE = ui.EventType.ACTIVATE, ui.EventType.STATE
 
 
-@pytest.fixture(autouse=True)
-def no_window_of_a_test_before_goes_in_a_run():
-    """On Wayland that could end it: the window may be what the running one was shown for."""
-    gc.collect()
-
-
 class Own(BaseException):
     pass
 
@@ -269,6 +263,12 @@ def test_the_last_reference_to_a_dialog_with_a_left_window_goes_while_its_other_
     held[0].addCallback(name, ACTIVATE, lambda *_: heard.append('second'))
     QTest.mouseClick(window.findChild(QPushButton, name), Qt.MouseButton.LeftButton)
     assert heard == ['first'] and not held
+
+
+def test_a_left_window_that_goes_in_the_run_of_the_next_dialog_does_not_take_that_with_it(user):
+    held = [leave_window(user, 'left')[0]]
+    user.plan(lambda user: (held.clear(), gc.collect()), click('Toggle'), close)
+    assert make_dialog().launch() == 'CloseButton_OK'
 
 
 class Intruder(QObject):

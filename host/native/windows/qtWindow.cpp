@@ -91,6 +91,15 @@ QtWindowWidget::QtWindowWidget(QtListenerHandle<NtWindowListener> const& handle)
     setLayoutDirection(Qt::LeftToRight);
 }
 
+QtWindowWidget::~QtWindowWidget()
+{
+    // Wayland has those that belong to a window asked to close with it, one in which a dialog runs too.
+    if (QWindow const* const own = windowHandle())
+        for (QWindow* const other : QGuiApplication::topLevelWindows())
+            if (other->transientParent() == own)
+                other->setTransientParent(own->transientParent());
+}
+
 std::vector<QPointer<QtWindowWidget>> QtWindowWidget::findAll()
 {
     std::vector<QPointer<QtWindowWidget>> windows;

@@ -23,6 +23,7 @@ class QtWindowWidget final : public QWidget, public QtWindowLike
 {
 public:
     explicit QtWindowWidget(QtListenerHandle<NtWindowListener> const& handle);
+    ~QtWindowWidget() override;
 
     /// All that there are now, shown or not.
     static std::vector<QPointer<QtWindowWidget>> findAll();
