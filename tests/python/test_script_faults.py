@@ -100,21 +100,20 @@ except ImportError:
     import _interpreters as interpreters
 other = interpreters.create()
 interpreters.run_string(other, """
-import sys
 try:
     from quorvane_velmora import ui
 except ImportError as refusal:
     # That of an interpreter that has a lock of its own, which is any one from CPython 3.12 on.
     print('there', flush=True)
     print('does not support' in str(refusal), flush=True)
-    sys.exit()
-dialog = ui.createDialog('t', ui.makeXmlFromWidgetList([('TextField', 'a')], ['OK']), 200, 100)
-dialog.addCallback('a', ui.EventType.VALUE_CHANGED, lambda dialog, name, event: print(dialog.getValue(name), flush=True))
-dialog.setValue('a', 'there')
-try:
-    ui.showMessageBox('t', ['x'])
-except Exception as refusal:
-    print('main interpreter' in str(refusal), flush=True)
+else:
+    dialog = ui.createDialog('t', ui.makeXmlFromWidgetList([('TextField', 'a')], ['OK']), 200, 100)
+    dialog.addCallback('a', ui.EventType.VALUE_CHANGED, lambda *_: print(dialog.getValue('a'), flush=True))
+    dialog.setValue('a', 'there')
+    try:
+        ui.showMessageBox('t', ['x'])
+    except Exception as refusal:
+        print('main interpreter' in str(refusal), flush=True)
 """)
 interpreters.destroy(other)
 print(run(make(), end))
