@@ -182,9 +182,9 @@ print(dialog.getValue('a'), dialog.getValue('m'))
 application = QApplication([])
 tell(ui.showMessageBox, 'Next', ['.'])
 ''', act)
-    window = desk.wait_for_window('Ground')
     x, y = map(int, script.stdout.readline().split())
     if ' ' in act:
+        window = desk.wait_for_window('Ground')
         desk.run('mousemove', window.left + x, window.top + y, *act.split())
     assert script.communicate()[0].splitlines() == ['Cannot go on - RuntimeError', 'kept y',
                                                     'Cannot show a window - RuntimeError', 'atexit']
