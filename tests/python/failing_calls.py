@@ -390,7 +390,8 @@ def find_place(text):
     traces = read_traces(text)
     died = traces.get('died', [])
     for frame in traces.get('reached', []):
-        called = died[died.index(frame) - 1] if frame in died else frame
+        inner = reversed(died[:died.index(frame)] if frame in died else [])
+        called = next((each for each in inner if not OURS.search(each['library'])), frame)
         # Who inherits a destructor cannot keep what that throws.
         return called if DESTRUCTOR.search(called['name']) else frame
     return next((frame for frame in died if not BETWEEN.search(frame['library'])), died[0] if died else None)

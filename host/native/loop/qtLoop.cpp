@@ -1,6 +1,7 @@
 #include "loop/qtLoop.h"
 
 #include "exBase.h"
+#include "loop/qtReceiver.h"
 #include "loop/qtWayOut.h"
 
 #include <QAbstractEventDispatcher>
@@ -46,6 +47,7 @@ void runInApplication(QEventLoop& loop)
     QPointer<QCoreApplication> const application = QCoreApplication::instance();
     bool const wasSilent = application->signalsBlocked();
     QObject context;
+    prepareReceiver(context);
     auto const run = [&]
     {
         QObject::disconnect(QAbstractEventDispatcher::instance(), nullptr, &context, nullptr);
@@ -70,6 +72,7 @@ void runInApplication(QEventLoop& loop)
 QtLoop::QtLoop(bool const volatile* until, bool volatile* end)
     : _until(until), _end(end), _outer(QtGuard::getInstance().getInnermostLoop())
 {
+    prepareReceiver(_loop);
     QAbstractEventDispatcher* const dispatcher = QAbstractEventDispatcher::instance();
     QObject::connect(dispatcher, &QAbstractEventDispatcher::awake, &_loop, [this] { endIfDone(); });
     QObject::connect(dispatcher, &QAbstractEventDispatcher::aboutToBlock, &_loop, [this] { endIfDone(); });

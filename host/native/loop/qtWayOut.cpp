@@ -1,6 +1,7 @@
 #include "loop/qtWayOut.h"
 
 #include "loop/qtGuard.h"
+#include "loop/qtReceiver.h"
 #include "start/qtDisplayWatch.h"
 
 #include <QAbstractEventDispatcher>
@@ -92,6 +93,7 @@ QtWayOut::QtWayOut(int loops)
       _depth(QtGuard::getInstance().getScriptHook().getDepth())
 {
     listen();
+    prepareReceiver(_context);
     // What loops are in the middle of has to outlive them, and they may call nothing more. Where they are delivering
     // posted events, the list of those forgets them next, but not how far they have come in it: a turn within theirs,
     // which reaches nobody any more, ends at the beginning.

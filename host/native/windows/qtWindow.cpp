@@ -1,6 +1,7 @@
 #include "windows/qtWindow.h"
 
 #include "loop/qtDisposal.h"
+#include "loop/qtGuard.h"
 #include "loop/qtInputDrop.h"
 #include "loop/qtSpareHandles.h"
 #include "peers/qtText.h"
@@ -94,10 +95,13 @@ QtWindowWidget::QtWindowWidget(QtListenerHandle<NtWindowListener> const& handle)
 QtWindowWidget::~QtWindowWidget()
 {
     // Wayland has those that belong to a window asked to close with it, one in which a dialog runs too.
-    if (QWindow const* const own = windowHandle())
-        for (QWindow* const other : QGuiApplication::topLevelWindows())
-            if (other->transientParent() == own)
-                other->setTransientParent(own->transientParent());
+    QtGuard::getInstance().shield(
+        [own = windowHandle()]
+        {
+            for (QWindow* const other : QGuiApplication::topLevelWindows())
+                if (own && other->transientParent() == own)
+                    other->setTransientParent(own->transientParent());
+        });
 }
 
 std::vector<QPointer<QtWindowWidget>> QtWindowWidget::findAll()
