@@ -109,6 +109,8 @@ void InputDoor::turn()
     if (!_parts->onTurn || level <= _parts->busyLevel)
         return;
     QScopedValueRollback<int> const busy(_parts->busyLevel, level);
+    // A turn that was asked for in a run that has ended comes ahead of what the window of this one has still to do.
+    act([] { QCoreApplication::sendPostedEvents(nullptr, QEvent::MetaCall); });
     // The door may be closed meanwhile.
     std::function<void()> const onTurn = _parts->onTurn;
     onTurn();

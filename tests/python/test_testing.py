@@ -123,6 +123,18 @@ def test_far_rows_and_entries_are_scrolled_to(person):
     assert (values['field299'], values['Menu'], values['field0']) == ('z', 'entry 277', 'a')
 
 
+def test_what_stands_beside_the_widgets_is_known_at_once_after_a_run_that_failed(fail):
+    class End(BaseException):
+        pass
+
+    def end(_):
+        raise End
+
+    for _ in range(3):
+        assert isinstance(fail(do=end), End)
+        assert '"shot" (Shot)' in str(fail(values={'shto': ''}))
+
+
 class Thief(QObject):
     """Takes the keyboard's focus from a button that is pressed, as the late news of a popup does; once."""
 
