@@ -199,7 +199,7 @@ KV_SHOWN int posix_memalign(void** block, std::size_t alignment, std::size_t siz
 #define KV_DISK_CALL(type, name, parameters, arguments)                                                                \
     KV_SHOWN type name parameters                                                                                      \
     {                                                                                                                  \
-        static auto const real = reinterpret_cast<type(*) parameters>(dlsym(RTLD_NEXT, #name));                        \
+        static auto const real = reinterpret_cast<decltype(&(name))>(dlsym(RTLD_NEXT, #name));                         \
         return isDiskToFail() ? -1 : real arguments;                                                                   \
     }
 
