@@ -210,6 +210,9 @@ class Workspace(Composition):
 
     def prepare(self):
         super().prepare('shot%d.vmcomposition' % ui.Workspace.getNbCompositions())
+        # What the life before this had not saved.
+        for left in pathlib.Path(os.environ['XDG_STATE_HOME']).glob('**/*.vmrecovery'):
+            left.unlink()
 
     def use(self):
         ui.Workspace.openComposition(self.shot)
@@ -338,12 +341,12 @@ def work(name, mode, part, parts, lives):
     life.tidy()
 
 
-def start(name, mode, part=0, parts=1, lives=sys.maxsize):
-    """A process that does the work for a scenario."""
+def start(state, name, mode, part, parts, lives):
+    """A process that does the work for a scenario, and keeps what is not saved in a folder of its own."""
     program = [str(TREE / 'bin' / 'velmora'), '--exit'] if SCENARIOS[name].inside else [sys.executable]
     environment = {**os.environ, 'LD_PRELOAD': str(LIBRARY), 'PYTHONMALLOC': 'malloc', 'QT_QPA_PLATFORM': 'offscreen',
                    'PYTHONPATH': str(pathlib.Path(ui.__file__).parents[2]), 'XDG_CONFIG_HOME': '/dev/null',
-                   'PYTHONDONTWRITEBYTECODE': '1'}
+                   'XDG_STATE_HOME': os.path.join(state, str(part)), 'PYTHONDONTWRITEBYTECODE': '1'}
     arguments = [name, mode, str(part), str(parts), str(lives)]
     return subprocess.Popen([*program, __file__, 'work', *arguments], env=environment, text=True,
                             stdout=subprocess.PIPE, stderr=subprocess.PIPE)
@@ -351,8 +354,8 @@ def start(name, mode, part=0, parts=1, lives=sys.maxsize):
 
 def run(name, mode, parts, lives=sys.maxsize):
     """The lives of a scenario, by as many processes as there are parts."""
-    workers = [start(name, mode, part, parts, lives) for part in range(parts)]
-    with concurrent.futures.ThreadPoolExecutor() as pool:
+    with tempfile.TemporaryDirectory() as state, concurrent.futures.ThreadPoolExecutor() as pool:
+        workers = [start(state, name, mode, part, parts, lives) for part in range(parts)]
         outputs = list(pool.map(lambda worker: worker.communicate(), workers))
     for worker, (_, errors) in zip(workers, outputs):
         require(worker.returncode == 0, errors[-3000:])
