@@ -14,7 +14,7 @@
 #include <unistd.h>
 #include <unwind.h>
 
-// After the system's headers, which it would have give other names to what is named here.
+// Behind the system's headers: ahead of them it gives other names to the calls that are named here.
 #include <Python.h>
 
 // NOLINTBEGIN(bugprone-reserved-identifier,cert-dcl37-c,cert-dcl51-cpp,readability-inconsistent-declaration-parameter-name)
@@ -67,14 +67,14 @@ bool isOurs(char const* library)
     return contains(library, "/libKV") || contains(library, "/velmora");
 }
 
-/// Those that others ask for memory through.
+/// Those that others make such calls through.
 bool isBetween(char const* library)
 {
     return contains(library, "failingCalls") || contains(library, "/libstdc++") || contains(library, "/libc.so");
 }
 
-/// True if the project's own code asks for the memory.
-bool isAskedByUs()
+/// True if the project's own code makes the call.
+bool isMadeByUs()
 {
     std::array<void*, 12> frames{};
     auto const count = static_cast<std::size_t>(backtrace(frames.data(), static_cast<int>(frames.size())));
@@ -90,7 +90,7 @@ bool isToFail(bool isToDisk)
         return false;
     isAsking = true;
     bool isFailing = false;
-    if (!plan.isOursAlone || isAskedByUs())
+    if (!plan.isOursAlone || isMadeByUs())
     {
         ++plan.calls;
         isFailing = plan.calls >= plan.first && plan.calls <= plan.last;

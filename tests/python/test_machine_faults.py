@@ -203,7 +203,8 @@ def refuse_files():
 
 
 @pytest.mark.parametrize('left', [0, 1, 3, 8])
-@pytest.mark.parametrize('platform', ['offscreen', 'xcb', 'wayland'])
+# On Wayland one comes free now and then while the test holds them: Qt closes those that the compositor sends.
+@pytest.mark.parametrize('platform', ['offscreen', 'xcb'])
 def test_without_file_handles_all_is_refused_with_words_or_works_and_works_again_with_them(path, platform, left):
     shown = contextlib.nullcontext({}) if platform == 'offscreen' else displays.display(platform)
     leaks = {} if platform == 'offscreen' else NO_SEARCH_FOR_LEAKS
