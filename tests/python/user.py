@@ -24,7 +24,9 @@ class User:
         self._steps = []
         self._timer = None
         self._idle = 0
-        self._level = 0  # of the loop that turned when the step under way began
+        # Of the loop that turned when the step under way began. A dialog's loop turns within another one, where the last
+        # events of its turn still come when it has ended.
+        self._level = 1
 
     def plan(self, *steps):
         ui.makeXmlFromWidgetList([('PushButton', 'measured')])  # the application is there from here on
@@ -63,7 +65,7 @@ class User:
         other.stop()
 
     def _next(self):
-        # No dialog waits where events are only let through: in a step, or at the end of a run, which drops its input.
+        # No dialog waits where events are only let through: in a step, or at the end of a run.
         if QThread.currentThread().loopLevel() <= self._level:
             return
         window = self.window()
