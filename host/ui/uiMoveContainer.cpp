@@ -144,7 +144,10 @@ void UiMoveContainer::fill()
     {
         // Whoever asks next has it filled anew.
         if (_float)
+        {
+            _float->startAnew();
             _waiting = UiLatePeers::getInstance().putBack(taken);
+        }
         throw;
     }
 }

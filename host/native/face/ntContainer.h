@@ -48,6 +48,9 @@ public:
     /// costs less.
     virtual void setContentSize(int width, int height) = 0;
 
+    /// What is created in it next stands in a content of its own: the one before could not be filled.
+    virtual void startAnew() = 0;
+
     /// The room that a scroll bar takes beside the content, in pixels.
     virtual int getBarThickness() const = 0;
 };

@@ -118,6 +118,14 @@ bool QtGuard::runCall(void (*call)(void const*), void const* known)
     return isDone;
 }
 
+void QtGuard::keep(std::exception_ptr& first, std::exception_ptr const& error) const noexcept
+{
+    if (first)
+        _hook->addContext(first, error);
+    else
+        first = error;
+}
+
 void QtGuard::checkSignals()
 {
     run([hook = _hook] { hook->checkSignals(); });
@@ -138,7 +146,9 @@ void QtGuard::take() noexcept
 {
     InterpreterHold const hold(*_hook);
     std::exception_ptr const error = _hook->capture();
-    if (_innermostLoop)
+    if (_carrier && _carrier->isIn(_innermostLoop))
+        _carrier->keep(error);
+    else if (_innermostLoop)
         _innermostLoop->fail(error);
     else
         _hook->report(error);

@@ -5,6 +5,7 @@
 #include <QtGlobal>
 
 #include <exception>
+#include <utility>
 
 namespace Kv
 {
@@ -43,6 +44,21 @@ public:
         return runCall([](void const* known) { (*static_cast<Call const*>(known))(); }, &call);
     }
 
+    /// Calls what has Qt call into the host in its turn: what is thrown there is thrown on from here, and no loop ends.
+    template <typename Call> void carry(Call const& call)
+    {
+        Carrier carrier(*this);
+        try
+        {
+            call();
+        }
+        catch (...)
+        {
+            carrier.keep(_hook->capture());
+        }
+        carrier.rethrow();
+    }
+
     /// Runs what is the host's own, and leaves the interpreter as it is unless something is thrown.
     template <typename Call> void shield(Call const& call) noexcept
     {
@@ -56,8 +72,11 @@ public:
         }
     }
 
-    /// Takes the exception that is being handled, for the innermost local loop.
+    /// Takes the exception that is being handled, for who carries it on, else for the innermost local loop.
     void take() noexcept;
+
+    /// Makes an error the first one, or adds it to that.
+    void keep(std::exception_ptr& first, std::exception_ptr const& error) const noexcept;
 
     /// Runs what is pending for the interpreter, guarded.
     void checkSignals();
@@ -76,10 +95,38 @@ public:
 private:
     QtGuard();
 
+    /// One call that carries on what is thrown in it; not in a loop that began later, which ends by it. They nest.
+    class Carrier
+    {
+    public:
+        explicit Carrier(QtGuard& guard)
+            : _guard(guard), _outer(std::exchange(guard._carrier, this)), _loop(guard._innermostLoop)
+        {
+        }
+        Carrier(Carrier const&) = delete;
+        Carrier& operator=(Carrier const&) = delete;
+        ~Carrier() { _guard._carrier = _outer; }
+
+        bool isIn(QtLoop const* loop) const { return loop == _loop; }
+        void keep(std::exception_ptr const& error) noexcept { _guard.keep(_error, error); }
+        void rethrow() const
+        {
+            if (_error)
+                _guard._hook->rethrow(_error);
+        }
+
+    private:
+        QtGuard& _guard;
+        Carrier* _outer;
+        QtLoop* _loop;
+        std::exception_ptr _error;
+    };
+
     bool runCall(void (*call)(void const*), void const* known);
 
     NtScriptHook* _hook;
     QtLoop* _innermostLoop = nullptr;
+    Carrier* _carrier = nullptr;
     int _depth = 0;
     quint64 _calls = 0;
     quint64 _currentCall = 0;

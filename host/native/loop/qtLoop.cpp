@@ -128,10 +128,7 @@ void QtLoop::endIfDone()
 
 void QtLoop::fail(std::exception_ptr const& error) noexcept
 {
-    if (_error)
-        QtGuard::getInstance().getScriptHook().addContext(_error, error);
-    else
-        _error = error;
+    QtGuard::getInstance().keep(_error, error);
     _loop.quit();
 }
 

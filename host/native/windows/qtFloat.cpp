@@ -64,7 +64,13 @@ public:
     void setContentSize(int width, int height) override
     {
         if (QtFloat* const native = getNative())
-            native->setContentSize(width, height);
+            QtGuard::getInstance().carry([&] { native->setContentSize(width, height); });
+    }
+
+    void startAnew() override
+    {
+        if (QtFloat* const native = getNative())
+            native->startAnew();
     }
 
     int getBarThickness() const override
@@ -115,6 +121,8 @@ QWidget* QtFloat::getContent()
 
 void QtFloat::makeContent()
 {
+    delete _area;
+    delete _edge;
     auto area = std::make_unique<QtContentArea>(this, [handle = _handle](int width, int height)
                                                 { return handle.tell(&NtFloatListener::onResized, width, height); });
     area->setWidget(new QWidget);

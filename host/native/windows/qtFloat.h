@@ -27,6 +27,9 @@ public:
     QWidget* getContent();
     void setContentSize(int width, int height);
 
+    /// The content is made again when it is asked for next.
+    void startAnew() { _hasContent = false; }
+
     /// Keeps a widget of the content in place when that scrolls. A text in it becomes a title.
     void pin(QWidget& widget);
 
