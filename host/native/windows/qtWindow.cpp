@@ -300,7 +300,7 @@ void QtWindow::show()
     native->winId();
     if (_owner && _owner->windowHandle())
         native->windowHandle()->setTransientParent(_owner->windowHandle());
-    native->showModal();
+    QtGuard::getInstance().carry([native] { native->showModal(); });
 }
 
 void QtWindow::hide()
