@@ -31,6 +31,12 @@ int getLoopLevel()
     return QThread::currentThread()->loopLevel();
 }
 
+/// True where no dialog waits for a person: in a call that began at that level, or at the end of a run.
+bool isBusy(int busyLevel)
+{
+    return getLoopLevel() <= busyLevel || WsNative::getPlatform().isLoopOver();
+}
+
 void act(std::function<void()> const& action)
 {
     WsNative::getPlatform().callForScript(action);
@@ -85,7 +91,7 @@ void InputDoor::open(std::function<void()> onTurn)
     QObject::connect(_parts->timer.get(), &QTimer::timeout, _parts->timer.get(),
                      [this, &platform]
                      {
-                         if (_parts->isTurnAsked || getLoopLevel() <= _parts->busyLevel)
+                         if (_parts->isTurnAsked || isBusy(_parts->busyLevel))
                              return;
                          platform.callNextTurn([this] { turn(); });
                          _parts->isTurnAsked = true;
@@ -105,10 +111,9 @@ void InputDoor::close()
 void InputDoor::turn()
 {
     _parts->isTurnAsked = false;
-    int const level = getLoopLevel();
-    if (!_parts->onTurn || level <= _parts->busyLevel)
+    if (!_parts->onTurn || isBusy(_parts->busyLevel))
         return;
-    QScopedValueRollback<int> const busy(_parts->busyLevel, level);
+    QScopedValueRollback<int> const busy(_parts->busyLevel, getLoopLevel());
     // A turn that was asked for in a run that has ended comes ahead of what the window of this one has still to do.
     act([] { QCoreApplication::sendPostedEvents(nullptr, QEvent::MetaCall); });
     // The door may be closed meanwhile.

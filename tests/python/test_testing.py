@@ -5,6 +5,7 @@ import os
 import signal
 import subprocess
 import sys
+import time
 import traceback
 
 import pytest
@@ -245,6 +246,15 @@ def test_afterwards_all_is_as_it_was(fail):
     with testing.person() as person:
         person.answer('Publish', press='Cancel')
         assert show()['CloseButtonClicked'] == 'CloseButton_Cancel'
+
+
+@scripts.needs_pyqt
+def test_nobody_acts_at_a_dialog_that_has_just_ended(fail):
+    slow = QTimer()
+    slow.timeout.connect(lambda: time.sleep(0.003))
+    slow.start(1)
+    for _ in range(5):
+        assert fail(values={'shto': 'a'}).__context__ is None
 
 
 @pytest.mark.inside

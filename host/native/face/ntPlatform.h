@@ -119,6 +119,9 @@ public:
     /// thrown on from here. When the application is asked to quit, `*end` is set to true. Loops nest.
     virtual void runLoop(bool const volatile* until, bool volatile* end) = 0;
 
+    /// True where the innermost loop has been ended, and only the last events of its turn still come.
+    virtual bool isLoopOver() = 0;
+
     /// Runs the application's own loop, in which those of dialogs nest, and gives its exit status. `lastAct`, which
     /// throws nothing and can be null, is called as soon as the display is gone; then an `ExBase` comes out of here and
     /// of the loops of this platform. Where a loop of somebody else's runs in them, the process ends.

@@ -89,7 +89,10 @@ QtLoop::~QtLoop()
 
 std::exception_ptr QtLoop::run()
 {
-    bool const isInOther = QThread::currentThread()->loopLevel() > 0;
+    int const level = QThread::currentThread()->loopLevel();
+    bool const isInOther = level > 0;
+    int const loops = isInOther ? 1 : 2;
+    _level = level + loops;
     auto const runLoop = [&]
     {
         if (isInOther)
@@ -97,13 +100,18 @@ std::exception_ptr QtLoop::run()
         else
             runInApplication(_loop);
     };
-    std::string const reason = QtWayOut(isInOther ? 1 : 2).run(runLoop);
+    std::string const reason = QtWayOut(loops).run(runLoop);
     if (!reason.empty() && !_error)
         fail(std::make_exception_ptr(ExBase(__FILE__, __LINE__, "Cannot go on: " + reason)));
     // The loop was then ended by the end of the application.
     if (!_error && !*_until && _end)
         *_end = true;
     return _error;
+}
+
+bool QtLoop::isOver() const
+{
+    return (*_until || !_loop.isRunning()) && QThread::currentThread()->loopLevel() <= _level;
 }
 
 void QtLoop::end()

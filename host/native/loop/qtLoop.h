@@ -24,6 +24,9 @@ public:
     /// Dispatches events until the flag is true or an error came; gives that error, or null.
     std::exception_ptr run();
 
+    /// True once it has been ended, but not in loops that run in it.
+    bool isOver() const;
+
     /// The loop that this one runs in; null for the outermost.
     QtLoop* getOuter() const { return _outer; }
 
@@ -45,6 +48,8 @@ private:
     bool const volatile* _until;
     bool volatile* _end;
     QtLoop* _outer;
+    /// The number of Qt's loops that turn in each other while it does.
+    int _level = 0;
     std::exception_ptr _error;
     QEventLoop _loop;
     QTimer _tick;

@@ -218,6 +218,12 @@ void QtPlatform::runLoop(bool const volatile* until, bool volatile* end)
     QtGuard::getInstance().getScriptHook().rethrow(error);
 }
 
+bool QtPlatform::isLoopOver()
+{
+    QtLoop const* const loop = QtGuard::getInstance().getInnermostLoop();
+    return loop && loop->isOver();
+}
+
 void QtPlatform::callScript(std::function<void()> const& call)
 {
     QtSpareHandles::Pause const pause;

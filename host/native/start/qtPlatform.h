@@ -33,6 +33,7 @@ public:
 
     void callNextTurn(std::function<void()> call) override;
     void runLoop(bool const volatile* until, bool volatile* end) override;
+    bool isLoopOver() override;
     int runApplication(std::function<void()> lastAct) override;
     void callScript(std::function<void()> const& call) override;
     void callForScript(std::function<void()> const& call) override;
