@@ -39,7 +39,7 @@ bool isBusy(int busyLevel)
 
 void act(std::function<void()> const& action)
 {
-    WsNative::getPlatform().callForScript(action);
+    WsNative::getPlatform().actForScript(action);
 }
 
 QWidget& requireDialog()

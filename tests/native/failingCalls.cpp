@@ -34,13 +34,21 @@ struct Trace
     int count;
 };
 
+enum class Kind
+{
+    Memory,
+    Disk,
+};
+
 /// What is to fail, and what has.
 struct Plan
 {
+    Kind getKind() const { return diskError == 0 ? Kind::Memory : Kind::Disk; }
+
     long first = 0;
     long last = 0;
     bool isOursAlone = false;
-    /// Which calls count: 0 for those for memory, else those to the disk, which give that error.
+    /// What calls to the disk give; 0 where those for memory fail.
     int diskError = 0;
     long calls = 0;
     long failures = 0;
@@ -84,9 +92,9 @@ bool isMadeByUs()
     return false;
 }
 
-bool isToFail(bool isToDisk)
+bool isToFail(Kind kind)
 {
-    if (!isArmed || isAsking || isToDisk != (plan.diskError != 0))
+    if (!isArmed || isAsking || kind != plan.getKind())
         return false;
     isAsking = true;
     bool isFailing = false;
@@ -103,7 +111,7 @@ bool isToFail(bool isToDisk)
 
 bool isDiskToFail()
 {
-    bool const isFailing = isToFail(true);
+    bool const isFailing = isToFail(Kind::Disk);
     if (isFailing)
         errno = plan.diskError;
     return isFailing;
@@ -165,22 +173,22 @@ void watch()
 
 KV_SHOWN void* malloc(std::size_t size)
 {
-    return isToFail(false) ? fail() : __libc_malloc(size);
+    return isToFail(Kind::Memory) ? fail() : __libc_malloc(size);
 }
 
 KV_SHOWN void* calloc(std::size_t count, std::size_t size)
 {
-    return isToFail(false) ? fail() : __libc_calloc(count, size);
+    return isToFail(Kind::Memory) ? fail() : __libc_calloc(count, size);
 }
 
 KV_SHOWN void* realloc(void* block, std::size_t size)
 {
-    return isToFail(false) ? fail() : __libc_realloc(block, size);
+    return isToFail(Kind::Memory) ? fail() : __libc_realloc(block, size);
 }
 
 KV_SHOWN void* memalign(std::size_t alignment, std::size_t size)
 {
-    return isToFail(false) ? fail() : __libc_memalign(alignment, size);
+    return isToFail(Kind::Memory) ? fail() : __libc_memalign(alignment, size);
 }
 
 KV_SHOWN void* aligned_alloc(std::size_t alignment, std::size_t size)
@@ -241,7 +249,7 @@ KV_SHOWN _Unwind_Reason_Code __gxx_personality_v0(int version, _Unwind_Action ac
 /// Calls `life`, in which the calls from `first` to `last` fail, counted from 1: those for memory where `diskError` is
 /// 0, else those to the disk. With `isOursAlone` only the calls of the project's own code count. A signal that ends the
 /// process is written down in `file`.
-KV_SHOWN PyObject* runShort(PyObject* life, long first, long last, int isOursAlone, int diskError, int file)
+KV_SHOWN PyObject* runFailing(PyObject* life, long first, long last, int isOursAlone, int diskError, int file)
 {
     reportFile = file;
     watch();

@@ -16,6 +16,7 @@ import signal
 import subprocess
 import sys
 import tempfile
+import typing
 
 from quorvane_velmora import graph, ui
 from quorvane_velmora.libs import libKVpyextTesting as door
@@ -231,6 +232,18 @@ class Workspace(Composition):
             require(each.getNodes() == ['Plate', 'Blur', 'Output'], each.getNodes())
 
 
+class Mode(typing.NamedTuple):
+    """Which calls fail: from the one in turn on all, or that one alone; those of the project's own code, or all."""
+
+    lasts: bool
+    ours: bool
+    error: int = 0  # what calls to the disk give; 0 where those for memory fail
+
+
+MODES = {'one': Mode(lasts=False, ours=False), 'all': Mode(lasts=True, ours=False), 'ours': Mode(lasts=False, ours=True),
+         'disk': Mode(lasts=False, ours=True, error=errno.EIO), 'full': Mode(lasts=True, ours=True, error=errno.ENOSPC)}
+
+
 class Scenario:
     def __init__(self, what, inside=False, first=False, saves=False):
         self.what = what
@@ -238,14 +251,9 @@ class Scenario:
         # The first life of its process, in which all else is loaded. With no memory at all the fonts' library waits for
         # itself then, most times.
         self.first = first
-        skipped = ({'all'} if first else set()) | (set() if saves else set(DISK_ERRORS))
-        self.modes = [mode for mode in MODES if mode not in skipped]
+        self.modes = [name for name, mode in MODES.items() if (saves or not mode.error) and not (first and mode.lasts)]
 
 
-# Which calls fail: the one for memory, that and all later ones, the one among those of the project's own code; of the
-# latter's calls to the disk the one, and from that on all, as with a disk that is full.
-MODES = 'one', 'all', 'ours', 'disk', 'full'
-DISK_ERRORS = {'disk': errno.EIO, 'full': errno.ENOSPC}
 SCENARIOS = {
     'dialog, unseen': Scenario(Tree),
     'dialog, unseen, the first': Scenario(Tree, first=True),
@@ -262,8 +270,8 @@ SECONDS = 30
 
 def load():
     library = ctypes.PyDLL(str(LIBRARY))
-    library.runShort.argtypes = [ctypes.py_object, ctypes.c_long, ctypes.c_long, *3 * [ctypes.c_int]]
-    library.runShort.restype = ctypes.py_object
+    library.runFailing.argtypes = [ctypes.py_object, ctypes.c_long, ctypes.c_long, *3 * [ctypes.c_int]]
+    library.runFailing.restype = ctypes.py_object
     library.getCalls.restype = library.getFailures.restype = ctypes.c_long
     return library
 
@@ -273,8 +281,8 @@ def run_one(library, life, mode, k, file):
     seen = None
     life.prepare()
     try:
-        last = 0 if k == 0 else sys.maxsize if mode in ('all', 'full') else k
-        seen = library.runShort(life.live, k, last, mode not in ('one', 'all'), DISK_ERRORS.get(mode, 0), file)
+        last = 0 if k == 0 else sys.maxsize if mode.lasts else k
+        seen = library.runFailing(life.live, k, last, mode.ours, mode.error, file)
         end = 'finished'
     except MemoryError:
         end = 'MemoryError'
@@ -328,14 +336,14 @@ def work(name, mode, part, parts, lives):
     if scenario.inside:
         # The copies have none of the threads that draw large pictures, and would wait for them.
         next(window for window in QApplication.topLevelWidgets() if window.isVisible()).setUpdatesEnabled(False)
-    end, calls, _, text = fork_one(library, life, mode, 0)
+    end, calls, _, text = fork_one(library, life, MODES[mode], 0)
     require(end == 'finished', (end, text))
     # Past the application, which would show each line in the life after that.
     output = open(1, 'w', closefd=False)
     distance = max(calls // lives, 1)
     k = (distance + 1) // 2 + part * distance
     while True:
-        end, _, failures, text = fork_one(library, life, mode, k)
+        end, _, failures, text = fork_one(library, life, MODES[mode], k)
         if not failures:
             break
         print(json.dumps([k, end, text]), file=output, flush=True)
@@ -420,7 +428,7 @@ def find_offence(mode, end, text):
     """What is wrong with the end of a life; None if it may end so."""
     if end == 'finished':
         return None
-    if mode in DISK_ERRORS:
+    if MODES[mode].error:
         return None if WORDS.match(end) else end
     if end in ('MemoryError', NO_THREAD_DATA) or REFUSED.match(end):
         return None

@@ -131,7 +131,7 @@ public:
     virtual void callScript(std::function<void()> const& call) = 0;
 
     /// Calls what has the window system act while a script runs.
-    virtual void callForScript(std::function<void()> const& call) = 0;
+    virtual void actForScript(std::function<void()> const& call) = 0;
 
     /// Ends the innermost loop by setting its `*end`; without a loop, nothing happens.
     virtual void endLoop() = 0;

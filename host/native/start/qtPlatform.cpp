@@ -230,7 +230,7 @@ void QtPlatform::callScript(std::function<void()> const& call)
     call();
 }
 
-void QtPlatform::callForScript(std::function<void()> const& call)
+void QtPlatform::actForScript(std::function<void()> const& call)
 {
     QtSpareHandles::Turn const turn;
     call();

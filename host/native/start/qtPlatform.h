@@ -36,7 +36,7 @@ public:
     bool isLoopOver() override;
     int runApplication(std::function<void()> lastAct) override;
     void callScript(std::function<void()> const& call) override;
-    void callForScript(std::function<void()> const& call) override;
+    void actForScript(std::function<void()> const& call) override;
     void endLoop() override;
     void interruptLoop() override;
     void closeLoops() override;

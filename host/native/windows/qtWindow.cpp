@@ -120,7 +120,7 @@ void QtWindowWidget::showModal()
     if (QApplication::activeModalWidget() != this)
         hide();
     setWindowModality(Qt::ApplicationModal);
-    layOut();
+    QtGuard::getInstance().carry([this] { layOut(); });
     show();
     makeRoomForTitle(*this);
     comeToFront();
@@ -300,7 +300,7 @@ void QtWindow::show()
     native->winId();
     if (_owner && _owner->windowHandle())
         native->windowHandle()->setTransientParent(_owner->windowHandle());
-    QtGuard::getInstance().carry([native] { native->showModal(); });
+    native->showModal();
 }
 
 void QtWindow::hide()
