@@ -341,13 +341,13 @@ def work(name, mode, part, parts, lives):
     # Past the application, which would show each line in the life after that.
     output = open(1, 'w', closefd=False)
     distance = max(calls // lives, 1)
-    k = (distance + 1) // 2 + part * distance
-    while True:
+    for k in range((distance + 1) // 2 + part * distance, 2 * calls, parts * distance):
         end, _, failures, text = fork_one(library, life, MODES[mode], k)
         if not failures:
             break
         print(json.dumps([k, end, text]), file=output, flush=True)
-        k += parts * distance
+    else:
+        raise AssertionError('lives go wrong in which no call has failed')
     life.tidy()
 
 
