@@ -141,10 +141,11 @@ void onSignal(int number)
     static_cast<void>(std::signal(number, SIG_DFL));
     if (reached)
         say("reached\n", {{reached}, 1});
+    say("failed\n", plan.firstFailure);
+    // Last: there is no way back from where there is no code.
     Trace here{};
     here.count = backtrace(here.frames.data(), maxFrames);
     say("died\n", here);
-    say("failed\n", plan.firstFailure);
     static_cast<void>(std::raise(number));
 }
 

@@ -399,9 +399,10 @@ def read_traces(text):
 
 def find_place(text):
     """The frame to which a death is put down: the function that an exception may not pass, else the innermost that is
-    no function of the system's own libraries. None where nothing was written down."""
+    no function of the system's own libraries, of those in which it died or, where it could not tell, the call failed.
+    None where nothing was written down."""
     traces = read_traces(text)
-    died = traces.get('died', [])
+    died = traces.get('died') or traces.get('failed', [])
     for frame in traces.get('reached', []):
         inner = reversed(died[:died.index(frame)] if frame in died else [])
         called = next((each for each in inner if not OURS.search(each['library'])), frame)
