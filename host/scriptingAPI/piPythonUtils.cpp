@@ -27,6 +27,7 @@ void PiPythonUtils::takePart()
     {
         installHook();
         installConverters();
+        installStackGuard();
         installScriptFolder();
         installWrapperKeeper();
         return true;

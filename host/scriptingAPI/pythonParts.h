@@ -11,6 +11,9 @@ void installConverters();
 /// The interpreter's part in the native loop.
 void installHook();
 
+/// The end of recursions that would come to the end of the stack.
+void installStackGuard();
+
 /// The folder of the script, where resources are looked for.
 void installScriptFolder();
 

@@ -141,6 +141,56 @@ assert not user.failures and dialog.launch() == 'CloseButton_OK'
     assert printed.split() == ['answered', 'True'] * 16
 
 
+def test_recursions_end_before_the_stack_does_however_high_the_limit_of_python_is():
+    assert run_script('''
+import sys
+from forms import make_dialog, ui
+dialog, depth = make_dialog(), 0
+def go_on():
+    global depth
+    depth += 1
+    return str(depth)
+class Again(int):
+    def __bool__(self):
+        go_on()
+        dialog.setValue('Toggle', self)
+dialog.addCallback('Text', ui.EventType.VALUE_CHANGED, lambda given, name, event: given.setValues({name: go_on()}))
+sys.setrecursionlimit(10**6)
+for name, value in ('Text', ''), ('Toggle', Again()):
+    try:
+        dialog.setValue(name, value)
+    except RecursionError as error:
+        print(error)
+assert depth > 1000
+dialog.setValue('Toggle', True)
+print(dialog.getValue('Toggle'))
+''') == 2 * 'maximum recursion depth exceeded: the stack of the thread is used up\n' + 'True\n'
+
+
+@pytest.mark.standalone
+def test_launches_in_launches_end_before_a_small_stack_does():
+    assert run_script('''
+import resource, sys
+resource.setrlimit(resource.RLIMIT_STACK, (2 << 20, resource.getrlimit(resource.RLIMIT_STACK)[1]))
+from forms import make_dialog, ui
+from quorvane_velmora import testing
+dialog, depth = make_dialog(), 0
+def deeper(given, *_):
+    global depth
+    depth += 1
+    person.answer('Form', press='Button')
+    given.launch()
+dialog.addCallback('Button', ui.EventType.ACTIVATE, deeper)
+sys.setrecursionlimit(10**6)
+try:
+    with testing.person() as person:
+        person.answer('Form', press='Button')
+        dialog.launch()
+except RecursionError:
+    print('answered', depth > 50)
+''') == 'answered True\n'
+
+
 @pytest.mark.parametrize('operation', ['hideWidget', 'disable'])
 @pytest.mark.parametrize('name', ['Button', 'Toggle', 'Text', 'Menu'])
 def test_a_callback_hides_or_disables_its_own_widget(user, operation, name):
