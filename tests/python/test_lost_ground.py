@@ -157,6 +157,31 @@ except End:
 
 @needs_pyqt
 @pytest.mark.standalone
+def test_between_two_runs_the_application_object_can_go_and_another_come(display):
+    assert run_script(PREAMBLE + '''
+from PyQt6 import sip
+from PyQt6.QtWidgets import QApplication
+from quorvane_velmora import testing
+def show():
+    with testing.person() as person:
+        person.answer('Next', press='OK')
+        return ui.showMessageBox('Next', ['.'])
+print(show())
+for _ in range(2):
+    sip.delete(QApplication.instance())
+    for act in dialog.launch, lambda: ui.showMessageBox('Next', ['.']):
+        try:
+            act()
+        except RuntimeError as error:
+            print(error)
+    application = QApplication([])
+    print(show(), dialog.getValue('a'))
+''', **display).splitlines() == ['OK', *2 * [*2 * ['Cannot show a window: the QApplication was destroyed, and there is '
+                                                 'no other'], 'OK kept'], 'atexit']
+
+
+@needs_pyqt
+@pytest.mark.standalone
 @pytest.mark.parametrize('act', ['click 1', 'key space', 'slot', 'later'])
 def test_a_run_ends_with_an_exception_when_its_application_object_is_deleted(desk, act):
     script = desk.start(sys.executable, '-c', '''

@@ -133,7 +133,7 @@ void QtApplication::requireLoop()
     if (std::string const loss = QtWayOut::findLoss(); !loss.empty())
         throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: " + loss);
     if (!QCoreApplication::instance())
-        throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: " + _refusal);
+        throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: " + getRefusal());
     if (QCoreApplication::instance()->thread() != QThread::currentThread())
         throw ExBase(__FILE__, __LINE__, "Cannot dispatch events: this is not the thread of the user interface");
 }
@@ -147,7 +147,7 @@ void QtApplication::requireWindows()
                      "Cannot show a window: there is a QCoreApplication that is no QApplication; create a QApplication "
                      "instead of it");
     if (!application || (application == _own && !_refusal.empty()))
-        throw ExBase(__FILE__, __LINE__, "Cannot show a window: " + _refusal);
+        throw ExBase(__FILE__, __LINE__, "Cannot show a window: " + getRefusal());
     if (std::string const loss = QtWayOut::findLoss(); !loss.empty())
         throw ExBase(__FILE__, __LINE__, "Cannot show a window: " + loss);
     if (application->thread() != QThread::currentThread())
@@ -164,6 +164,11 @@ void QtApplication::start()
         makeOwn();
     if (QtDisplayWatch::watch())
         QtWayOut::watch();
+}
+
+std::string QtApplication::getRefusal() const
+{
+    return _refusal.empty() ? "the QApplication was destroyed, and there is no other" : _refusal;
 }
 
 void QtApplication::makeOwn()

@@ -32,6 +32,7 @@ public:
 private:
     void start();
     void makeOwn();
+    std::string getRefusal() const;
 
     /// Ours, or null; never destroyed.
     QCoreApplication* _own = nullptr;
