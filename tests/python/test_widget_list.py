@@ -248,3 +248,18 @@ def test_what_a_description_cannot_hold_is_refused_when_it_is_written(text):
         with pytest.raises((RuntimeError, UnicodeEncodeError), match='XML cannot hold|not valid UTF-8|surrogates'):
             ui.makeXmlFromWidgetList(widgets, buttons)
     assert find(make([('TextField', 'next')]), 'next') is not None
+
+
+def test_names_of_any_character_come_back_or_are_refused():
+    refused = 0
+    for character in map(chr, [*range(0x300), *range(0x300, 0x110000, 997)]):
+        rows = [('TextField', character, character, character), ('Menu', 'm' + character, '', ([character], 0))]
+        try:
+            description = ui.makeXmlFromWidgetList(rows, ['OK' + character])
+        except (RuntimeError, UnicodeEncodeError):
+            refused += 1
+            continue
+        dialog = ui.createDialog(character, description)
+        assert dialog.getValues() == {character: character, 'm' + character: character}, ascii(character)
+        assert dialog.isDisplayed('CloseButton_OK' + character)
+    assert refused < 50
