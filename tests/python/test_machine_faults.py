@@ -47,8 +47,10 @@ def path(tmp_path):
 
 SAVING = '''
 import sys
-from quorvane_velmora import graph
+from quorvane_velmora import graph, ui
 shot = graph.readComposition(sys.argv[1])
+if sys.argv[2:]:
+    ui.Workspace.openComposition(shot)
 print('reads', flush=True)
 for number in range(10 ** 6):
     for node in 'n0', 'n%d':
@@ -58,14 +60,18 @@ for number in range(10 ** 6):
 ''' % (ROWS - 1)
 
 
-def test_a_process_that_is_killed_at_any_moment_of_its_saves_leaves_the_old_file_or_the_new_one(path):
+@pytest.mark.parametrize('inside', [False, True], ids=['script', 'application'])
+def test_a_process_that_is_killed_at_any_moment_of_its_saves_leaves_the_old_file_or_the_new_one(path, inside):
+    script = path.parent.with_suffix('.py')
+    script.write_text(SAVING)
+    program = [TREE / 'bin' / 'velmora', '--exit', script, path, 'open'] if inside else [sys.executable, script, path]
     seed = random.randrange(10 ** 6)
     print('seed', seed)
     chance = random.Random(seed)
     saves = 0
     while saves < 100:
-        process = subprocess.Popen([sys.executable, '-c', SAVING, str(path)], env=environment(), text=True,
-                                   stdout=subprocess.PIPE)
+        process = subprocess.Popen(program, text=True, stdout=subprocess.PIPE,
+                                   env=environment(QT_QPA_PLATFORM='offscreen', XDG_STATE_HOME=str(path.parents[1])))
         assert process.stdout.readline() == 'reads\n'
         before = read_mark(path)
         time.sleep(chance.uniform(0.01, 0.25))
