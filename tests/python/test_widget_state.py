@@ -7,6 +7,7 @@ import pytest
 
 from forms import UNKNOWN, listen, make_dialog
 from quorvane_velmora import ui
+from PyQt6 import sip
 from PyQt6.QtCore import QPoint, QRect, Qt
 from PyQt6.QtGui import QTextDocument
 from PyQt6.QtTest import QTest
@@ -93,6 +94,47 @@ def test_a_widget_out_of_reach_keeps_its_value_and_takes_no_input(user, name, ta
         user.run(dialog, disturb)
     assert heard == []
     assert dialog.getValue(name) == values.get(name)
+
+
+def test_the_keyboard_goes_on_to_the_widget_that_comes_next_when_a_script_takes_away_one_after_the_other(user):
+    rows = [('TextField', 'Row%d' % i) for i in range(9)]
+    dialog = ui.createDialog('Rows', ui.makeXmlFromWidgetList(rows, ['OK']), 300, 320)
+
+    def take_away_some(_):
+        dialog.hideWidget('Row3')
+        dialog.enableWidget('Row4', False)
+
+    def take_away_all(someone):
+        def holder():
+            return someone.window().focusWidget().objectName()
+
+        def disable(name):
+            dialog.enableWidget(name, False)
+            return holder()
+
+        def hide(name):
+            dialog.hideWidget(name)
+            return holder()
+
+        someone.find('Row0').setFocus()
+        assert [disable('Row0'), hide('Row1')] == ['Row1', 'Row2']
+        dialog.showWidget('Row3')
+        assert disable('Row2') == 'Row3'
+        dialog.enableWidget('Row4', True)
+        assert hide('Row3') == 'Row4'
+        fifth, sixth = someone.find('Row5'), someone.find('Row6')
+        places = fifth.pos(), sixth.pos()
+        sixth.move(places[0])
+        fifth.move(places[1])
+        assert [disable('Row4'), hide('Row6')] == ['Row6', 'Row5']
+        sip.delete(someone.find('Row7'))
+        assert [hide('Row5'), disable('Row8')] == ['Row8', 'CloseButton_OK']
+        dialog.enableWidget('Row2', True)
+        someone.press(Qt.Key.Key_Tab)
+        assert holder() == 'Row2'
+        assert hide('Row2') == 'CloseButton_OK'
+
+    user.run(dialog, take_away_some, take_away_all)
 
 
 def press_escape(user):

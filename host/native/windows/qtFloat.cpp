@@ -235,9 +235,4 @@ void QtFloat::keyPressEvent(QKeyEvent* event)
         _handle.tell(&NtFloatListener::onEscape);
 }
 
-bool QtFloat::focusNextPrevChild(bool next)
-{
-    return QtFocusOrder(*this).step(next);
-}
-
 } // namespace Kv

@@ -4,6 +4,7 @@
 #include "ntContainer.h"
 #include "peers/qtListenerHandle.h"
 #include "windows/qtContentArea.h"
+#include "windows/qtFocusWalk.h"
 
 #include <QPointer>
 #include <QWidget>
@@ -45,7 +46,7 @@ protected:
     void moveEvent(QMoveEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
-    bool focusNextPrevChild(bool next) override;
+    bool focusNextPrevChild(bool next) override { return _walk.step(next); }
 
 private:
     void makeContent();
@@ -55,6 +56,7 @@ private:
     /// Natively children, which others can delete.
     QPointer<QtContentArea> _area;
     QPointer<QWidget> _edge;
+    QtFocusWalk _walk{*this};
 };
 
 } // namespace Kv

@@ -89,9 +89,9 @@ QtFocusOrder::QtFocusOrder(QWidget const& root) : _root(&root)
         _stops.insert(_stops.end(), row.begin(), row.end());
 }
 
-bool QtFocusOrder::step(bool next) const
+bool QtFocusOrder::step(bool next)
 {
-    QWidget* const target = find(_root->window()->focusWidget(), next ? 1 : -1);
+    QWidget* const target = find(next ? 1 : -1);
     if (!target)
         return false;
     give(*target, next ? Qt::TabFocusReason : Qt::BacktabFocusReason);
@@ -108,7 +108,7 @@ QWidget* QtFocusOrder::getFirst() const
 {
     for (auto const wanted : {&holdsValue, &isPushButton})
         for (QWidget* const widget : _stops)
-            if (wanted(*widget) && takesFocus(*widget))
+            if (widget && wanted(*widget) && takesFocus(*widget))
                 return widget;
     return nullptr;
 }
@@ -132,16 +132,33 @@ void QtFocusOrder::give(QWidget& widget, Qt::FocusReason reason)
         floating->askIntoView(widget);
 }
 
-QWidget* QtFocusOrder::find(QWidget const* current, int direction) const
+bool QtFocusOrder::leadsOn()
+{
+    QWidget const* const current = _root->window()->focusWidget();
+    if (!current)
+        return false;
+    // As a rule it is where the last step went.
+    if (_place >= _stops.size() || _stops[_place] != current)
+        _place = static_cast<std::size_t>(std::find(_stops.begin(), _stops.end(), current) - _stops.begin());
+    return _place < _stops.size();
+}
+
+QWidget* QtFocusOrder::find(int direction)
 {
     auto const count = static_cast<int>(_stops.size());
-    if (count == 0)
-        return nullptr;
-    auto const found = std::find(_stops.begin(), _stops.end(), current);
     int const nowhere = direction > 0 ? -1 : count;
-    int const from = found == _stops.end() ? nowhere : static_cast<int>(found - _stops.begin());
-    QWidget* const next = _stops[static_cast<std::size_t>((from + direction + count) % count)];
-    return next == current ? nullptr : next;
+    int place = leadsOn() ? static_cast<int>(_place) : nowhere;
+    QWidget const* const current = _root->window()->focusWidget();
+    for (int steps = 0; steps < count; ++steps)
+    {
+        place = (place + direction + count) % count;
+        QWidget* const widget = _stops[static_cast<std::size_t>(place)];
+        if (!widget || widget == current || !takesFocus(*widget))
+            continue;
+        _place = static_cast<std::size_t>(place);
+        return widget;
+    }
+    return nullptr;
 }
 
 } // namespace Kv

@@ -1,7 +1,9 @@
 #pragma once
 
+#include <QPointer>
 #include <QWidget>
 
+#include <cstddef>
 #include <vector>
 
 namespace Kv
@@ -30,8 +32,11 @@ public:
     explicit QtFocusOrder(QWidget const& root);
 
     /// Gives the keyboard to the next widget or the one before, around the ends. The one that has it need not take the
-    /// keyboard any more. False where nothing else does.
-    bool step(bool next) const;
+    /// keyboard any more. False where nothing else does. What takes it only since the order was found is left out.
+    bool step(bool next);
+
+    /// True where the widget that has the keyboard is in the order: a step goes from there.
+    bool leadsOn();
 
     /// True for a `QtValueWidget`, and for a widget that hands the keyboard on to one.
     static bool holdsValue(QWidget const& widget);
@@ -46,10 +51,13 @@ public:
     static void give(QWidget& widget, Qt::FocusReason reason);
 
 private:
-    QWidget* find(QWidget const* current, int direction) const;
+    QWidget* find(int direction);
 
     QWidget const* _root;
-    std::vector<QWidget*> _stops;
+    /// Some can go while others walk through them.
+    std::vector<QPointer<QWidget>> _stops;
+    /// Where the widget was that had the keyboard when it was looked for last.
+    std::size_t _place = 0;
 };
 
 } // namespace Kv

@@ -6,7 +6,6 @@
 #include "loop/qtSpareHandles.h"
 #include "peers/qtText.h"
 #include "start/qtApplication.h"
-#include "windows/qtFocusOrder.h"
 #include "windows/qtLostWindows.h"
 #include "windows/qtWindowIcon.h"
 
@@ -215,11 +214,6 @@ void QtWindowWidget::keyPressEvent(QKeyEvent* event)
     event->accept();
     if (!event->isAutoRepeat())
         _handle.tell(&NtWindowListener::onEscape);
-}
-
-bool QtWindowWidget::focusNextPrevChild(bool next)
-{
-    return QtFocusOrder(*this).step(next);
 }
 
 void QtWindowWidget::layOut()

@@ -5,6 +5,7 @@
 #include "ntWindow.h"
 #include "peers/qtContainer.h"
 #include "windows/qtContentArea.h"
+#include "windows/qtFocusWalk.h"
 
 #include <QPointer>
 #include <QRect>
@@ -45,7 +46,7 @@ protected:
     void resizeEvent(QResizeEvent* event) override;
     void closeEvent(QCloseEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
-    bool focusNextPrevChild(bool next) override;
+    bool focusNextPrevChild(bool next) override { return _walk.step(next); }
 
 private:
     /// Ahead of the first picture too: what is laid out before it is shown, costs Qt a fraction.
@@ -61,6 +62,7 @@ private:
     QtListenerHandle<NtWindowListener> _handle;
     /// Natively a child, which others can delete.
     QPointer<QtContentArea> _area;
+    QtFocusWalk _walk{*this};
 
     bool _awaited = false;
 
