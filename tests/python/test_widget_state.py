@@ -8,10 +8,10 @@ import pytest
 from forms import UNKNOWN, listen, make_dialog
 from quorvane_velmora import ui
 from PyQt6 import sip
-from PyQt6.QtCore import QPoint, QRect, Qt
+from PyQt6.QtCore import QEvent, QObject, QPoint, QRect, Qt
 from PyQt6.QtGui import QTextDocument
 from PyQt6.QtTest import QTest
-from PyQt6.QtWidgets import QApplication, QProxyStyle, QStyle, QToolTip
+from PyQt6.QtWidgets import QApplication, QProxyStyle, QScrollArea, QStyle, QToolTip
 
 pytestmark = [pytest.mark.screen, pytest.mark.usefixtures('no_wait_is_endless')]
 
@@ -135,6 +135,53 @@ def test_the_keyboard_goes_on_to_the_widget_that_comes_next_when_a_script_takes_
         assert hide('Row2') == 'CloseButton_OK'
 
     user.run(dialog, take_away_some, take_away_all)
+
+
+class Painting(QObject):
+    """The names of the widgets that have been painted."""
+
+    def __init__(self, widgets):
+        super().__init__()
+        self.names = set()
+        for widget in widgets:
+            widget.installEventFilter(self)
+
+    def eventFilter(self, widget, event):
+        if event.type() == QEvent.Type.Paint:
+            self.names.add(widget.objectName())
+        return False
+
+    def await_all(self, names):
+        while self.names != set(names):
+            QTest.qWait(5)
+        self.names.clear()
+
+
+@pytest.mark.parametrize('change', [
+    lambda dialog, names: [dialog.hideWidget(name) or dialog.showWidget(name) for name in names],
+    lambda dialog, names: [dialog.enableWidget(name, not dialog.isEnabled(name)) for name in names],
+    lambda dialog, names: dialog.setValues({'Text': dialog.getValue('Text') + '!', 'Toggle': not dialog.getValue('Toggle'),
+                                            'Menu': (['a', 'b'], int(dialog.getValue('Menu') == 'a'))}),
+], ids=['shown', 'enabled', 'set'])
+def test_what_changes_out_of_sight_is_painted_in_sight_and_at_each_change_from_then_on(user, change):
+    names = ['Text', 'Toggle', 'Menu']
+    rows = [('TextField', 'Row%d' % i) for i in range(30)]
+    rows += [('TextField', 'Text', '', 'old'), ('ToggleButton', 'Toggle', '', False), ('Menu', 'Menu', '', (['a', 'b'], 0))]
+    dialog = ui.createDialog('Rows', ui.makeXmlFromWidgetList(rows, ['OK']), 300, 28 * len(rows))
+
+    def look(someone):
+        painting = Painting([someone.find(name) for name in names])
+        change(dialog, names)
+        QTest.qWait(20)
+        assert painting.names == set()
+        bar = someone.window().findChild(QScrollArea).verticalScrollBar()
+        bar.setValue(bar.maximum())
+        painting.await_all(names)
+        change(dialog, names)
+        painting.await_all(names)
+
+    user.plan(lambda someone: someone.window().resize(300, 200))
+    user.run(dialog, look)
 
 
 def press_escape(user):

@@ -2,6 +2,7 @@
 #include "peers/qtLongText.h"
 #include "peers/qtPeer.h"
 #include "peers/qtText.h"
+#include "peers/qtUnseen.h"
 #include "windows/qtFocusOrder.h"
 
 #include <QAbstractItemView>
@@ -143,8 +144,11 @@ public:
 
     void removeAll() override
     {
-        if (ComboBox* const box = getNative())
-            box->clear();
+        ComboBox* const box = getNative();
+        if (!box)
+            return;
+        QtUnseen const unseen(*box);
+        box->clear();
     }
 
     void append(std::string const& entry) override
@@ -152,6 +156,7 @@ public:
         ComboBox* const box = getNative();
         if (!box)
             return;
+        QtUnseen const unseen(*box);
         // The first entry would select itself.
         int const selected = box->currentIndex();
         box->addItem(toShown(toQString(entry), mostInRow));
@@ -160,8 +165,11 @@ public:
 
     void select(int index) override
     {
-        if (ComboBox* const box = getNative())
-            box->setCurrentIndex(index);
+        ComboBox* const box = getNative();
+        if (!box)
+            return;
+        QtUnseen const unseen(*box);
+        box->setCurrentIndex(index);
     }
 
     void setAlign(NtAlign align) override

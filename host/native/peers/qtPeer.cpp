@@ -4,6 +4,7 @@
 #include "peers/qtLongText.h"
 #include "peers/qtPointerWatch.h"
 #include "peers/qtText.h"
+#include "peers/qtUnseen.h"
 #include "start/qtApplication.h"
 #include "windows/qtFloat.h"
 #include "windows/qtFocusOrder.h"
@@ -70,10 +71,11 @@ constexpr int many = 100;
 /// Lets a widget and those in it be painted again, all at once. Qt's own way would have each ask for it.
 void resumeUpdates(QWidget& widget)
 {
+    widget.setAttribute(Qt::WA_UpdatesDisabled, false);
     for (QWidget* const inner : widget.findChildren<QWidget*>())
         inner->setAttribute(Qt::WA_UpdatesDisabled, false);
-    widget.setAttribute(Qt::WA_UpdatesDisabled, false);
-    widget.update();
+    if (isInSight(widget))
+        widget.update();
 }
 
 /// Shows a widget that was hidden. Qt posts an event to each widget in it, to be painted on its own, for which each
@@ -81,9 +83,17 @@ void resumeUpdates(QWidget& widget)
 void showAgain(QWidget& widget)
 {
     widget.setUpdatesEnabled(false);
-    widget.show();
-    QMetaObject::invokeMethod(
-        &widget, [&widget] { resumeUpdates(widget); }, Qt::QueuedConnection);
+    try
+    {
+        widget.show();
+        QMetaObject::invokeMethod(
+            &widget, [&widget] { resumeUpdates(widget); }, Qt::QueuedConnection);
+    }
+    catch (...)
+    {
+        resumeUpdates(widget);
+        throw;
+    }
 }
 
 } // namespace
@@ -133,7 +143,8 @@ void QtPeer::setDisplayed(bool displayed)
 {
     QtErrorAside const aside;
     QWidget* const widget = getNative();
-    if (widget && displayed && widget->isHidden() && widget->findChildren<QWidget*>().size() > many)
+    if (widget && displayed && widget->isHidden() &&
+        (widget->findChildren<QWidget*>().size() > many || !isInSight(*widget)))
         showAgain(*widget);
     else if (widget)
         widget->setVisible(displayed);
@@ -142,8 +153,11 @@ void QtPeer::setDisplayed(bool displayed)
 void QtPeer::setEnabled(bool enabled)
 {
     QtErrorAside const aside;
-    if (QWidget* const widget = getNative())
-        widget->setEnabled(enabled);
+    QWidget* const widget = getNative();
+    if (!widget)
+        return;
+    QtUnseen const unseen(*widget);
+    widget->setEnabled(enabled);
 }
 
 void QtPeer::setTooltip(std::string const& text)

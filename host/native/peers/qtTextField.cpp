@@ -2,6 +2,7 @@
 #include "peers/qtLongText.h"
 #include "peers/qtPeer.h"
 #include "peers/qtText.h"
+#include "peers/qtUnseen.h"
 #include "windows/qtFocusOrder.h"
 
 #include <QKeyEvent>
@@ -28,6 +29,7 @@ public:
     /// Shows a text. One that is too long for Qt is only looked at: an edit of what is shown would lose the rest.
     void showText(QString const& text, bool cursorAtEnd)
     {
+        QtUnseen const unseen(*this);
         QString const shown = toShown(text);
         _size = text.size();
         setReadOnly(shown.size() < _size);

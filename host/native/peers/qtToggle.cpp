@@ -1,5 +1,6 @@
 #include "ntToggle.h"
 #include "peers/qtPeer.h"
+#include "peers/qtUnseen.h"
 #include "windows/qtFocusOrder.h"
 
 #include <QCheckBox>
@@ -42,8 +43,11 @@ public:
 
     void setState(bool state) override
     {
-        if (CheckBox* const box = getNative())
-            box->setChecked(state);
+        CheckBox* const box = getNative();
+        if (!box)
+            return;
+        QtUnseen const unseen(*box);
+        box->setChecked(state);
     }
 };
 
