@@ -3,6 +3,7 @@
 #include "peers/qtUnseen.h"
 #include "windows/qtFocusOrder.h"
 
+#include <QButtonGroup>
 #include <QCheckBox>
 
 namespace Kv
@@ -47,6 +48,11 @@ public:
         if (!box)
             return;
         QtUnseen const unseen(*box);
+        // Of a box that is cleared and in no group, Qt looks at all buttons beside it: one could exclude the others.
+        QButtonGroup alone;
+        alone.setExclusive(false);
+        if (!state && !box->group())
+            alone.addButton(box);
         box->setChecked(state);
     }
 };
