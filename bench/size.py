@@ -1,5 +1,5 @@
 """Measures how the cost of a dialog grows with the size of what a script hands over: texts of all kinds in all places, the
-entries of a menu, the widgets."""
+entries of a menu, the widgets, and what is done to all of these while a person looks at them."""
 
 import sys
 import tempfile
@@ -52,9 +52,32 @@ PLACES = {'label': lambda words: make(widget('Label', 'w', content=text(words)))
           'entry of a menu': lambda words: make_menu([words]),
           'title': lambda words: make(title=words),
           'tooltip': make_with_tooltip}
+
+
+def make_rows(count):
+    return ui.createDialog('Size', ui.makeXmlFromWidgetList(sides.rows(count), ['OK']), 400, 28 * count)
+
+
 COUNTS = {'entries of a menu': (lambda count: make_menu(['entry %d' % i for i in range(count)]), 10000, 100000),
-          'rows': (lambda count: ui.createDialog('Size', ui.makeXmlFromWidgetList(sides.rows(count), ['OK']), 400, 28 * count),
-                   1000, 10000)}
+          'rows': (make_rows, 1000, 10000)}
+
+
+def change_back_and_forth(change, change_back):
+    """From top to bottom, where the keyboard is passed on from row to row, and from bottom to top."""
+    def change_all(dialog, names):
+        for order in names, names[::-1]:
+            for call in change, change_back:
+                for name in order:
+                    call(dialog, name)
+                sides.flush()
+    return change_all
+
+
+CHANGES = {'hidden, shown': change_back_and_forth(ui.Dialog.hideWidget, ui.Dialog.showWidget),
+           'disabled, enabled': change_back_and_forth(lambda dialog, name: dialog.enableWidget(name, False),
+                                                      lambda dialog, name: dialog.enableWidget(name, True)),
+           'set': lambda dialog, names: dialog.setValues({name: ('other', False, ([], 3))[i % 3]
+                                                          for i, name in enumerate(names)}, False)}
 
 
 def shown_title(words):
@@ -70,6 +93,22 @@ def run(make_dialog, size):
         person.answer(shown_title(size) if make_dialog is PLACES['title'] else 'Size', press='OK')
         dialog.launch()
     return time.process_time() - start
+
+
+def run_change(change, count):
+    """Seconds of the processor that a change of all rows takes in the shown dialog, with the picture of it."""
+    dialog, seconds = make_rows(count), []
+
+    def change_all(_):
+        start = time.process_time()
+        change(dialog, ['w%d' % i for i in range(count)])
+        sides.flush()
+        seconds.append(time.process_time() - start)
+
+    with testing.person(60) as person:
+        person.answer('Size', press='OK', do=change_all)
+        dialog.launch()
+    return seconds[0]
 
 
 def run_box(words):
@@ -90,6 +129,8 @@ def print_sizes():
         print_growth('message', name, lambda size: run_box(letter * (size // len(letter))), FEW, MANY)
     for what, (make_dialog, few, many) in COUNTS.items():
         print_growth(what, '%d, %d' % (few, many), lambda size: run(make_dialog, size), few, many)
+    for what, change in CHANGES.items():
+        print_growth(what, '1000, 10000', lambda count: run_change(change, count), 1000, 10000)
 
 
 def print_growth(what, of_what, once, few, many):
