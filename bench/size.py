@@ -125,6 +125,8 @@ def print_sizes():
     for place, make_dialog in PLACES.items():
         for name, letter in LETTERS.items():
             print_growth(place, name, lambda size: run(make_dialog, letter * (size // len(letter))), FEW, MANY)
+    for name in 'word', 'marks':
+        print_growth('label', name + ', more', lambda size: run(PLACES['label'], LETTERS[name] * size), MANY, 10 * MANY)
     for name, letter in LETTERS.items():
         print_growth('message', name, lambda size: run_box(letter * (size // len(letter))), FEW, MANY)
     for what, (make_dialog, few, many) in COUNTS.items():
