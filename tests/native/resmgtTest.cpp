@@ -24,6 +24,9 @@
 #include <utility>
 #include <vector>
 
+#include <sys/wait.h>
+#include <unistd.h>
+
 using namespace Kv;
 using namespace std::string_literals;
 
@@ -404,6 +407,13 @@ TEST(OsAsync, LeavesFewThreadsBehindWhatIsSilentAndDoesAllOnceThereIsAnAnswer)
         ask("/other" + std::to_string(number), false);
     EXPECT_LT(countThreads(), before + 40);
     EXPECT_FALSE(OsAsync::ask("/alive", [] { return 3; }));
+    // A forked process has nothing to wait for.
+    pid_t const child = fork();
+    if (child == 0)
+        _exit(OsAsync::ask("/dead", [] { return 4; }).value_or(0));
+    int status = 0;
+    waitpid(child, &status, 0);
+    EXPECT_EQ(WEXITSTATUS(status), 4);
     answer.set_value();
     waitUntil([&] { return done == 201; });
     waitUntil([&] { return countThreads() < before + 5; });

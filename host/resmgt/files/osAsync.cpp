@@ -2,9 +2,11 @@
 
 #include <algorithm>
 #include <csignal>
+#include <exception>
 #include <list>
 #include <mutex>
-#include <system_error>
+#include <new>
+#include <pthread.h>
 #include <thread>
 #include <utility>
 #include <vector>
@@ -63,6 +65,9 @@ public:
     static Desk& getInstance()
     {
         static auto* const desk = new Desk;
+        // A forked process has none of the threads, and one of them may just have had the mutex.
+        static int const isTold = pthread_atfork(nullptr, nullptr, [] { ::new (desk) Desk; });
+        static_cast<void>(isTold);
         return *desk;
     }
 
@@ -121,7 +126,7 @@ void Desk::begin()
                 })
                 .detach();
         }
-        catch (std::system_error const&)
+        catch (std::exception const&)
         {
             // No thread is to be had: it takes as long as it takes.
             run(errand);
@@ -144,6 +149,8 @@ void Desk::run(Errands::iterator errand)
 std::vector<Errands::iterator> Desk::takeReady()
 {
     std::vector<Errands::iterator> ready;
+    // Nothing that is taken is lost for lack of memory.
+    ready.reserve(_waiting.size());
     _waiting.remove_if([](Errand const& errand) { return errand.cancelled->load(); });
     for (auto next = _waiting.begin(); next != _waiting.end() && _underWay.size() < maxThreads;)
     {
