@@ -240,7 +240,7 @@ bool Application::askAboutLeft(std::vector<Recovery::Left>& left)
     {
         bool isDone = std::binary_search(selected.begin(), selected.end(), place);
         if (isDone && answer == RecoveryQuestion::ThrowAway)
-            left[place].file.remove();
+            _recovery->throwAway(left[place]);
         else if (isDone)
             isDone = attempt([&] { _recovery->restore(left[place]); });
         if (!isDone)

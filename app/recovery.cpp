@@ -1,6 +1,7 @@
 #include "recovery.h"
 
 #include "exBase.h"
+#include "files/osAsync.h"
 #include "files/osFile.h"
 #include "text/liString.h"
 
@@ -10,8 +11,10 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <chrono>
 #include <exception>
 #include <filesystem>
+#include <iterator>
 #include <optional>
 #include <sstream>
 #include <sys/stat.h>
@@ -40,6 +43,9 @@ constexpr char const* extension = ".vmrecovery";
 /// The least time between two writes, in milliseconds, and the share of the time that writing may take.
 constexpr qint64 leastPause = 2000;
 constexpr qint64 shareOfTime = 20;
+
+/// For a start or an end, which may take longer than a moment, but not for ever.
+constexpr std::chrono::seconds longPatience(2);
 
 std::string getFolder()
 {
@@ -123,10 +129,27 @@ bool isSaved(PiUnsavedComposition const& unsaved)
     }
 }
 
+/// The paths of the files that are there, in order.
+std::vector<std::string> list(std::string const& folder)
+{
+    std::vector<std::string> paths;
+    std::error_code error;
+    for (fs::directory_iterator file(folder, error); !error && file != fs::directory_iterator(); file.increment(error))
+        if (file->path().extension() == extension)
+            paths.push_back(file->path());
+    std::sort(paths.begin(), paths.end());
+    return paths;
+}
+
+std::string describeSilence(std::string const& folder)
+{
+    return Kv::LiStringUtil::getPrintablePath(folder) + ": its file system does not answer";
+}
+
 } // namespace
 
 Recovery::Recovery(Kv::UiCompositionWorkspace& workspace, std::function<void(QString const&)> tell)
-    : _workspace(workspace), _tell(std::move(tell)), _folder(getFolder())
+    : _workspace(workspace), _tell(std::move(tell)), _folder(getFolder()), _process(getpid())
 {
     _timer.setSingleShot(true);
     QObject::connect(&_timer, &QTimer::timeout, &_timer, [this] { follow(); });
@@ -134,21 +157,22 @@ Recovery::Recovery(Kv::UiCompositionWorkspace& workspace, std::function<void(QSt
 
 void Recovery::follow()
 {
-    if (_isOver)
+    if (!isKeeper())
         return;
-    removeSaved();
-    qint64 const rest = _sinceWritten.isValid() ? _pause - _sinceWritten.elapsed() : 0;
-    if (rest > 0)
+    std::string failure;
+    try
     {
-        if (!_timer.isActive())
-            _timer.start(static_cast<int>(rest));
-        return;
+        failure = removeAndWrite();
     }
-    std::string const failure = write();
-    if (failure.empty())
+    catch (std::exception const& error)
+    {
+        failure = error.what();
+    }
+    if (failure.empty() && !isUnderWay())
         return;
-    _timer.start(static_cast<int>(_pause));
-    if (!std::exchange(_isTold, true))
+    if (!_timer.isActive())
+        _timer.start(static_cast<int>(std::max(leastPause, _pause)));
+    if (!failure.empty() && !std::exchange(_isTold, true))
         _tell(QObject::tr("Changes that are not saved cannot be kept for the case of a crash: %1")
                   .arg(QString::fromStdString(failure)));
 }
@@ -157,8 +181,10 @@ void Recovery::keepNow() noexcept
 {
     try
     {
-        if (!_isOver)
-            write();
+        if (!isKeeper())
+            return;
+        startWriting();
+        waitLonger();
     }
     catch (...)
     {
@@ -168,8 +194,21 @@ void Recovery::keepNow() noexcept
 
 void Recovery::discard() noexcept
 {
-    for (Kept& kept : _kept)
-        kept.file.remove();
+    try
+    {
+        if (isKeeper())
+        {
+            std::vector<std::shared_ptr<File>> files;
+            for (Kept const& kept : _kept)
+                files.push_back(kept.file);
+            startRemoving(files);
+            waitLonger();
+        }
+    }
+    catch (...)
+    {
+        // The next start offers what is there still.
+    }
     _kept.clear();
     _isOver = true;
 }
@@ -181,16 +220,20 @@ void Recovery::leave() noexcept
     _isOver = true;
 }
 
-Recovery::Findings Recovery::find() const
+Recovery::Findings Recovery::find()
 {
-    std::vector<std::string> paths;
-    std::error_code error;
-    for (fs::directory_iterator file(_folder, error); !error && file != fs::directory_iterator(); file.increment(error))
-        if (file->path().extension() == extension)
-            paths.push_back(file->path());
-    std::sort(paths.begin(), paths.end());
+    auto const paths = std::make_shared<std::vector<std::string>>();
+    start(
+        [folder = _folder, paths]
+        {
+            *paths = list(folder);
+            return std::string();
+        });
+    waitLonger();
+    if (isUnderWay())
+        return {{}, {describeSilence(_folder)}};
     Findings findings;
-    for (std::string const& path : paths)
+    for (std::string const& path : *paths)
         find(path, findings);
     return findings;
 }
@@ -217,7 +260,9 @@ void Recovery::find(std::string const& path, Findings& findings) const
             }
             Kv::FwComposition::Keeper const composition = Kv::FwComposition::restoreApart(unsaved);
             std::time_t const time = file->getTime();
-            findings.left.push_back({std::move(*file), composition, time});
+            auto const kept = std::make_shared<File>();
+            kept->file = std::move(file);
+            findings.left.push_back({kept, composition, time});
             return;
         }
         catch (ExBase const& error)
@@ -246,29 +291,69 @@ void Recovery::restore(Left& left)
             break;
         }
     }
-    _kept.push_back({composition, std::move(left.file), restored->getChangeCount()});
+    left.file->changeCount = restored->getChangeCount();
+    _kept.push_back({composition, left.file});
     try
     {
         _workspace.openComposition(composition);
     }
     catch (ExBase const&)
     {
-        left.file = std::move(_kept.back().file);
         _kept.pop_back();
         throw;
     }
 }
 
+void Recovery::throwAway(Left const& left)
+{
+    startRemoving({left.file});
+    waitAMoment();
+}
+
+std::string Recovery::removeAndWrite()
+{
+    bool const isLate = isUnderWay();
+    removeSaved();
+    qint64 const rest = _sinceWritten.isValid() ? _pause - _sinceWritten.elapsed() : 0;
+    if (rest > 0)
+    {
+        if (!_timer.isActive())
+            _timer.start(static_cast<int>(rest));
+        return {};
+    }
+    if (isUnderWay())
+        return isLate ? describeSilence(_folder) : std::string();
+    std::string const failure = takeFailure();
+    return failure.empty() ? write() : failure;
+}
+
 void Recovery::removeSaved()
 {
-    auto const isOver = [this](Kept& kept)
-    {
-        if (isUnsaved(kept.composition))
-            return false;
-        kept.file.remove();
-        return true;
-    };
-    _kept.erase(std::remove_if(_kept.begin(), _kept.end(), isOver), _kept.end());
+    auto const firstSaved = std::stable_partition(_kept.begin(), _kept.end(),
+                                                  [this](Kept const& kept) { return isUnsaved(kept.composition); });
+    std::vector<std::shared_ptr<File>> files;
+    std::transform(firstSaved, _kept.end(), std::back_inserter(files), [](Kept const& kept) { return kept.file; });
+    startRemoving(files);
+    _kept.erase(firstSaved, _kept.end());
+    if (!files.empty())
+        waitAMoment();
+}
+
+void Recovery::startRemoving(std::vector<std::shared_ptr<File>> const& files)
+{
+    if (files.empty())
+        return;
+    start(
+        [files]
+        {
+            for (std::shared_ptr<File> const& kept : files)
+            {
+                if (kept->file)
+                    kept->file->remove();
+                kept->file.reset();
+            }
+            return std::string();
+        });
 }
 
 /// Whoever goes through one that is closed holds it a little longer: it is looked for among the open ones.
@@ -284,54 +369,97 @@ std::string Recovery::write()
 {
     QElapsedTimer cost;
     cost.start();
-    bool isNew = false;
-    std::string failure;
+    startWriting();
+    if (!_outcome.valid())
+        return {};
+    waitAMoment();
+    _pause = std::max(leastPause, cost.elapsed() * shareOfTime);
+    _sinceWritten.start();
+    return takeFailure();
+}
+
+void Recovery::startWriting()
+{
+    std::vector<Change> changes;
     for (auto open = _workspace.getCompositions(); !open.atEnd(); ++open)
     {
         Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const composition(*open);
-        if (composition.isNull() || !composition->isModified() || isKept(*open, composition->getChangeCount()))
+        if (composition.isNull() || !composition->isModified())
             continue;
-        isNew = true;
-        try
-        {
-            keep(*open);
-        }
-        catch (std::exception const& error)
-        {
-            failure = error.what();
-        }
-    }
-    if (isNew)
-    {
-        _pause = std::max(leastPause, cost.elapsed() * shareOfTime);
-        _sinceWritten.start();
-    }
-    return failure;
-}
-
-bool Recovery::isKept(Composition const& composition, std::uint64_t changeCount) const
-{
-    return std::any_of(_kept.begin(), _kept.end(),
-                       [&](Kept const& kept)
-                       { return kept.composition == composition && kept.changeCount == changeCount; });
-}
-
-void Recovery::keep(Composition const& composition)
-{
-    Kv::RCWeakAccessor<const Kv::PiCompositionGraphInterface> const accessor(composition);
-    auto kept =
-        std::find_if(_kept.begin(), _kept.end(), [&](Kept const& other) { return other.composition == composition; });
-    if (kept == _kept.end())
-    {
-        makeFolder(_folder);
+        std::shared_ptr<File> const file = getFile(*open);
+        if (file->changeCount == composition->getChangeCount())
+            continue;
         // The name is for people, who may have to look for their work in that folder.
         constexpr std::size_t maxLength = 100;
-        std::string const name = encode(accessor->getGraph()->getName()).substr(0, maxLength);
-        Kv::OsLockedFile file = Kv::OsLockedFile::create(Kv::OsFilePath(_folder), name + '.', extension);
-        kept = _kept.insert(_kept.end(), {composition, std::move(file), 0});
+        changes.push_back({file, encode(composition->getGraph()->getName()).substr(0, maxLength),
+                           writeRecord(composition->getUnsaved()), composition->getChangeCount()});
     }
-    kept->file.replace(writeRecord(accessor->getUnsaved()));
-    kept->changeCount = accessor->getChangeCount();
+    if (changes.empty())
+        return;
+    start(
+        [folder = _folder, changes = std::move(changes)]
+        {
+            std::string failure;
+            for (Change const& change : changes)
+                try
+                {
+                    write(change, folder);
+                }
+                catch (std::exception const& error)
+                {
+                    failure = error.what();
+                }
+            return failure;
+        });
+}
+
+std::shared_ptr<Recovery::File> Recovery::getFile(Composition const& composition)
+{
+    auto const kept =
+        std::find_if(_kept.begin(), _kept.end(), [&](Kept const& other) { return other.composition == composition; });
+    if (kept != _kept.end())
+        return kept->file;
+    _kept.push_back({composition, std::make_shared<File>()});
+    return _kept.back().file;
+}
+
+void Recovery::write(Change const& change, std::string const& folder)
+{
+    std::optional<Kv::OsLockedFile>& file = change.file->file;
+    if (!file)
+    {
+        makeFolder(folder);
+        file = Kv::OsLockedFile::create(Kv::OsFilePath(folder), change.name + '.', extension);
+    }
+    file->replace(change.content);
+    change.file->changeCount = change.changeCount;
+}
+
+void Recovery::start(std::function<std::string()> work)
+{
+    _outcome = Kv::OsAsync::entrust(_folder, std::move(work));
+}
+
+void Recovery::waitAMoment() const
+{
+    if (_outcome.valid())
+        Kv::OsAsync::comes(_folder, _outcome);
+}
+
+void Recovery::waitLonger() const
+{
+    if (_outcome.valid())
+        _outcome.wait_for(longPatience);
+}
+
+bool Recovery::isUnderWay() const
+{
+    return _outcome.valid() && _outcome.wait_for(std::chrono::seconds(0)) != std::future_status::ready;
+}
+
+std::string Recovery::takeFailure()
+{
+    return _outcome.valid() && !isUnderWay() ? _outcome.get() : std::string();
 }
 
 /// Gives the new path.

@@ -6,6 +6,7 @@
 #include <cerrno>
 #include <climits>
 #include <cstdarg>
+#include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <ctime>
@@ -114,6 +115,8 @@ KV_HANGS(int, faccessat, (int folder, char const* path, int mode, int flags), fo
          (folder, path, mode, flags))
 KV_HANGS(ssize_t, readlink, (char const* path, char* target, size_t size), AT_FDCWD, path, O_NOFOLLOW,
          (path, target, size))
+KV_HANGS(int, rename, (char const* path, char const* target), AT_FDCWD, path, O_NOFOLLOW, (path, target))
+KV_HANGS(int, unlink, (char const* path), AT_FDCWD, path, O_NOFOLLOW, (path))
 KV_HANGS(char*, realpath, (char const* path, char* resolved), AT_FDCWD, path, 0, (path, resolved))
 KV_HANGS(DIR*, opendir, (char const* path), AT_FDCWD, path, 0, (path))
 KV_HANGS(dirent*, readdir, (DIR * stream), dirfd(stream), "", 0, (stream))

@@ -2,12 +2,13 @@
 
 import os
 import textwrap
+import time
 
 import pytest
 from scripts import TREE, needs_pyqt
 
-from test_application import COMPOSITION
-from test_application_window import run_with_tools
+from test_application import COMPOSITION, PROGRAM, run_inside
+from test_application_window import TOOLS
 
 pytestmark = [pytest.mark.standalone, needs_pyqt]
 
@@ -70,6 +71,13 @@ def waits(view):
 '''
 
 
+def hanging(folder):
+    """The environment in which the folder "dead" hangs while there is a file "gate"."""
+    preload = [os.environ.get('LD_PRELOAD'), str(TREE / 'tests' / 'libhangingFolder.so')]
+    return {'LD_PRELOAD': ':'.join(filter(None, preload)), 'KV_HANGING_FOLDER': str(folder / 'dead'),
+            'KV_HANGING_WHILE': str(folder / 'gate')}
+
+
 @pytest.fixture
 def inside(tmp_path):
     """Runs a script in the application in which the folder "dead" can hang, to its end, which comes while it does."""
@@ -78,11 +86,10 @@ def inside(tmp_path):
     (tmp_path / 'dead/file').touch()
     (tmp_path / 'alive/other').touch()
 
-    def run(script, *options):
-        library = TREE / 'tests' / 'libhangingFolder.so'
-        preload = ':'.join(filter(None, [os.environ.get('LD_PRELOAD'), str(library)]))
-        run_with_tools(tmp_path, HANGING + textwrap.dedent(script), *options, LD_PRELOAD=preload,
-                       KV_HANGING_FOLDER=str(tmp_path / 'dead'), KV_HANGING_WHILE=str(tmp_path / 'gate'))
+    def run(script, *options, status=0, **changes):
+        ended, _, errors = run_inside(tmp_path, TOOLS + HANGING + textwrap.dedent(script), *options, **changes,
+                                      **hanging(tmp_path))
+        assert ended == status, errors
         assert (tmp_path / 'gate').exists()
 
     return run
@@ -213,3 +220,100 @@ def test_the_commands_of_the_window_refuse_what_does_not_answer(inside, tmp_path
         ui.Workspace.openComposition(graph.readComposition(os.path.join(alive, 'shot.vmcomposition')))
         still_turns()
         ''', '--exit')
+
+
+# The folder in which changes are kept hangs: those of a composition that is elsewhere.
+KEEPING = '''
+import signal
+
+path = dead + '/state/velmora/recovery/shot.1.vmrecovery'
+shot, = ui.Workspace.getCompositions()
+
+def change(text):
+    before = time.monotonic()
+    shot.setNodeValue('Plate', 'file', text)
+    assert time.monotonic() < before + 2
+
+def kept():
+    return open(path).read() if os.path.exists(path) else ''
+
+def hang_amid_a_write():
+    change('before')
+    QTest.qWait(2100)
+    hang()
+    change('amid')
+'''
+
+
+@pytest.fixture
+def keeping(inside, tmp_path):
+    """The same with a composition open, whose changes are kept in the folder "dead"."""
+    shot = tmp_path / 'alive/shot.vmcomposition'
+    shot.write_text(COMPOSITION)
+
+    def run(script, *options, **changes):
+        inside(KEEPING + textwrap.dedent(script), '--open', str(shot), *options,
+               XDG_STATE_HOME=str(tmp_path / 'dead/state'), **changes)
+
+    return run
+
+
+def test_where_changes_cannot_be_kept_the_loop_and_dialogs_go_on_and_what_is_new_is_kept_once_they_can(keeping):
+    keeping('''
+        hang_amid_a_write()
+        still_turns()
+        user = users.User()
+        user.plan(lambda user: user.close())
+        assert ui.showMessageBox('Box', ['text'], ['OK']) == 'OK'
+        user.judge()
+        wait_for(lambda: any('cannot be kept' in line and 'does not answer' in line for line in lines()))
+        before = threads()
+        for number in range(100):
+            change(str(number))
+        assert threads() <= before
+        wake()
+        wait_for(lambda: '99' in kept())
+
+        # What is saved is gone, though a write of it comes to its end afterwards.
+        hang_amid_a_write()
+        before = time.monotonic()
+        shot.save()
+        assert time.monotonic() < before + 2
+        still_turns()
+        wake()
+        wait_for(lambda: not kept())
+        hang()
+        ''', '--exit')
+
+
+def test_the_application_starts_where_what_former_ones_left_cannot_be_read(desk, tmp_path):
+    (tmp_path / 'dead/state/velmora/recovery').mkdir(parents=True)
+    (tmp_path / 'gate').touch()
+    variables = {**hanging(tmp_path), 'XDG_STATE_HOME': str(tmp_path / 'dead/state')}
+    application = desk.start('env', *map('='.join, variables.items()), PROGRAM, cwd=tmp_path)
+    desk.wait_for_window('Changes That Cannot Be Read')
+    desk.run('key', 'Return')
+    desk.wait_for_window('Velmora')
+    desk.run('key', 'ctrl+q')
+    assert application.wait() == 0
+
+
+ENDS = {
+    'SIGTERM': ('os.kill(os.getpid(), signal.SIGTERM)', 128 + 15),
+    'SIGHUP while idle': ("QTimer.singleShot(0, lambda: os.kill(os.getpid(), signal.SIGHUP))", 128 + 1),
+    'the script': ('sys.exit(3)', 3),
+    'the user': ("watching.answer('Discard'); window.close()", 0),
+    'the QApplication': ('from PyQt6 import sip; sip.delete(QApplication.instance())', 1),
+}
+
+
+@pytest.mark.parametrize('end, status', ENDS.values(), ids=ENDS)
+def test_the_application_ends_though_changes_cannot_be_kept(keeping, tmp_path, end, status):
+    options = ['--exit'] if status == 3 else []
+    keeping('''
+        hang_amid_a_write()
+        change('last')
+        pathlib.Path('ending').touch()
+        %s
+        ''' % end, *options, status=status)
+    assert time.time() < (tmp_path / 'ending').stat().st_mtime + 10

@@ -181,6 +181,11 @@ def run_here(folder, script, *options, state='state', status=0):
 
 def test_nothing_is_left_of_what_is_saved_discarded_or_ended_in_order(tmp_path):
     assert run_here(tmp_path, '''
+        if os.fork() == 0:
+            change('of a child')
+            os._exit(0)
+        os.wait()
+        assert not kept()
         change('b.exr')
         assert 'b.exr' in kept()
         shot.save()

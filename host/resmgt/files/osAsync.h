@@ -40,18 +40,41 @@ public:
     template <typename Question>
     static std::optional<std::invoke_result_t<Question>> ask(std::string const& path, Question question)
     {
-        using Task = std::packaged_task<std::invoke_result_t<Question>()>;
         if (isSilent(path))
             return std::nullopt;
-        auto const task = std::make_shared<Task>(std::move(question));
         auto const cancelled = std::make_shared<std::atomic<bool>>(false);
-        auto answer = task->get_future();
-        start(
-            path, [task] { (*task)(); }, cancelled);
+        auto answer = startTask(path, std::move(question), cancelled);
         if (answer.wait_for(patience) == std::future_status::ready)
             return answer.get();
         *cancelled = true;
         return std::nullopt;
+    }
+
+    /// Has work done however late, after all that was entrusted before for the path, and gives its outcome. Whoever
+    /// lets go of that does not wait either.
+    template <typename Work> static std::future<std::invoke_result_t<Work>> entrust(std::string const& path, Work work)
+    {
+        return startTask(path, std::move(work), std::make_shared<std::atomic<bool>>(false));
+    }
+
+    /// Waits for such an outcome, though no longer than somebody who has to have an answer at once. True if it is
+    /// there.
+    template <typename Outcome> static bool comes(std::string const& path, Outcome const& outcome)
+    {
+        std::chrono::milliseconds const rest = isSilent(path) ? std::chrono::milliseconds(0) : patience;
+        return outcome.wait_for(rest) == std::future_status::ready;
+    }
+
+private:
+    template <typename Work>
+    static std::future<std::invoke_result_t<Work>> startTask(std::string const& path, Work work,
+                                                             Cancelled const& cancelled)
+    {
+        auto const task = std::make_shared<std::packaged_task<std::invoke_result_t<Work>()>>(std::move(work));
+        auto outcome = task->get_future();
+        start(
+            path, [task] { (*task)(); }, cancelled);
+        return outcome;
     }
 };
 
