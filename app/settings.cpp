@@ -1,9 +1,14 @@
 #include "settings.h"
 
+#include "files/osAsync.h"
+
+#include <QFile>
 #include <QStandardPaths>
 #include <QStringList>
 
 #include <algorithm>
+#include <chrono>
+#include <exception>
 
 namespace Velmora
 {
@@ -15,72 +20,137 @@ constexpr std::size_t maxScripts = 10;
 
 QString const scriptsKey = QStringLiteral("scripts");
 
+/// For the start and the end, which may take longer than a moment, but not for ever.
+constexpr std::chrono::seconds longPatience(2);
+
 QString getPath()
 {
     return QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation) +
            QStringLiteral("/velmora/velmora.ini");
 }
 
-} // namespace
-
-Settings::Settings(bool remembers)
-{
-    if (remembers)
-        _file.emplace(getPath(), QSettings::IniFormat);
-}
-
-std::vector<std::string> Settings::getScripts() const
+std::vector<std::string> readScripts(QSettings const& file)
 {
     std::vector<std::string> paths;
-    if (!_file)
-        return paths;
-    // Another application may have run one meanwhile.
-    _file->sync();
-    for (QString const& text : _file->value(scriptsKey).toStringList())
+    for (QString const& text : file.value(scriptsKey).toStringList())
         paths.push_back(QByteArray::fromPercentEncoding(text.toLatin1()).toStdString());
     return paths;
 }
 
+void writeScripts(QSettings& file, std::vector<std::string> const& paths)
+{
+    QStringList texts;
+    for (std::string const& path : paths)
+        texts.append(QString::fromLatin1(QByteArray::fromStdString(path).toPercentEncoding("/ ")));
+    file.setValue(scriptsKey, texts);
+    file.sync();
+}
+
+void removeFrom(std::vector<std::string>& paths, std::string const& path)
+{
+    paths.erase(std::remove(paths.begin(), paths.end(), path), paths.end());
+}
+
+} // namespace
+
+template <typename Act> auto Settings::makeWork(Act act) const
+{
+    return [file = _file, path = _path, act]
+    {
+        if (!*file)
+        {
+            file->emplace(QFile::decodeName(path.c_str()), QSettings::IniFormat);
+            // Else the loop of a thread would write it as well.
+            (*file)->moveToThread(nullptr);
+        }
+        return act(**file);
+    };
+}
+
+Settings::Settings(bool remembers) : _path(QFile::encodeName(getPath()).toStdString())
+{
+    if (!remembers)
+        return;
+    _file = std::make_shared<File>();
+    Kv::OsAsync::entrust(_path, makeWork([](QSettings&) {})).wait_for(longPatience);
+}
+
+Settings::~Settings()
+{
+    try
+    {
+        if (_file)
+            Kv::OsAsync::entrust(_path, makeWork([](QSettings& file) { file.sync(); })).wait_for(longPatience);
+    }
+    catch (std::exception const&)
+    {
+        // Not remembered.
+    }
+}
+
+std::vector<std::string> Settings::getScripts() const
+{
+    if (!_file)
+        return {};
+    auto const read = [](QSettings& file)
+    {
+        // Another application may have run one meanwhile.
+        file.sync();
+        return readScripts(file);
+    };
+    if (auto const paths = Kv::OsAsync::ask(_path, makeWork(read)))
+        _scripts = *paths;
+    return _scripts;
+}
+
 void Settings::addScript(std::string const& path)
 {
-    std::vector<std::string> paths = getScripts();
-    paths.erase(std::remove(paths.begin(), paths.end(), path), paths.end());
-    paths.insert(paths.begin(), path);
-    paths.resize(std::min(paths.size(), maxScripts));
-    setScripts(paths);
+    changeScripts(
+        [path](std::vector<std::string>& paths)
+        {
+            removeFrom(paths, path);
+            paths.insert(paths.begin(), path);
+            paths.resize(std::min(paths.size(), maxScripts));
+        });
 }
 
 void Settings::removeScript(std::string const& path)
 {
-    std::vector<std::string> paths = getScripts();
-    paths.erase(std::remove(paths.begin(), paths.end(), path), paths.end());
-    setScripts(paths);
+    changeScripts([path](std::vector<std::string>& paths) { removeFrom(paths, path); });
 }
 
 void Settings::clearScripts()
 {
-    setScripts({});
+    changeScripts([](std::vector<std::string>& paths) { paths.clear(); });
 }
 
 QByteArray Settings::getLook(QString const& part) const
 {
-    return _file ? _file->value(part).toByteArray() : QByteArray();
+    if (!_file)
+        return {};
+    auto const read = [part](QSettings const& file) { return file.value(part).toByteArray(); };
+    return Kv::OsAsync::ask(_path, makeWork(read)).value_or(QByteArray());
 }
 
 void Settings::setLook(QString const& part, QByteArray const& look)
 {
     if (_file)
-        _file->setValue(part, look);
+        Kv::OsAsync::entrust(_path, makeWork([part, look](QSettings& file) { file.setValue(part, look); }));
 }
 
-void Settings::setScripts(std::vector<std::string> const& paths)
+void Settings::changeScripts(std::function<void(std::vector<std::string>&)> const& change)
 {
     if (!_file)
         return;
-    QStringList texts;
-    for (std::string const& path : paths)
-        texts.append(QString::fromLatin1(QByteArray::fromStdString(path).toPercentEncoding("/ ")));
-    _file->setValue(scriptsKey, texts);
+    change(_scripts);
+    auto const write = [change](QSettings& file)
+    {
+        file.sync();
+        std::vector<std::string> paths = readScripts(file);
+        change(paths);
+        writeScripts(file, paths);
+    };
+    Kv::OsAsync::entrust(_path, makeWork(write));
 }
 
 } // namespace Velmora

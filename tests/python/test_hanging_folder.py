@@ -247,13 +247,13 @@ def hang_amid_a_write():
 
 @pytest.fixture
 def keeping(inside, tmp_path):
-    """The same with a composition open, whose changes are kept in the folder "dead"."""
+    """The same with a composition open, where all that the application keeps and remembers is in the folder "dead"."""
     shot = tmp_path / 'alive/shot.vmcomposition'
     shot.write_text(COMPOSITION)
 
     def run(script, *options, **changes):
         inside(KEEPING + textwrap.dedent(script), '--open', str(shot), *options,
-               XDG_STATE_HOME=str(tmp_path / 'dead/state'), **changes)
+               XDG_STATE_HOME=str(tmp_path / 'dead/state'), XDG_CONFIG_HOME=str(tmp_path / 'dead/config'), **changes)
 
     return run
 
@@ -296,6 +296,23 @@ def test_the_application_starts_where_what_former_ones_left_cannot_be_read(desk,
     desk.wait_for_window('Velmora')
     desk.run('key', 'ctrl+q')
     assert application.wait() == 0
+
+
+def test_what_is_remembered_can_be_seen_and_changed_and_is_written_once_there_is_an_answer(keeping):
+    keeping('''
+        wait_for(lambda: recent_names() == ['script.py'])
+        hang()
+        before = time.monotonic()
+        assert recent_names() == ['script.py']
+        recent()[-1].trigger()
+        assert recent_names() == [] and time.monotonic() < before + 2
+        still_turns()
+        wake()
+        wait_for(lambda: 'script.py' not in open(dead + '/config/velmora/velmora.ini').read())
+        assert recent_names() == []
+        hang()
+        window.close()
+        ''')
 
 
 ENDS = {
