@@ -159,12 +159,12 @@ sys.setrecursionlimit(10**6)
 for name, value in ('Text', ''), ('Toggle', Again()):
     try:
         dialog.setValue(name, value)
-    except RecursionError as error:
-        print(error)
-assert depth > 1000
+    except RecursionError:
+        print('answered')
+assert depth > 500
 dialog.setValue('Toggle', True)
 print(dialog.getValue('Toggle'))
-''') == 2 * 'maximum recursion depth exceeded: the stack of the thread is used up\n' + 'True\n'
+''') == 'answered\nanswered\nTrue\n'
 
 
 @pytest.mark.standalone
