@@ -30,13 +30,23 @@ std::uintptr_t findLowest()
     return reinterpret_cast<std::uintptr_t>(begin) + std::min(mostReserved, size / 8);
 }
 
+/// The same, remembered for the thread that asked last: for the main thread the system reads a file.
+std::uintptr_t getLowest()
+{
+    static pthread_t thread;
+    static std::uintptr_t lowest = 0;
+    if (lowest == 0 || pthread_equal(thread, pthread_self()) == 0)
+    {
+        thread = pthread_self();
+        lowest = findLowest();
+    }
+    return lowest;
+}
+
 /// A limit of Python's own that was raised can lie beyond the stack, whose end ends the process.
 void requireStack()
 {
-    thread_local std::uintptr_t lowest = 0;
-    if (lowest == 0)
-        lowest = findLowest();
-    if (reinterpret_cast<std::uintptr_t>(__builtin_frame_address(0)) >= lowest)
+    if (reinterpret_cast<std::uintptr_t>(__builtin_frame_address(0)) >= getLowest())
         return;
     PyErr_SetString(PyExc_RecursionError, "maximum recursion depth exceeded: the stack of the thread is used up");
     bp::throw_error_already_set();
