@@ -33,11 +33,15 @@ def pytest_configure(config):
 
 
 def pytest_collection_modifyitems(config, items):
-    """Each test belongs to both settings unless it is marked as one of a single setting."""
+    """Each test belongs to both settings unless it is marked as one of a single setting. Of the groups that are to be
+    short, each has its first case alone."""
     other = 'standalone' if scripts.INSIDE else 'inside'
-    left = [item for item in items if item.get_closest_marker(other)]
-    items[:] = [item for item in items if item not in left]
-    config.hook.pytest_deselected(items=left)
+    mine = [item for item in items if not item.get_closest_marker(other)]
+    first = {item.function: item for item in reversed(mine)}
+    short = os.environ.get('VELMORA_SHORT', '').split('|')
+    kept = [item for item in mine if first[item.function] is item or item.path.stem[len('test_'):] not in short]
+    config.hook.pytest_deselected(items=[item for item in items if item not in kept])
+    items[:] = kept
 
 
 @pytest.fixture
