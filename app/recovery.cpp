@@ -44,9 +44,6 @@ constexpr char const* extension = ".vmrecovery";
 constexpr qint64 leastPause = 2000;
 constexpr qint64 shareOfTime = 20;
 
-/// For a start or an end, which may take longer than a moment, but not for ever.
-constexpr std::chrono::seconds longPatience(2);
-
 std::string getFolder()
 {
     QByteArray const state = qgetenv("XDG_STATE_HOME");
@@ -449,7 +446,7 @@ void Recovery::waitAMoment() const
 void Recovery::waitLonger() const
 {
     if (_outcome.valid())
-        _outcome.wait_for(longPatience);
+        _outcome.wait_for(Kv::OsAsync::longPatience);
 }
 
 bool Recovery::isUnderWay() const

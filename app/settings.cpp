@@ -7,7 +7,6 @@
 #include <QStringList>
 
 #include <algorithm>
-#include <chrono>
 #include <exception>
 
 namespace Velmora
@@ -19,9 +18,6 @@ namespace
 constexpr std::size_t maxScripts = 10;
 
 QString const scriptsKey = QStringLiteral("scripts");
-
-/// For the start and the end, which may take longer than a moment, but not for ever.
-constexpr std::chrono::seconds longPatience(2);
 
 QString getPath()
 {
@@ -72,7 +68,7 @@ Settings::Settings(bool remembers) : _path(QFile::encodeName(getPath()).toStdStr
     if (!remembers)
         return;
     _file = std::make_shared<File>();
-    Kv::OsAsync::entrust(_path, makeWork([](QSettings&) {})).wait_for(longPatience);
+    Kv::OsAsync::entrust(_path, makeWork([](QSettings&) {})).wait_for(Kv::OsAsync::longPatience);
 }
 
 Settings::~Settings()
@@ -80,7 +76,8 @@ Settings::~Settings()
     try
     {
         if (_file)
-            Kv::OsAsync::entrust(_path, makeWork([](QSettings& file) { file.sync(); })).wait_for(longPatience);
+            Kv::OsAsync::entrust(_path, makeWork([](QSettings& file) { file.sync(); }))
+                .wait_for(Kv::OsAsync::longPatience);
     }
     catch (std::exception const&)
     {

@@ -26,6 +26,9 @@ public:
     /// The time for which somebody who has to have an answer at once waits for it.
     static constexpr std::chrono::milliseconds patience{300};
 
+    /// That of a start or an end, which may take longer than a moment, but not for ever.
+    static constexpr std::chrono::seconds longPatience{2};
+
     /// Does `work`, which throws nothing, in a thread. `path` is what it asks for: an absolute path, that of
     /// `getEntries`, or an empty one for work that asks for none.
     static void start(std::string const& path, std::function<void()> work, Cancelled const& cancelled);
