@@ -105,7 +105,22 @@ public:
 
     void interrupt() noexcept override { PyErr_SetInterrupt(); }
 
+    void callAtThreadEnd(void (*call)()) noexcept override
+    {
+        PyObject* const belongings = PyThreadState_GetDict();
+        if (!belongings || PyDict_GetItemString(belongings, threadEndKey))
+            return;
+        PyObject* const end = PyCapsule_New(reinterpret_cast<void*>(call), threadEndKey, &callBack);
+        if (!end || PyDict_SetItemString(belongings, threadEndKey, end) != 0)
+            PyErr_Clear();
+        Py_XDECREF(end);
+    }
+
 private:
+    static constexpr char const* threadEndKey = "velmora.threadEnd";
+
+    static void callBack(PyObject* end) { reinterpret_cast<void (*)()>(PyCapsule_GetPointer(end, threadEndKey))(); }
+
     static std::optional<PythonError> find(std::exception_ptr const& error) noexcept
     {
         try

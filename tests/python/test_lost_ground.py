@@ -182,6 +182,32 @@ for _ in range(2):
 
 @needs_pyqt
 @pytest.mark.standalone
+def test_an_application_object_that_was_made_in_a_thread_goes_with_that(display):
+    assert run_script('''
+import threading
+from PyQt6 import sip
+from PyQt6.QtCore import QTimer
+from PyQt6.QtWidgets import QApplication, QPushButton
+from quorvane_velmora import testing, ui
+def work():
+    global application, window, timer, dialog
+    application = QApplication([])
+    window, timer = QPushButton('own'), QTimer()
+    window.show()
+    timer.start(1000)
+    dialog = ui.createDialog('Thread', ui.makeXmlFromWidgetList([('TextField', 'a', '', 'kept')], ['OK']), 300, 100)
+    with testing.person() as person:
+        person.answer('Thread', press='OK')
+        print(dialog.launch())
+thread = threading.Thread(target=work)
+thread.start()
+thread.join()
+print(sip.isdeleted(application), sip.isdeleted(window))
+''', **display).splitlines() == ['CloseButton_OK', 'True True']
+
+
+@needs_pyqt
+@pytest.mark.standalone
 @pytest.mark.parametrize('act', ['click 1', 'key space', 'slot', 'later'])
 def test_a_run_ends_with_an_exception_when_its_application_object_is_deleted(desk, act):
     script = desk.start(sys.executable, '-c', '''

@@ -60,6 +60,10 @@ public:
 
     /// Makes Ctrl-C pending for the interpreter.
     virtual void interrupt() noexcept = 0;
+
+    /// Has this thread call the function once, as its last act in the interpreter. One function a thread; at the end of
+    /// the process another thread may make the call.
+    virtual void callAtThreadEnd(void (*call)()) noexcept = 0;
 };
 
 /// The one face of the window system. All of it is for the thread of the user interface, but that peers and windows may

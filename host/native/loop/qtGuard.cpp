@@ -33,6 +33,7 @@ public:
     void addContext(std::exception_ptr const&, std::exception_ptr const& later) noexcept override { report(later); }
     void checkSignals() override {}
     void interrupt() noexcept override {}
+    void callAtThreadEnd(void (*)()) noexcept override {}
 
     void report(std::exception_ptr const& error) noexcept override
     {

@@ -10,6 +10,7 @@
 #include <QApplication>
 #include <QByteArray>
 #include <QThread>
+#include <QWidget>
 
 #include <array>
 #include <clocale>
@@ -99,6 +100,23 @@ QCoreApplication* makeApplication(QString const& platform)
     return application;
 }
 
+/// Deletes a script's application object and its windows at the end of their thread. They cannot outlive that: Qt's own
+/// objects of the thread go then, and whoever deletes the others later crashes.
+void deleteInItsThread()
+{
+    QCoreApplication* const application = QCoreApplication::instance();
+    if (!application || application->thread() != QThread::currentThread())
+        return;
+    while (!QApplication::topLevelWidgets().isEmpty())
+        delete QApplication::topLevelWidgets().constFirst();
+    delete application;
+}
+
+bool isMainThread()
+{
+    return gettid() == getpid();
+}
+
 bool isWidgetApplication(QCoreApplication* application)
 {
     return qobject_cast<QApplication*>(application);
@@ -162,6 +180,8 @@ void QtApplication::start()
                      "Cannot start Qt: it was short of memory when it started in this process; start another one");
     if (!_tried && !QCoreApplication::instance())
         makeOwn();
+    if (!isMainThread())
+        QtGuard::getInstance().getScriptHook().callAtThreadEnd(&deleteInItsThread);
     if (QtDisplayWatch::watch())
         QtWayOut::watch();
 }
@@ -174,7 +194,7 @@ std::string QtApplication::getRefusal() const
 void QtApplication::makeOwn()
 {
     // Qt's objects would outlive a thread that ends before the process, and end that.
-    if (gettid() != getpid())
+    if (!isMainThread())
     {
         _refusal = "this is not the main thread, and there is no QApplication; launch dialogs from the main thread";
         return;
