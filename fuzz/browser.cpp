@@ -1,5 +1,5 @@
-// Paths that are asked for, and names in a directory that is shown. The lines of the input are paths and names; in a
-// name, which has no slash, one is no part of it but stands for the end of a folder's.
+// Paths that are asked for and typed, and names in a directory that is shown. The lines of the input are paths and
+// names; in a name, which has no slash, one is no part of it but stands for the end of a folder's.
 
 #include "fuzz.h"
 #include "window.h"
@@ -10,7 +10,14 @@
 #include "files/osPlace.h"
 #include "snSelection.h"
 
+#include <QApplication>
+#include <QKeyEvent>
+#include <QLineEdit>
+#include <QTreeView>
+
 #include <algorithm>
+#include <chrono>
+#include <functional>
 #include <set>
 #include <string>
 #include <vector>
@@ -83,6 +90,86 @@ void requireListing(fs::path const& folder, std::set<std::string> const& names, 
         }
 }
 
+/// A browser in its window, as who sits before it has it.
+class Sight
+{
+public:
+    explicit Sight(fs::path const& folder)
+        : window(Fuzz::makeWindow()), browser(BrBrowser::create(window->getRootContainer(), "browser", nullptr)),
+          _folder(folder)
+    {
+        browser->setSequencesCollapsed(false);
+        browser->setMultiple(true);
+        goTo(folder);
+        window->show();
+        QWidget const* const shown = QApplication::activeModalWidget();
+        Fuzz::require(shown, "the window is shown");
+        _list = shown->findChild<QTreeView*>("browser.list");
+        _field = shown->findChild<QLineEdit*>("browser.path");
+        press(*_list, Qt::Key_H, Qt::ControlModifier);
+    }
+
+    bool goTo(fs::path const& path) const
+    {
+        return browser->setURL(path.string(), HistoryEnum::None, UpdateEnum::AtOnce);
+    }
+
+    /// The folder's rows are those of the names, and one name after the other is in focus as its row is selected.
+    void requireRows(std::set<std::string> const& names) const
+    {
+        Fuzz::require(goTo(_folder), "the folder is there");
+        turnUntil([&] { return _list->model()->rowCount() == static_cast<int>(names.size()); }, "a row for each name");
+        std::set<std::string> chosen;
+        for (int row = 0; row < _list->model()->rowCount(); ++row)
+        {
+            _list->setCurrentIndex(_list->model()->index(row, 0));
+            fs::path const path = browser->getInputFocusPath().toString();
+            Fuzz::require(path.parent_path() == _folder, "what a row stands for is in the folder");
+            chosen.insert(path.filename().string());
+        }
+        Fuzz::require(chosen == names, "each name has its row");
+    }
+
+    /// Types a text, lets it be completed and presses Enter.
+    void type(std::string const& text) const
+    {
+        _field->selectAll();
+        press(*_field, Qt::Key_unknown, Qt::NoModifier, QString::fromStdString(text));
+        turn();
+        QWidget* const proposals = QApplication::activePopupWidget();
+        press(proposals ? *proposals : *_field, Qt::Key_Return, Qt::NoModifier, "\r");
+        turn();
+        Fuzz::require(fs::is_directory(browser->getPath().toString()), "Enter leads to a directory, or nowhere");
+    }
+
+    RCShdPtr<UiTopLevel> window;
+    RCShdPtr<BrBrowser> browser;
+
+private:
+    static void turn() { QApplication::processEvents(QEventLoop::AllEvents); }
+
+    static void turnUntil(std::function<bool()> const& holds, char const* what)
+    {
+        constexpr std::chrono::seconds patience(10);
+        auto const end = std::chrono::steady_clock::now() + patience;
+        while (!holds())
+        {
+            Fuzz::require(std::chrono::steady_clock::now() < end, what);
+            QApplication::processEvents(QEventLoop::WaitForMoreEvents);
+        }
+    }
+
+    static void press(QWidget& widget, int key, Qt::KeyboardModifiers modifiers = {}, QString const& text = {})
+    {
+        QKeyEvent event(QEvent::KeyPress, key, modifiers, text);
+        QApplication::sendEvent(&widget, &event);
+    }
+
+    fs::path _folder;
+    QTreeView* _list = nullptr;
+    QLineEdit* _field = nullptr;
+};
+
 /// Asks for a path as the browser's field does. It leads somewhere, or is refused in words.
 void requirePlace(std::string const& path, std::string const& base)
 {
@@ -111,22 +198,24 @@ extern "C" int LLVMFuzzerTestOneInput(std::uint8_t const* data, std::size_t size
     requireListing(folder, names, false);
     requireListing(folder, names, true);
 
-    RCShdPtr<UiTopLevel> const window = Fuzz::makeWindow();
-    RCShdPtr<BrBrowser> const browser = BrBrowser::create(window->getRootContainer(), "browser", nullptr);
+    Sight const sight(folder);
+    sight.requireRows(names);
     for (std::string const& name : names)
     {
-        Fuzz::require(browser->setURL((folder / name).string(), HistoryEnum::None, UpdateEnum::AtOnce),
-                      "the browser goes to what is there");
+        Fuzz::require(sight.goTo(folder / name), "the browser goes to what is there");
+        BrBrowser const& browser = *sight.browser;
         std::string const there =
-            fs::is_directory(folder / name) ? browser->getPath().toString() : browser->getInputFocusPath().toString();
+            fs::is_directory(folder / name) ? browser.getPath().toString() : browser.getInputFocusPath().toString();
         Fuzz::require(there == (folder / name).string(), "the browser shows what was asked for");
     }
     for (std::string const& line : lines)
     {
         requirePlace(line, folder.string());
-        std::string const before = browser->getPath().toString();
-        if (!browser->setURL(line, HistoryEnum::None, UpdateEnum::AtOnce))
-            Fuzz::require(browser->getPath().toString() == before, "a refused path changes nothing");
+        std::string const before = sight.browser->getPath().toString();
+        if (!sight.goTo(line))
+            Fuzz::require(sight.browser->getPath().toString() == before, "a refused path changes nothing");
+        sight.type(line);
     }
+    sight.requireRows(names);
     return 0;
 }
