@@ -28,10 +28,13 @@ namespace fs = std::filesystem;
 namespace
 {
 
+/// More would show what fewer do, and take longer: each is typed, and its proposals are read.
+constexpr std::size_t mostLines = 12;
+
 std::vector<std::string> split(std::string_view text)
 {
     std::vector<std::string> lines;
-    for (std::size_t begin = 0; begin <= text.size() && lines.size() < 64;)
+    for (std::size_t begin = 0; begin <= text.size() && lines.size() < mostLines;)
     {
         std::size_t const end = std::min(text.find('\n', begin), text.size());
         lines.emplace_back(text.substr(begin, end - begin));
