@@ -411,7 +411,8 @@ class Program:
 
     def add_callback(self):
         widget = self.randomly.choice([*self.everything, *self.rows, self.cancel])
-        event = self.randomly.choice([*EVENTS, ui.EventType.ACTIVATE] + [widget.event] * 3 * (widget.event is not None))
+        often = ui.EventType.ACTIVATE if widget.event is None else widget.event
+        event = self.randomly.choice([*EVENTS, ui.EventType.ACTIVATE, often, often, often])
         act = self.make_act() if self.randomly.random() < 0.5 else (None, None)
         callback = Callback(self.heard, self.randomly.choice([None, None, None, ValueError, KeyError]), *act)
         self.callbacks.append((widget.name, event, callback))
