@@ -1,6 +1,7 @@
 """A folder that does not answer, as that of a network in its bad hour, keeps nobody but its own reader."""
 
 import os
+import sys
 import textwrap
 import time
 
@@ -286,11 +287,17 @@ def test_where_changes_cannot_be_kept_the_loop_and_dialogs_go_on_and_what_is_new
         ''', '--exit')
 
 
-def test_the_application_starts_where_what_former_ones_left_cannot_be_read(desk, tmp_path):
+def test_the_application_and_dialogs_start_where_settings_and_what_former_ones_left_cannot_be_read(desk, tmp_path):
     (tmp_path / 'dead/state/velmora/recovery').mkdir(parents=True)
     (tmp_path / 'gate').touch()
-    variables = {**hanging(tmp_path), 'XDG_STATE_HOME': str(tmp_path / 'dead/state')}
-    application = desk.start('env', *map('='.join, variables.items()), PROGRAM, cwd=tmp_path)
+    variables = {**hanging(tmp_path), 'XDG_CONFIG_HOME': str(tmp_path / 'dead'), 'XDG_STATE_HOME': str(tmp_path / 'dead/state')}
+    command = ['env', *map('='.join, variables.items())]
+    script = desk.start(*command, sys.executable, '-c',
+                        "from quorvane_velmora import ui; print(ui.showMessageBox('Settings', ['.']))")
+    desk.wait_for_window('Settings')
+    desk.run('key', 'Return')
+    assert script.communicate()[0] == 'OK\n'
+    application = desk.start(*command, PROGRAM, cwd=tmp_path)
     desk.wait_for_window('Changes That Cannot Be Read')
     desk.run('key', 'Return')
     desk.wait_for_window('Velmora')

@@ -1,6 +1,7 @@
 #include "start/qtApplication.h"
 
 #include "exBase.h"
+#include "files/osAsync.h"
 #include "loop/qtGuard.h"
 #include "loop/qtWayOut.h"
 #include "start/qtDisplayProbe.h"
@@ -9,6 +10,8 @@
 
 #include <QApplication>
 #include <QByteArray>
+#include <QFile>
+#include <QStandardPaths>
 #include <QThread>
 #include <QWidget>
 
@@ -75,6 +78,17 @@ void requireMemory()
     if (block == MAP_FAILED)
         throw std::bad_alloc();
     munmap(block, size);
+}
+
+/// Qt and the library of fonts look for files of theirs in the user's folder for settings, and would wait for one that
+/// does not answer. In its place they get one that can hold nothing.
+void avoidSilentSettings()
+{
+    QByteArray const folder =
+        QFile::encodeName(QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation));
+    auto const look = [folder] { return access(folder.constData(), F_OK); };
+    if (!OsAsync::ask(folder.toStdString(), look))
+        qputenv("XDG_CONFIG_HOME", "/dev/null");
 }
 
 /// What ends Qt's own start leaves an application object that is none, and that nobody can take away.
@@ -200,6 +214,7 @@ void QtApplication::makeOwn()
         return;
     }
     requireMemory();
+    avoidSilentSettings();
     _tried = true;
     QtDisplayProbe probe;
     DisplayChoice choice = probe.choose();
