@@ -33,7 +33,7 @@ class PatientUser(User):
             self._timer.start(5)
 
 
-def run_script(text):
+def run_script(text, **changes):
     """Runs a script beside these tools in a process with an end of its own, and gives what it printed."""
     signal.alarm(0)
-    return scripts.run_script(text, **SAME_SCREEN)
+    return scripts.run_script(text, **SAME_SCREEN, **changes)
